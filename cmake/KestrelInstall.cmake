@@ -1,0 +1,1 @@
+file(GLOB x *.none)
