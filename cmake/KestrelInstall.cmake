@@ -1,1 +1,23 @@
-file(GLOB x *.none)
+# What `cmake --install` lays down: headers, libraries, plug-ins, the program, a CMake package and a pkg-config file.
+include(CMakePackageConfigHelpers)
+
+set(KESTREL_PACKAGE_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/kestrel)
+
+install(TARGETS kestrel_core EXPORT kestrelTargets
+  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
+  RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/kestrel DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}
+  FILES_MATCHING PATTERN "*.h" PATTERN "*.inc")
+install(FILES ${PROJECT_SOURCE_DIR}/kestrel/model/modeldll.txt DESTINATION ${CMAKE_INSTALL_DATADIR}/kestrel)
+install(FILES ${PROJECT_SOURCE_DIR}/LICENSE ${PROJECT_SOURCE_DIR}/README.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
+
+install(EXPORT kestrelTargets NAMESPACE kestrel:: DESTINATION ${KESTREL_PACKAGE_DIR})
+configure_package_config_file(${CMAKE_CURRENT_LIST_DIR}/kestrelConfig.cmake.in
+  ${PROJECT_BINARY_DIR}/kestrelConfig.cmake INSTALL_DESTINATION ${KESTREL_PACKAGE_DIR}
+  PATH_VARS CMAKE_INSTALL_LIBDIR)
+write_basic_package_version_file(${PROJECT_BINARY_DIR}/kestrelConfigVersion.cmake COMPATIBILITY SameMajorVersion)
+install(FILES ${PROJECT_BINARY_DIR}/kestrelConfig.cmake ${PROJECT_BINARY_DIR}/kestrelConfigVersion.cmake
+  DESTINATION ${KESTREL_PACKAGE_DIR})
+
+configure_file(${CMAKE_CURRENT_LIST_DIR}/kestrel.pc.in ${PROJECT_BINARY_DIR}/kestrel.pc @ONLY)
+install(FILES ${PROJECT_BINARY_DIR}/kestrel.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)

@@ -1,0 +1,45 @@
+# Writes a PMML 4.4 RegressionModel and the tables that go with an example. Numbers carry 17 significant digits.
+
+number <- function(x) sprintf("%.17g", x)
+quoted <- function(text) {
+  text <- gsub("&", "&amp;", text, fixed = TRUE)
+  text <- gsub("<", "&lt;", text, fixed = TRUE)
+  paste0("\"", gsub("\"", "&quot;", text, fixed = TRUE), "\"")
+}
+
+categorical_field <- function(name, levels, optype = "categorical") c(
+  sprintf("    <DataField name=%s optype=\"%s\" dataType=\"string\">", quoted(name), optype),
+  sprintf("      <Value value=%s/>", vapply(levels, quoted, "")),
+  "    </DataField>")
+continuous_field <- function(name) sprintf("    <DataField name=%s optype=\"continuous\" dataType=\"double\"/>", quoted(name))
+
+# A coefficient of a factor's level, of a number, or of a product of inputs.
+level_term <- function(name, level, coefficient) sprintf(
+  "      <CategoricalPredictor name=%s value=%s coefficient=\"%s\"/>", quoted(name), quoted(level), number(coefficient))
+numeric_term <- function(name, coefficient) sprintf(
+  "      <NumericPredictor name=%s coefficient=\"%s\"/>", quoted(name), number(coefficient))
+
+table_lines <- function(intercept, terms, category = NULL) {
+  target <- if (is.null(category)) "" else paste0(" targetCategory=", quoted(category))
+  c(sprintf("    <RegressionTable intercept=\"%s\"%s>", number(intercept), target), terms, "    </RegressionTable>")
+}
+
+# fields: lines of DataField elements; count: how many fields they are.
+write_model <- function(path, name, fields, count, inputs, target, normalization, tables, func) {
+  writeLines(c(
+    "<?xml version=\"1.0\" encoding=\"UTF-8\"?>",
+    "<PMML xmlns=\"http://www.dmg.org/PMML-4_4\" version=\"4.4\">",
+    sprintf("  <Header description=%s/>", quoted(name)),
+    sprintf("  <DataDictionary numberOfFields=\"%d\">", count), fields, "  </DataDictionary>",
+    sprintf("  <RegressionModel modelName=%s functionName=\"%s\" normalizationMethod=\"%s\">", quoted(name), func, normalization),
+    "    <MiningSchema>",
+    sprintf("      <MiningField name=%s/>", vapply(inputs, quoted, "")),
+    sprintf("      <MiningField name=%s usageType=\"target\"/>", quoted(target)),
+    "    </MiningSchema>", tables, "  </RegressionModel>", "</PMML>"), path)
+}
+
+# Columns of texts and numbers; texts are quoted only where they must be, which none of ours does.
+write_table <- function(path, columns) {
+  cells <- lapply(columns, function(column) if (is.numeric(column)) number(column) else as.character(column))
+  writeLines(c(paste(names(columns), collapse = ","), do.call(paste, c(unname(cells), sep = ","))), path)
+}
