@@ -25,8 +25,8 @@ class KESTREL_API ResultValue {
  public:
   ResultValue();
   ~ResultValue();
-  ResultValue(ResultValue&&) noexcept;
-  ResultValue& operator=(ResultValue&&) noexcept;
+  ResultValue(ResultValue&&);
+  ResultValue& operator=(ResultValue&&);
 
   /// Copies the value.
   void Assign(const ScoreValue& value);
@@ -60,7 +60,7 @@ class KESTREL_API ClsResult : public ScoreClsResult {
   /// result, valid until the result is filled again.
   const ScoreValue* GetCategory(size_t index) const;
   /// The probability at the position; 0.0 past the end.
-  double GetCategoryProbability(size_t index) const;
+  double GetProbability(size_t index) const;
 
  private:
   struct Entry {
