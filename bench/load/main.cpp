@@ -1,0 +1,109 @@
+// How long a document takes from bytes to model, against the stock parser's bare tree of the same bytes.
+
+#include <malloc.h>
+#include <sys/resource.h>
+
+#include <cstdlib>
+#include <cstring>
+#include <memory>
+#include <sstream>
+#include <xercesc/framework/MemBufInputSource.hpp>
+#include <xercesc/parsers/XercesDOMParser.hpp>
+#include <xercesc/util/PlatformUtils.hpp>
+
+#include "bench/support/Documents.h"
+#include "bench/support/Interleaved.h"
+#include "kestrel/model/ModelFactory.h"
+#include "kestrel/model/ScoreModel.h"
+#include "kestrel/translate/DocumentReader.h"
+
+namespace kestrel_bench {
+namespace {
+
+using MCKestrel_800::ModelFactory;
+using MCKestrel_800::ScoreModel;
+
+[[noreturn]] void Fail(const char* what) {
+  std::fprintf(stderr, "bench_load: %s\n", what);
+  std::exit(1);
+}
+
+/// The baseline: the parser as it comes, building and releasing its tree.
+void ParseWithStockParser(const std::string& document) {
+  xercesc::XercesDOMParser parser;
+  parser.setLoadExternalDTD(false);
+  parser.setValidationScheme(xercesc::XercesDOMParser::Val_Never);
+  xercesc::MemBufInputSource source(reinterpret_cast<const XMLByte*>(document.data()), document.size(), "memory");
+  parser.parse(source);
+  if (parser.getErrorCount() != 0 || parser.getDocument() == nullptr) Fail("the stock parser refused a document");
+}
+
+std::unique_ptr<ScoreModel> Load(const std::string& document) {
+  std::istringstream in(document);
+  std::unique_ptr<ScoreModel> model(ModelFactory::MakeModelFromXML(in, {"RegressionModel"}, std::string()));
+  if (model == nullptr || model->GetPredictors().empty()) Fail("a document gave no model");
+  return model;
+}
+
+double Megabytes(size_t bytes) { return static_cast<double>(bytes) / 1e6; }
+
+void CompareLoads(const char* title, const std::string& document, int repeat) {
+  std::unique_ptr<ScoreModel> model;
+  const size_t before = mallinfo2().uordblks;
+  model = Load(document);
+  const size_t kept = mallinfo2().uordblks - before;
+  model.reset();
+  const std::vector<Contestant> contestants = {
+      {"stock parser: parse and release", [&] { for (int i = 0; i < repeat; ++i) ParseWithStockParser(document); }},
+      {"our reader: parse and release",
+       [&] {
+         for (int i = 0; i < repeat; ++i) {
+           std::istringstream in(document);
+           if (MCKestrel_800::ReadDocument(in) == nullptr) Fail("our reader refused a document");
+         }
+       }},
+      {"whole load: bytes to model", [&] { for (int i = 0; i < repeat; ++i) model = Load(document); },
+       [&] { model.reset(); }},
+  };
+  std::printf("%s, %.3f MB%s\n", title, Megabytes(document.size()),
+              repeat > 1 ? (", " + std::to_string(repeat) + " times a turn").c_str() : "");
+  const std::vector<double> seconds = Compare(contestants);
+  PrintRatios(contestants, seconds);
+  std::printf("  %-46s %10.2f us\n", "one whole load", 1e6 * seconds[2] / repeat);
+  std::printf("  %-46s %10.3f MB\n", "memory that the model keeps", Megabytes(kept));
+}
+
+void CompareSizes(const char* title, const std::string& once, const std::string& twice) {
+  std::unique_ptr<ScoreModel> model;
+  const std::vector<Contestant> contestants = {
+      {"n", [&] { model = Load(once); }, [&] { model.reset(); }},
+      {"2n", [&] { model = Load(twice); }, [&] { model.reset(); }},
+  };
+  std::printf("%s\n", title);
+  PrintRatios(contestants, Compare(contestants));
+}
+
+/// The smallest document of a shape that has at least that many bytes.
+template <typename Make>
+std::string OfSize(size_t bytes, Make make) {
+  const size_t sample = 1000;
+  const double each = static_cast<double>(make(2 * sample).size() - make(sample).size()) / sample;
+  return make(1 + static_cast<size_t>(static_cast<double>(bytes) / each));
+}
+
+int Run(bool smoke) {
+  xercesc::XMLPlatformUtils::Initialize();
+  const size_t large = smoke ? 200'000 : 20'000'000;
+  const size_t many = smoke ? 500 : 10'000;
+  CompareLoads("regression document", OfSize(large, [](size_t n) { return ClassificationModel(n, 20); }), 1);
+  CompareLoads("dictionary document", OfSize(large, DictionaryModel), 1);
+  CompareLoads("small regression document (20 inputs)", LinearModel(20, false), smoke ? 10 : 500);
+  CompareSizes("fields: n = 10,000", DictionaryModel(many), DictionaryModel(2 * many));
+  CompareSizes("categories of one field: n = 10,000", CategoriesModel(many), CategoriesModel(2 * many));
+  return 0;
+}
+
+}  // namespace
+}  // namespace kestrel_bench
+
+int main(int argc, char** argv) { return kestrel_bench::Run(argc > 1 && std::strcmp(argv[1], "--smoke") == 0); }

@@ -1,0 +1,117 @@
+// What one case costs: a regression on 20 numeric inputs, filling the record included.
+//
+// With `--cases N --missing M` the program scores N cases and stops, for counting instructions from outside.
+
+#include <benchmark/benchmark.h>
+
+#include <cmath>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <memory>
+#include <new>
+#include <sstream>
+#include <vector>
+
+#include "bench/support/Documents.h"
+#include "kestrel/dictionary/CaseRecord.h"
+#include "kestrel/foundation/NumericValue.h"
+#include "kestrel/model/ModelFactory.h"
+#include "kestrel/model/Results.h"
+#include "kestrel/model/ScoreModel.h"
+
+namespace {
+size_t allocations = 0;
+}  // namespace
+
+// Counts every allocation of the program, the library and the plug-in.
+void* operator new(size_t size) {
+  ++allocations;
+  if (void* memory = std::malloc(size)) return memory;
+  throw std::bad_alloc();
+}
+void operator delete(void* memory) noexcept { std::free(memory); }
+void operator delete(void* memory, size_t) noexcept { std::free(memory); }
+
+namespace kestrel_bench {
+namespace {
+
+using namespace MCKestrel_800;
+
+constexpr int kInputs = 20;
+
+/// A model with its record and result, and the cases' numbers; every fourth input is missing when wanted.
+class Scorer {
+ public:
+  explicit Scorer(int missing) : record_(kInputs) {
+    std::istringstream in(LinearModel(kInputs, true));
+    model_.reset(ModelFactory::MakeModelFromXML(in, {"RegressionModel"}, std::string()));
+    result_.reset(model_->MakeResult());
+    for (int i = 0; i < kInputs; ++i) {
+      record_.Add("x" + std::to_string(i), new NumericValue());
+      missing_.push_back(i % 4 == 1 && i / 4 < missing);
+    }
+    Score(0);
+    Check();
+  }
+
+  double Score(size_t number) {
+    for (int i = 0; i < kInputs; ++i) {
+      if (missing_[static_cast<size_t>(i)]) {
+        record_.SetMissingValue(i);
+      } else {
+        record_.SetValue(i, static_cast<double>((number + static_cast<size_t>(i)) & 255));
+      }
+    }
+    if (!model_->Score(&record_, result_.get()).IsOK()) std::abort();
+    return result_->GetPrediction()->GetDouble();
+  }
+
+ private:
+  /// A wrong answer's time is worth nothing.
+  void Check() {
+    double expected = 0.25;
+    for (int i = 0; i < kInputs; ++i) {
+      const double x = missing_[static_cast<size_t>(i)] ? 1.0 : i;
+      expected += x * (0.5 + i / 8.0);
+    }
+    if (std::abs(Score(0) - expected) > 1e-12 * expected) {
+      std::fprintf(stderr, "bench_score_regression: wrong answer\n");
+      std::exit(1);
+    }
+  }
+
+  CaseRecord record_;
+  std::unique_ptr<ScoreModel> model_;
+  std::unique_ptr<ScoreResult> result_;
+  std::vector<bool> missing_;
+};
+
+void ScoreCases(benchmark::State& state) {
+  Scorer scorer(static_cast<int>(state.range(0)));
+  size_t number = 0;
+  const size_t before = allocations;
+  for (auto _ : state) benchmark::DoNotOptimize(scorer.Score(number++));
+  // The benchmark library allocates a few times of its own between its rounds, whatever the number of cases.
+  state.counters["allocations_per_case"] =
+      std::floor(1000.0 * static_cast<double>(allocations - before) / static_cast<double>(number)) / 1000.0;
+  state.SetItemsProcessed(static_cast<int64_t>(number));
+}
+BENCHMARK(ScoreCases)->Name("regression_20_inputs")->ArgName("missing")->Arg(0)->Arg(5);
+
+}  // namespace
+}  // namespace kestrel_bench
+
+int main(int argc, char** argv) {
+  if (argc == 5 && std::strcmp(argv[1], "--cases") == 0) {
+    kestrel_bench::Scorer scorer(std::atoi(argv[4]));
+    double sum = 0.0;
+    for (long i = 0; i < std::atol(argv[2]); ++i) sum += scorer.Score(static_cast<size_t>(i));
+    std::printf("%.17g\n", sum);
+    return 0;
+  }
+  benchmark::Initialize(&argc, argv);
+  benchmark::RunSpecifiedBenchmarks();
+  benchmark::Shutdown();
+  return 0;
+}
