@@ -1,0 +1,142 @@
+#include "kestrel/model/ModelFactory.h"
+
+#include <istream>
+#include <memory>
+#include <mutex>
+
+#include "kestrel/foundation/KestrelException.h"
+#include "kestrel/model/InputFile.h"
+#include "kestrel/model/ModelFinder.h"
+#include "kestrel/model/ModelLibrary.h"
+#include "kestrel/model/ModelNames.h"
+#include "kestrel/translate/BaseTranslator.h"
+#include "kestrel/translate/DocumentReader.h"
+#include "kestrel/translate/ReaderFault.h"
+
+namespace MCKestrel_800 {
+
+std::vector<std::string> ModelFactory::fModelNames;
+
+namespace {
+
+/// Guards fModelNames. Loading alone takes it, for as long as a copy of the list takes.
+std::mutex& NamesMutex() {
+  static std::mutex mutex;
+  return mutex;
+}
+
+std::string& LoadError() {
+  thread_local std::string text;
+  return text;
+}
+
+/// The names that one load works with. Its translator is offered this list, and another load may read a names
+/// file meanwhile, so a copy it must be even where the list is the factory's own.
+std::vector<std::string> CopyNames(const std::vector<std::string>& names) {
+  if (&names != &ModelFactory::fModelNames) return names;
+  const std::lock_guard<std::mutex> lock(NamesMutex());
+  return names;
+}
+
+std::vector<std::string> ReadNamesFile(const std::string& fileName) {
+  std::vector<std::string> names;
+  ReadModelNames(fileName, names);
+  const std::lock_guard<std::mutex> lock(NamesMutex());
+  ModelFactory::fModelNames = names;
+  return names;
+}
+
+std::unique_ptr<ScoreTranslator> MakeTranslator(const FoundModel& model, std::vector<std::string>& names) {
+  ModelLibrary library(model.tag);
+  std::unique_ptr<ScoreTranslator> translator = library.MakeTranslator(names);
+  if (translator == nullptr) {
+    LoadError() = library.GetLastErrorText();
+    FailAt(model.element, ExceptionCode::kUnsupported,
+           "Doesn't Support " + model.tag + "  Model: No Required dll or lib available!");
+  }
+  return translator;
+}
+
+/// Offers the whole stream to a translator that takes two arguments. Null when it is none or the stream
+/// cannot be set back to `start`.
+ScoreModel* ParseWithTwoArguments(ScoreTranslator& translator, std::istream& in, std::istream::pos_type start,
+                                  const std::string& arg, const std::string& secondArg) {
+  auto* base = dynamic_cast<BaseTranslator*>(&translator);
+  if (base == nullptr || start == std::istream::pos_type(-1)) return nullptr;
+  in.clear();
+  in.seekg(start);
+  return in.good() ? base->ParseFromTree(in, arg, secondArg) : nullptr;
+}
+
+// Every document is read into a tree, a "NearestNeighborModel" too. Scanning the stream for that one element
+// before would read each document twice, and could not be done at all to a stream that cannot be set back; a
+// translator gets the whole document through its root element as it is.
+ScoreModel* MakeModel(std::istream& in, std::vector<std::string> names, const std::string& arg,
+                      const std::string* secondArg) {
+  LoadError().clear();
+  const std::istream::pos_type start = secondArg != nullptr ? in.tellg() : std::istream::pos_type(-1);
+  const std::unique_ptr<ParsedDocument> document = ReadDocument(in);
+  const FoundModel found = FindModel(document->GetRoot(), names);
+  const std::unique_ptr<ScoreTranslator> translator = MakeTranslator(found, names);
+  if (secondArg != nullptr) {
+    ScoreModel* model = ParseWithTwoArguments(*translator, in, start, arg, *secondArg);
+    if (model != nullptr) return model;
+  }
+  return translator->ParseFromTree(document->GetRoot(), arg);
+}
+
+ScoreModel* MakeModelFromFile(const std::string& fileName, const std::string& namesFileName,
+                              const std::string& arg, const std::string* secondArg) {
+  LoadError().clear();
+  std::vector<std::string> names = ReadNamesFile(namesFileName);
+  std::ifstream in = OpenInputFile(fileName);
+  if (!in.is_open()) Fail(ExceptionCode::kFile, "Could not open model file");
+  return MakeModel(in, std::move(names), arg, secondArg);
+}
+
+}  // namespace
+
+ScoreModel* ModelFactory::MakeModelFromXML(std::istream& in, const std::vector<std::string>& modelNames,
+                                           const std::string& arg) {
+  return MakeModel(in, CopyNames(modelNames), arg, nullptr);
+}
+
+ScoreModel* ModelFactory::MakeModelFromXML(std::istream& in, const std::vector<std::string>& modelNames,
+                                           const std::string& arg, const std::string& secondArg) {
+  return MakeModel(in, CopyNames(modelNames), arg, &secondArg);
+}
+
+ScoreModel* ModelFactory::MakeModelFromXML(const std::string& fileName, const std::string& namesFileName,
+                                           const std::string& arg) {
+  return MakeModelFromFile(fileName, namesFileName, arg, nullptr);
+}
+
+ScoreModel* ModelFactory::MakeModelFromXML(const std::string& fileName, const std::string& namesFileName,
+                                           const std::string& arg, const std::string& secondArg) {
+  return MakeModelFromFile(fileName, namesFileName, arg, &secondArg);
+}
+
+ScoreModel* ModelFactory::MakeModelFromXML(void* modelElement, const std::vector<std::string>& modelNames,
+                                           ScoreDictionary* dictionary, const std::string& arg,
+                                           ScoreDictionary* resultDictionary) {
+  LoadError().clear();
+  auto* element = static_cast<xercesc::DOMElement*>(modelElement);
+  std::vector<std::string> names = CopyNames(modelNames);
+  const std::unique_ptr<ScoreTranslator> translator = MakeTranslator(ModelOfElement(element, names), names);
+  return translator->ParseFromTree(element, dictionary, resultDictionary, arg);
+}
+
+ScoreModel* ModelFactory::MakeModelFromXML(void* modelElement, const std::vector<std::string>& modelNames,
+                                           void* otherElement, const std::string& arg) {
+  LoadError().clear();
+  auto* element = static_cast<xercesc::DOMElement*>(modelElement);
+  std::vector<std::string> names = CopyNames(modelNames);
+  const std::unique_ptr<ScoreTranslator> translator = MakeTranslator(ModelOfElement(element, names), names);
+  return translator->ParseFromTree(element, static_cast<xercesc::DOMElement*>(otherElement), arg);
+}
+
+std::string ModelFactory::GetLastLoadError() {
+  return LoadError();
+}
+
+}  // namespace MCKestrel_800

@@ -1,0 +1,50 @@
+#include "kestrel/model/ModelLibrary.h"
+
+#include "kestrel/translate/ScoreTranslator.h"
+
+namespace MCKestrel_800 {
+namespace {
+
+using GiveTranslator = ScoreTranslator* (*)();
+using TakeModelNames = void (*)(ScoreTranslator* translator, std::vector<std::string>* names);
+
+/// The marks of folders and drives on every system, and what would end a name early. An element's tag holds
+/// none of them but the colon, yet a library's name must not depend on who chose the tag.
+constexpr char kNotInFileNames[] = {'/', '\\', ':', '\0'};
+
+}  // namespace
+
+ModelLibrary::ModelLibrary(const std::string& tag) : library_(FileNameFor(tag)) {}
+
+ModelLibrary::~ModelLibrary() = default;
+
+std::string ModelLibrary::FileNameFor(const std::string& tag) {
+  const bool usable = !tag.empty() && tag[0] != '.' &&
+                      tag.find_first_of(kNotInFileNames, 0, sizeof kNotInFileNames) == std::string::npos;
+  return usable ? SharedLibrary::WithSuffix(tag + "800" + "r") : std::string();
+}
+
+std::unique_ptr<ScoreTranslator> ModelLibrary::MakeTranslator(std::vector<std::string>& names) {
+  last_error_.clear();
+  // The system takes an empty name for the program itself.
+  if (library_.GetFileName().empty()) {
+    last_error_ = "The element's tag cannot be part of a library's name.";
+    return nullptr;
+  }
+  const GiveTranslator give =
+      library_.Load() ? reinterpret_cast<GiveTranslator>(library_.FindSymbol("GiveMyTranslator")) : nullptr;
+  if (give == nullptr) {
+    last_error_ = library_.GetLastErrorText();
+    return nullptr;
+  }
+  std::unique_ptr<ScoreTranslator> translator(give());
+  if (translator == nullptr) {
+    last_error_ = library_.GetFileName() + ": GiveMyTranslator gave no translator.";
+    return nullptr;
+  }
+  const auto take_names = reinterpret_cast<TakeModelNames>(library_.FindSymbol("PassModelNames"));
+  if (take_names != nullptr) take_names(translator.get(), &names);
+  return translator;
+}
+
+}  // namespace MCKestrel_800
