@@ -1,0 +1,206 @@
+#include "kestrel/translate/TreeParser.h"
+
+#include <xercesc/dom/impl/DOMAttrMapImpl.hpp>
+#include <xercesc/dom/impl/DOMDocumentImpl.hpp>
+#include <xercesc/framework/XMLAttr.hpp>
+#include <xercesc/framework/XMLElementDecl.hpp>
+#include <xercesc/internal/ReaderMgr.hpp>
+#include <xercesc/internal/XMLScanner.hpp>
+
+#include "kestrel/translate/XmlText.h"
+
+namespace MCKestrel_800 {
+
+namespace {
+
+bool IsWhitespace(const XMLCh* text, XMLSize_t length) {
+  for (XMLSize_t i = 0; i < length; ++i) {
+    const XMLCh c = text[i];
+    if (c != u' ' && c != u'\n' && c != u'\t' && c != u'\r') return false;
+  }
+  return true;
+}
+
+}  // namespace
+
+void TreeAttribute::SetText(xercesc::DOMDocumentImpl* document, const XMLCh* value) {
+  text_ = new (document, xercesc::DOMMemoryManager::TEXT_OBJECT) xercesc::DOMTextImpl(document, value);
+  text_->fNode.fOwnerNode = this;
+  text_->fNode.isOwned(true);
+  text_->fNode.isFirstChild(true);
+  text_->fChild.previousSibling = text_;
+  fParent.fFirstChild = text_;
+}
+
+// Whoever changes the attribute gets the general answer, unless the change leaves one text of ours.
+const XMLCh* TreeAttribute::getValue() const {
+  if (text_ != nullptr && fParent.fFirstChild == text_ && text_->fChild.nextSibling == nullptr) {
+    return text_->fCharacterData.getNodeValue();
+  }
+  return DOMAttrImpl::getValue();
+}
+
+size_t TreeParser::NameCounter::Add(const XMLCh* pooledName) {
+  const size_t mask = slots_.size() - 1;
+  size_t slot = (reinterpret_cast<size_t>(pooledName) >> 3) * 0x9E3779B97F4A7C15u >> 20 & mask;
+  while (slots_[slot] != nullptr) {
+    if (slots_[slot] == pooledName) return count_;
+    slot = (slot + 1) & mask;
+  }
+  slots_[slot] = pooledName;
+  if (++count_ * 2 > slots_.size()) Grow();
+  return count_;
+}
+
+void TreeParser::NameCounter::Grow() {
+  std::vector<const XMLCh*> old(slots_.size() * 2, nullptr);
+  old.swap(slots_);
+  count_ = 0;
+  for (const XMLCh* name : old) {
+    if (name != nullptr) Add(name);
+  }
+}
+
+TreeParser::TreeParser(LoadArena* arena, const DocumentLimits& limits)
+    : XercesDOMParser(nullptr, arena), limits_(limits) {
+  setLoadExternalDTD(false);
+  setValidationScheme(Val_Never);
+  setDisableDefaultEntityResolution(true);
+  setCreateEntityReferenceNodes(false);
+  setCreateCommentNodes(false);
+  // Connected directly: an error handler would make the parser throw, and a resolver would have to answer.
+  getScanner()->setErrorReporter(this);
+  getScanner()->setEntityHandler(this);
+  open_.reserve(32);
+}
+
+TreeParser::~TreeParser() = default;
+
+void TreeParser::NoteCurrentPlace() {
+  if (errorLine_ != 0) return;
+  errorLine_ = getScanner()->getReaderMgr()->getLineNumber();
+  errorColumn_ = getScanner()->getReaderMgr()->getColumnNumber();
+}
+
+void TreeParser::CountName(const XMLCh* pooledName) {
+  if (names_.Add(pooledName) > limits_.maxNames) throw LimitReached();
+}
+
+void TreeParser::startElement(const xercesc::XMLElementDecl& declaration, const unsigned int uriId,
+                              const XMLCh* const prefix,
+                              const xercesc::RefVectorOf<xercesc::XMLAttr>& attributes,
+                              const XMLSize_t attributeCount, const bool isEmpty, const bool isRoot) {
+  if (open_.size() >= limits_.maxDepth || attributeCount > limits_.maxAttributes) {
+    NoteCurrentPlace();
+    throw LimitReached();
+  }
+  pendingWhitespace_.clear();
+  xercesc::ReaderMgr::LastExtEntityInfo place;
+  getScanner()->getReaderMgr()->getLastExtEntityInfo(place);
+  // Not through createElement, which checks the name again. The node is larger than its kind, so it must not
+  // come from what was freed of that kind.
+  TreeElement* const element =
+      new (fDocument) TreeElement(fDocument, declaration.getFullName(), place.lineNumber, place.colNumber);
+  CountName(element->getTagName());
+  if (attributeCount != 0) AddAttributes(element, attributes, attributeCount);
+  if (open_.empty()) {
+    fDocument->appendChild(element);
+  } else {
+    Link(open_.back(), element, element->fNode, element->fChild);
+    open_.back().openText = nullptr;
+  }
+  open_.push_back({element, nullptr, nullptr, nullptr, nullptr});
+  if (isEmpty) endElement(declaration, uriId, isRoot, prefix);
+}
+
+void TreeParser::AddAttributes(TreeElement* element, const xercesc::RefVectorOf<xercesc::XMLAttr>& attributes,
+                               XMLSize_t count) {
+  xercesc::DOMAttrMapImpl* const map = element->fAttributes;
+  map->reserve(count);
+  for (XMLSize_t i = 0; i < count; ++i) {
+    const xercesc::XMLAttr* const source = attributes.elementAt(i);
+    TreeAttribute* const attribute = new (fDocument) TreeAttribute(fDocument, source->getName());
+    CountName(attribute->fName);
+    attribute->SetText(fDocument, source->getValue());
+    attribute->fNode.isSpecified(source->getSpecified());
+    map->setNamedItemFast(attribute);
+  }
+}
+
+// The tree keeps a list's last node as the first one's previous sibling.
+void TreeParser::Link(OpenElement& parent, xercesc::DOMNode* node, xercesc::DOMNodeImpl& nodePart,
+                      xercesc::DOMChildNode& childPart) {
+  nodePart.fOwnerNode = parent.element;
+  nodePart.isOwned(true);
+  if (parent.firstChild == nullptr) {
+    parent.element->fParent.fFirstChild = node;
+    nodePart.isFirstChild(true);
+    parent.firstChild = &childPart;
+  } else {
+    parent.lastChild->nextSibling = node;
+    childPart.previousSibling = parent.lastNode;
+  }
+  parent.firstChild->previousSibling = node;
+  parent.lastChild = &childPart;
+  parent.lastNode = node;
+}
+
+void TreeParser::docCharacters(const XMLCh* const text, const XMLSize_t length, const bool isCData) {
+  if (open_.empty() || length == 0) return;
+  if (open_.back().openText == nullptr && !isCData && IsWhitespace(text, length)) {
+    pendingWhitespace_.append(ToUtf16(text), length);
+    return;
+  }
+  if (!pendingWhitespace_.empty()) {
+    AddText(ToXMLCh(pendingWhitespace_.data()), pendingWhitespace_.size());
+    pendingWhitespace_.clear();
+  }
+  AddText(text, length);
+}
+
+void TreeParser::ignorableWhitespace(const XMLCh* const text, const XMLSize_t length, const bool isCData) {
+  docCharacters(text, length, isCData);
+}
+
+void TreeParser::AddText(const XMLCh* text, XMLSize_t length) {
+  OpenElement& parent = open_.back();
+  if (parent.openText != nullptr) {
+    parent.openText->appendDataFast(text, length);
+    return;
+  }
+  xercesc::DOMTextImpl* const node =
+      new (fDocument, xercesc::DOMMemoryManager::TEXT_OBJECT) xercesc::DOMTextImpl(fDocument, text, length);
+  Link(parent, node, node->fNode, node->fChild);
+  parent.openText = node;
+}
+
+void TreeParser::endElement(const xercesc::XMLElementDecl&, const unsigned int, const bool,
+                            const XMLCh* const) {
+  CloseElement();
+}
+
+void TreeParser::CloseElement() {
+  if (!pendingWhitespace_.empty()) {
+    if (open_.back().firstChild == nullptr) {
+      AddText(ToXMLCh(pendingWhitespace_.data()), pendingWhitespace_.size());
+    }
+    pendingWhitespace_.clear();
+  }
+  open_.pop_back();
+}
+
+void TreeParser::error(const unsigned int, const XMLCh* const, const xercesc::XMLErrorReporter::ErrTypes type,
+                       const XMLCh* const, const XMLCh* const, const XMLCh* const, const XMLFileLoc line,
+                       const XMLFileLoc column) {
+  if (type == xercesc::XMLErrorReporter::ErrType_Warning || errorLine_ != 0) return;
+  errorLine_ = line;
+  errorColumn_ = column;
+}
+
+// Default resolution is off, so no answer means that the parser reports an error and opens nothing.
+xercesc::InputSource* TreeParser::resolveEntity(xercesc::XMLResourceIdentifier*) {
+  entityRefused_ = true;
+  return nullptr;
+}
+
+}  // namespace MCKestrel_800
