@@ -1,5 +1,5 @@
-// Turns the elements of a PMML document into the library's objects. Model plug-ins derive their translators from this
-// class and call its readers, so every reader is a public operation.
+// Turns the elements of a PMML document into the library's objects. Model plug-ins derive their translators
+// from this class and call its readers, so every reader is a public operation.
 
 #ifndef KESTREL_TRANSLATE_PMMLTRANSLATOR_H
 #define KESTREL_TRANSLATE_PMMLTRANSLATOR_H
@@ -23,10 +23,10 @@ class ScoreMissingValueSet;
 
 /// The readers of PMML elements.
 ///
-/// Errors: every reader throws KestrelException at the first fault, with line and column where they are known, and
-/// deletes what it was building. Elements belong to the caller's document and are not kept.
-/// Threads: a translator keeps no state between calls of the dictionary readers; one translator serves one document at
-/// a time, several translators serve several threads.
+/// Errors: every reader throws KestrelException at the first fault, with line and column where they are
+/// known, and deletes what it was building. Elements belong to the caller's document and are not kept.
+/// Threads: a translator keeps no state between calls of the dictionary readers; one translator serves one
+/// document at a time, several translators serve several threads.
 class KESTREL_API PMMLTranslator : public BaseTranslator {
  public:
   PMMLTranslator();
@@ -38,13 +38,21 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   /// Reads a `DataDictionary` element.
   /// dataDictionary  the element; null is an error (code 1).
   /// reserved        without meaning; pass false.
-  /// Returns a new dictionary, never null or empty, that the caller deletes. Its variables keep the document's order in
-  /// `GetVarNames`. Categorical variables have their encoder, with codes in the order of their valid values.
+  /// Returns a new dictionary, never null or empty, that the caller deletes. Its variables keep the
+  /// document's order in `GetVarNames`. Categorical variables have their encoder, with codes in the order of
+  /// their valid values.
   ScoreDictionary* ParseDictionary(xercesc::DOMNode* dataDictionary, bool reserved);
 
+  /// Reads the children of a categorical or ordinal `DataField` into its variable, which has its name, type
+  /// and flags but no values yet: value labels, missing values and display format.
+  static void ParseCategoricalValues(xercesc::DOMElement* field, ScoreDictVar* variable);
+
+  /// The same for a continuous `DataField`.
+  static void ParseContinuousValues(xercesc::DOMElement* field, ScoreDictVar* variable);
+
   /// Reads one `Interval` of a continuous field: what lies outside it is added to `set` as missing ranges.
-  /// var       the field's variable; null is allowed, since an interval means the same for every continuous field.
-  /// reserved  without meaning; pass 0.
+  /// var       the field's variable; null is allowed, since an interval means the same for every continuous
+  /// field. reserved  without meaning; pass 0.
   static void handleInterval(ScoreDictVar* var, xercesc::DOMNode* interval, ScoreMissingValueSet* set,
                              int reserved);
 
@@ -58,14 +66,16 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   /// Returns false, adding nothing, when `flags` is 0; a bound given twice is an error (code 5).
   static bool HandleVEXAMissingInterval(ScoreMissingValueSet* set, int flags, double lower, double upper);
 
-  /// The date/time type that a `dataType` text names; `kNoDateTime` for every other text, the empty one and null.
+  /// The date/time type that a `dataType` text names; `kNoDateTime` for every other text, the empty one and
+  /// null.
   static DateTimeType ParseDateTimeType(const XMLCh* dataType);
 
-  /// Reads an `Extension` element's "UsageType" children: the value "disable" turns the variable's usage type off.
+  /// Reads an `Extension` element's "UsageType" children: the value "disable" turns the variable's usage type
+  /// off.
   static void ParseUsageTypeExtension(xercesc::DOMElement* extension, ScoreDictVar* variable);
 
-  /// Gives a nominal or ordinal variable its category encoder, unless it has one, and encodes its value labels in
-  /// their order. Returns false, doing nothing, for null and for a continuous variable.
+  /// Gives a nominal or ordinal variable its category encoder, unless it has one, and encodes its value
+  /// labels in their order. Returns false, doing nothing, for null and for a continuous variable.
   static bool SetupCatEncoder(ScoreDictVar* variable);
 };
 
