@@ -3,6 +3,8 @@
 #include <istream>
 #include <memory>
 #include <mutex>
+#include <utility>
+#include <xercesc/dom/DOMElement.hpp>
 
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/model/InputFile.h"
@@ -51,7 +53,7 @@ std::unique_ptr<ScoreTranslator> MakeTranslator(const FoundModel& model, std::ve
   std::unique_ptr<ScoreTranslator> translator = library.MakeTranslator(names);
   if (translator == nullptr) {
     LoadError() = library.GetLastErrorText();
-    FailAt(model.element, ExceptionCode::kUnsupported,
+    FailAt(model.element, KestrelException::kUnsupported,
            "Doesn't Support " + model.tag + "  Model: No Required dll or lib available!");
   }
   return translator;
@@ -90,7 +92,7 @@ ScoreModel* MakeModelFromFile(const std::string& fileName, const std::string& na
   LoadError().clear();
   std::vector<std::string> names = ReadNamesFile(namesFileName);
   std::ifstream in = OpenInputFile(fileName);
-  if (!in.is_open()) Fail(ExceptionCode::kFile, "Could not open model file");
+  if (!in.is_open()) Fail(KestrelException::kFile, "Could not open model file");
   return MakeModel(in, std::move(names), arg, secondArg);
 }
 

@@ -112,22 +112,22 @@ FoundModel FindModel(const DOMElement* root, const std::vector<std::string>& nam
   const std::string root_tag = Narrow(root->getTagName());
   const auto* rule = std::find_if(std::begin(kRoots), std::end(kRoots),
                                   [&root_tag](const RootRule& row) { return root_tag == row.root; });
-  if (rule == std::end(kRoots)) FailAt(root, ExceptionCode::kUnsupported, kUnsupported);
+  if (rule == std::end(kRoots)) FailAt(root, KestrelException::kUnsupported, kUnsupported);
   if (rule->sign != nullptr) {
     if (const DOMElement* sign = FindFirstOf(root, {rule->sign})) return {rule->tag, sign};
   } else if (rule->tag != nullptr) {
     return {rule->tag, root};
   }
   const DOMElement* element = FindFirstOf(root, names);
-  if (element == nullptr) FailAt(root, ExceptionCode::kUnsupported, kUnsupported);
+  if (element == nullptr) FailAt(root, KestrelException::kUnsupported, kUnsupported);
   return {Translated(Narrow(element->getTagName()), kLibraryTags), element};
 }
 
 FoundModel ModelOfElement(const DOMElement* element, const std::vector<std::string>& names) {
-  if (element == nullptr) Fail(ExceptionCode::kUnsupported, "Empty Node!!");
+  if (element == nullptr) Fail(KestrelException::kUnsupported, "Empty Node!!");
   const std::string tag = Translated(Narrow(element->getTagName()), kOlderTags);
   if (std::find(names.begin(), names.end(), tag) == names.end()) {
-    FailAt(element, ExceptionCode::kUnsupported, kUnsupported);
+    FailAt(element, KestrelException::kUnsupported, kUnsupported);
   }
   return {Translated(tag, kLibraryTags), element};
 }

@@ -59,7 +59,7 @@ void ReadModelNames(const std::string& path, std::vector<std::string>& names) {
   // A folder opens as a file does on some systems and fails only when it is read.
   if (!in.is_open() || in.bad()) {
     names.clear();
-    Fail(ExceptionCode::kFile, "Could not open model names file");
+    Fail(KestrelException::kFile, "Could not open model names file");
   }
 }
 

@@ -1,0 +1,81 @@
+// Tests of naming a model's library.
+
+#include "kestrel/model/ModelLibrary.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "kestrel/translate/ScoreTranslator.h"
+
+namespace {
+
+using namespace MCKestrel_800;
+
+const std::string kEnd = std::string("800r") + SharedLibrary::GetSuffix();
+
+TEST(ModelLibrary, FormsItsNameFromTheTag) {
+  struct Row {
+    std::string tag;
+    std::string expected;
+    const char* why;
+  };
+  const Row rows[] = {
+      {"TreeModel", "TreeModel" + kEnd, "the rule"},
+      {"Tree.Model-2_x", "Tree.Model-2_x" + kEnd, "what else a tag may hold"},
+      {"Mod\xC3\xA8le", "Mod\xC3\xA8le" + kEnd, "letters beyond ASCII"},
+      {"TreeModel.dll", "TreeModel.dll" + kEnd, "a suffix inside the name is part of it"},
+      {"TreeModel.so", "TreeModel.so" + kEnd, "a suffix inside the name is part of it"},
+      {"", "", "no tag"},
+      {"a/b", "", "a folder"},
+      {"/TreeModel", "", "the top folder"},
+      {"../TreeModel", "", "the folder above"},
+      {"..", "", "the folder above"},
+      {".TreeModel", "", "a hidden file"},
+      {"a\\b", "", "a folder on Windows"},
+      {"c:TreeModel", "", "a drive on Windows"},
+      {"p:TreeModel", "", "a prefix, which would be a drive on Windows"},
+      {std::string("Tree\0Model", 10), "", "a name that ends early"},
+  };
+  for (const Row& row : rows)
+    EXPECT_EQ(ModelLibrary::FileNameFor(row.tag), row.expected) << row.why;
+}
+
+TEST(ModelLibrary, LoadsNothingForATagThatIsNoName) {
+  std::vector<std::string> names;
+  for (const char* tag : {"", "../TreeModel", "p:TreeModel", "./TreeModel"}) {
+    ModelLibrary library(tag);
+    EXPECT_EQ(library.MakeTranslator(names), nullptr) << tag;
+    EXPECT_NE(library.GetLastErrorText(), "") << tag;
+  }
+}
+
+TEST(ModelLibrary, GivesATranslator) {
+  std::vector<std::string> names;
+  ModelLibrary library("TreeModel");
+  EXPECT_NE(library.MakeTranslator(names), nullptr) << library.GetLastErrorText();
+  EXPECT_EQ(library.GetLastErrorText(), "") << "the missing second entry point is no failure";
+}
+
+TEST(ModelLibrary, TellsWhatWentWrong) {
+  struct Row {
+    const char* tag;
+    const char* why;
+  };
+  const Row rows[] = {
+      {"NoSuchModel", "absent"},
+      {"NotALibrary", "a text file"},
+      {"Fault_NEEDS_ABSENT", "needs a library that is absent"},
+      {"Fault_NO_ENTRY", "no entry point"},
+      {"Fault_NULL_TRANSLATOR", "no translator"},
+  };
+  std::vector<std::string> names;
+  for (const Row& row : rows) {
+    ModelLibrary library(row.tag);
+    EXPECT_EQ(library.MakeTranslator(names), nullptr) << row.why;
+    EXPECT_NE(library.GetLastErrorText(), "") << row.why;
+  }
+}
+
+}  // namespace

@@ -1,0 +1,81 @@
+// Shows that a result that is filled case after case allocates nothing after the first one. A program of its
+// own, because it counts every allocation of the process.
+
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <cstdlib>
+#include <new>
+#include <string>
+#include <vector>
+
+#include "kestrel/model/Results.h"
+
+namespace {
+
+std::atomic<size_t> allocations{0};
+
+}  // namespace
+
+void* operator new(size_t size) {
+  allocations.fetch_add(1, std::memory_order_relaxed);
+  if (void* memory = std::malloc(size != 0 ? size : 1)) return memory;
+  throw std::bad_alloc();
+}
+void operator delete(void* memory) noexcept {
+  std::free(memory);
+}
+void operator delete(void* memory, size_t) noexcept {
+  std::free(memory);
+}
+
+namespace {
+
+using namespace MCKestrel_800;
+
+TEST(ResultAllocation, IsCountedHere) {
+  const size_t before = allocations;
+  const std::vector<int> some(100);
+  EXPECT_GT(allocations, before) << some.size();
+}
+
+TEST(ResultAllocation, RegressionCasesNeedNone) {
+  RegResult result;
+  NumericValue number;
+  const size_t before = allocations;
+  for (int i = 0; i < 1000; ++i) {
+    result.Reset();
+    number.SetDoubleValue(i);
+    result.SetPrediction(&number);
+    result.SetStandardError(0.5);
+  }
+  EXPECT_EQ(allocations, before);
+  EXPECT_EQ(result.GetPrediction()->GetDouble(), 999.0);
+}
+
+template <typename Value>
+void ExpectNoneAfterTheFirstCase(const std::vector<Value>& categories) {
+  ClsResult result;
+  size_t after_first = 0;
+  for (int i = 0; i < 1000; ++i) {
+    result.Reset();
+    for (const Value& category : categories)
+      result.AddCategoryProbability(&category, 0.125);
+    result.SetPrediction(&categories[i % 2]);
+    result.SetProbability(0.125);
+    if (i == 1) after_first = allocations;
+  }
+  EXPECT_EQ(allocations, after_first);
+  EXPECT_EQ(result.GetCategoryCount(), categories.size());
+}
+
+TEST(ResultAllocation, ClassificationCasesNeedNoneAfterTheFirst) {
+  ExpectNoneAfterTheFirstCase<NumericValue>({NumericValue(1.0), NumericValue(2.0), NumericValue(3.0)});
+  ExpectNoneAfterTheFirstCase<StringValue>({StringValue("yes"), StringValue("no")});
+  ExpectNoneAfterTheFirstCase<StringValue>(
+      {StringValue(std::string(100, 'a')), StringValue(std::string(90, 'b'))});
+  ExpectNoneAfterTheFirstCase<DateTimeValue>(
+      {DateTimeValue(0.0, kDateVal), DateTimeValue(86400.0, kDateVal)});
+}
+
+}  // namespace
