@@ -1,0 +1,103 @@
+#include "kestrel/foundation/NumberText.h"
+
+#include <charconv>
+#include <limits>
+
+namespace MCKestrel_800 {
+
+namespace {
+
+bool IsDigit(char c) {
+  return c >= '0' && c <= '9';
+}
+bool IsSpace(char c) {
+  return c == ' ' || (c >= '\t' && c <= '\r');
+}
+
+/// Whether a number that a double cannot hold is too large, rather than too small: its first digit that is
+/// not zero decides, moved by the exponent.
+bool IsTooLarge(const char* first, const char* last) {
+  long long place = 0;
+  bool point = false, seen = false;
+  const char* at = first;
+  for (; at != last && *at != 'e' && *at != 'E'; ++at) {
+    if (*at == '.') {
+      point = true;
+    } else if (IsDigit(*at)) {
+      seen = seen || *at != '0';
+      if (seen && !point) ++place;
+      if (!seen && point) --place;
+    }
+  }
+  if (at == last) return place > 0;
+  ++at;
+  const bool negative = at != last && *at == '-';
+  if (at != last && (*at == '-' || *at == '+')) ++at;
+  long long exponent = 0;
+  for (; at != last && exponent < 1'000'000'000'000; ++at)
+    exponent = 10 * exponent + (*at - '0');
+  return place + (negative ? -exponent : exponent) > 0;
+}
+
+}  // namespace
+
+bool ParseDouble(const char* first, const char* last, double& out) {
+  const bool negative = first != last && *first == '-';
+  if (first != last && (*first == '-' || *first == '+')) ++first;
+  // from_chars alone would take a second sign, and names for infinity.
+  if (first == last || !(IsDigit(*first) || *first == '.')) return false;
+  double value = 0.0;
+  const std::from_chars_result read = std::from_chars(first, last, value);
+  if (read.ptr != last || read.ec == std::errc::invalid_argument) return false;
+  if (read.ec == std::errc::result_out_of_range) {
+    value = IsTooLarge(first, last) ? std::numeric_limits<double>::infinity() : 0.0;
+  }
+  out = negative ? -value : value;
+  return true;
+}
+
+bool ReadDouble(std::string_view text, double& out, bool* tooLarge) {
+  const char* at = text.data();
+  const char* const end = at + text.size();
+  while (at != end && IsSpace(*at))
+    ++at;
+  // What a stream takes as belonging to the number, whether or not it turns out to be one.
+  const char* const first = at;
+  if (at != end && (*at == '-' || *at == '+')) ++at;
+  bool point = false, digits = false;
+  for (; at != end; ++at) {
+    if (IsDigit(*at)) {
+      digits = true;
+    } else if (*at == '.' && !point) {
+      point = true;
+    } else {
+      break;
+    }
+  }
+  if (digits && at != end && (*at == 'e' || *at == 'E')) {
+    ++at;
+    if (at != end && (*at == '-' || *at == '+')) ++at;
+    while (at != end && IsDigit(*at))
+      ++at;
+  }
+  double value = 0.0;
+  if (!ParseDouble(first, at, value)) return false;
+  out = value;
+  if (value - value == 0.0) return true;
+  if (tooLarge != nullptr) *tooLarge = true;
+  return false;
+}
+
+size_t FormatSixDigits(double value, char (&buffer)[kSixDigitsRoom]) {
+  const std::to_chars_result end =
+      std::to_chars(buffer, buffer + kSixDigitsRoom, value, std::chars_format::general, 6);
+  return static_cast<size_t>(end.ptr - buffer);
+}
+
+std::string FormatSixDigits(double value) {
+  char buffer[kSixDigitsRoom];
+  const size_t length = FormatSixDigits(value, buffer);
+  return std::string(buffer, length);
+}
+
+}  // namespace MCKestrel_800

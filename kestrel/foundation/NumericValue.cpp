@@ -1,0 +1,116 @@
+#include "kestrel/foundation/NumericValue.h"
+
+#include <algorithm>
+#include <cmath>
+#include <string_view>
+
+#include "kestrel/foundation/NumberText.h"
+
+namespace MCKestrel_800 {
+
+namespace {
+
+constexpr double kOrderTolerance = 1e-14;
+
+/// The other's number, when it is one and neither side is missing.
+bool Comparable(const NumericValue& value, const ScoreValue& other) {
+  return other.GetType() == ScoreValue::kNumeric && !value.IsSystemMissingValue() &&
+         !other.IsSystemMissingValue();
+}
+
+/// Whether the text, after white space and a plus sign, starts with a name of infinity.
+bool NamesInfinity(std::string_view text) {
+  size_t at = 0;
+  while (at < text.size() && (text[at] == ' ' || (text[at] >= '\t' && text[at] <= '\r')))
+    ++at;
+  if (at < text.size() && text[at] == '+') ++at;
+  constexpr std::string_view kName = "inf";
+  if (text.size() - at < kName.size()) return false;
+  for (size_t i = 0; i < kName.size(); ++i) {
+    const char c = text[at + i];
+    if ((c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c) != kName[i]) return false;
+  }
+  return true;
+}
+
+}  // namespace
+
+const NumericValue NumericValue::SYSMIS;
+
+NumericValue::NumericValue(const std::string& text) {
+  FromString(text);
+}
+NumericValue::~NumericValue() = default;
+
+void NumericValue::SetValue(const ScoreValue* other) {
+  if (other != nullptr && other->GetType() == kNumeric) value_ = other->GetDouble();
+}
+
+ScoreValue* NumericValue::GetValue() const {
+  return Clone();
+}
+ScoreValue* NumericValue::Clone() const {
+  return new NumericValue(*this);
+}
+
+bool NumericValue::operator==(const ScoreValue& other) const {
+  return other.GetType() == kNumeric && IsEqual(value_, other.GetDouble());
+}
+
+bool NumericValue::Equal(const ScoreValue*, bool, bool) const {
+  return true;
+}
+
+bool NumericValue::operator>(const ScoreValue& other) const {
+  return Comparable(*this, other) && NumberLess(other.GetDouble(), value_);
+}
+bool NumericValue::operator<(const ScoreValue& other) const {
+  return Comparable(*this, other) && NumberLess(value_, other.GetDouble());
+}
+bool NumericValue::operator<=(const ScoreValue& other) const {
+  return Comparable(*this, other) && NumberLessOrEqual(value_, other.GetDouble());
+}
+bool NumericValue::operator>=(const ScoreValue& other) const {
+  return Comparable(*this, other) && NumberLessOrEqual(other.GetDouble(), value_);
+}
+
+int NumericValue::GetInt() const {
+  constexpr double kLowest = std::numeric_limits<int>::min(), kHighest = std::numeric_limits<int>::max();
+  if (std::isnan(value_)) return 0;
+  return static_cast<int>(std::clamp(value_, kLowest, kHighest));
+}
+
+std::string NumericValue::GetString() const {
+  return value_ <= gSysmisValue ? "Undefined" : FormatSixDigits(value_);
+}
+
+void NumericValue::FromString(const std::string& text) {
+  value_ = gSysmisValue;
+  double number = 0.0;
+  bool tooLarge = false;
+  if (ReadDouble(text, number, &tooLarge)) {
+    value_ = number;
+  } else if (NamesInfinity(text) || (tooLarge && number > 0.0)) {
+    value_ = gInfinity;
+  }
+}
+
+bool NumericValue::IsEqual(double a, double b) {
+  if (a == 0.0 && b == 0.0) return true;
+  if (a == gSysmisValue || b == gSysmisValue) return a == b;
+  return std::fabs(a - b) < std::max(std::fabs(a), std::fabs(b)) * fEpsilon;
+}
+
+bool NumberLess(double a, double b) {
+  if (a == NumericValue::gSysmisValue || b == NumericValue::gSysmisValue) return false;
+  const double d = a - b;
+  return d < 0.0 && std::fabs(d) >= kOrderTolerance;
+}
+
+bool NumberLessOrEqual(double a, double b) {
+  if (a == NumericValue::gSysmisValue || b == NumericValue::gSysmisValue) return false;
+  const double d = a - b;
+  return d < 0.0 || std::fabs(d) < kOrderTolerance;
+}
+
+}  // namespace MCKestrel_800

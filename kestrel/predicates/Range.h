@@ -1,0 +1,65 @@
+// An interval of values, such as a variable's missing values or a bin.
+
+#ifndef KESTREL_PREDICATES_RANGE_H
+#define KESTREL_PREDICATES_RANGE_H
+
+#include <iosfwd>
+
+#include "kestrel/platform/Export.h"
+#include "kestrel/predicates/ScoreValueRange.h"
+
+namespace MCKestrel_800 {
+
+/// The interval between two values, or a single value.
+///
+/// An end that is included holds whatever NumericValue::IsEqual calls equal to it; the inside is strict. A
+/// range whose ends are equal holds that value alone, whatever its flags, by the value's own equality; other
+/// ranges hold numbers only, and never the system-missing one.
+///
+/// Threads: a finished range may be asked from several threads.
+class KESTREL_API Range : public ScoreValueRange {
+ public:
+  /// Numbers; a system-missing minimum becomes minus infinity in the value object.
+  Range(double min, double max, bool lowIncluded, bool highIncluded);
+  /// Takes both values over. A null end, and a system-missing minimum (not maximum), is an infinity. The same
+  /// object for both ends makes a single value.
+  Range(ScoreValue* min, ScoreValue* max, bool lowIncluded, bool highIncluded);
+  /// The single value, which the range takes over; null is minus infinity.
+  explicit Range(ScoreValue* value);
+  Range(const Range& other);
+  Range& operator=(const Range& other);
+  ~Range() override;
+
+  /// Both ends and both flags are equal.
+  bool operator==(const ScoreValueRange& other) const override;
+  ScoreValueRange* Clone() const override;
+  /// Null is ignored; a system-missing number becomes minus infinity.
+  void SetMin(ScoreValue* value) override;
+  /// Null takes the upper end away; then the range's numbers keep the end they had.
+  void SetMax(ScoreValue* value) override;
+  bool IsInRange(double x) const override;
+  bool IsInRange(const ScoreValue* value) const override;
+  const ScoreValue* GetMin() const override { return min_; }
+  const ScoreValue* GetMax() const override { return max_; }
+  bool GetHighEnd() const override { return high_included_; }
+  bool GetLowEnd() const override { return low_included_; }
+  void Display(std::ostream& out) const override;
+
+ private:
+  /// Keeps the ends as numbers, which the test of a number uses, and whether they are equal.
+  void NoteMin();
+  void NoteMax();
+  void NoteSingle();
+
+  ScoreValue* min_ = nullptr;
+  ScoreValue* max_ = nullptr;
+  bool high_included_ = false;
+  bool low_included_ = false;
+  bool single_ = false;
+  double min_number_;
+  double max_number_;
+};
+
+}  // namespace MCKestrel_800
+
+#endif  // KESTREL_PREDICATES_RANGE_H
