@@ -13,6 +13,7 @@
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
+#include "kestrel/translate/VerifiedText.h"
 #include "kestrel/translate/XmlText.h"
 
 namespace MCKestrel_800 {
@@ -171,7 +172,7 @@ void CheckNumberOfFields(const DOMElement* dictionary, size_t count) {
     FailAt(dictionary, KestrelException::kInconsistentDictionary,
            "Attribute \"numberOfFields\": Null string is an invalid integer string!");
   }
-  if (static_cast<long long>(BaseTranslator::VerifyInt(declared)) != static_cast<long long>(count)) {
+  if (static_cast<long long>(VerifyIntAt(dictionary, declared)) != static_cast<long long>(count)) {
     FailAt(dictionary, KestrelException::kInconsistentDictionary,
            "Number of Variables in the Dictionary does not match with numberOfFields!");
   }
@@ -189,7 +190,7 @@ ScoreDictionary* PMMLTranslator::ParseDictionary(DOMNode* dataDictionary, bool /
     if (!ElementIs(child, Tag::XML_ELE_DATAFIELD)) {
       FailAt(child, KestrelException::kStructure, "<DataField> or <Extension> is required here!!");
     }
-    const XMLCh* wideName = GetAttributeForced(child, PMMLModelTags::XML_ATT_DATAFIELD_NAME);
+    const XMLCh* wideName = RequiredAttribute(child, Tag::XML_ATT_DATAFIELD_NAME);
     if (IsEmpty(wideName)) {
       FailAt(child, KestrelException::kStructure, "<DataField>'s name can't be null string !!");
     }

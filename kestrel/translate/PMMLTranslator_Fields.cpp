@@ -129,7 +129,7 @@ void FieldValues::ReadChild(DOMElement* child) {
 }
 
 void FieldValues::ReadValue(const DOMElement* element) {
-  const XMLCh* text = BaseTranslator::GetAttributeForced(element, PMMLModelTags::XML_ATT_VALUE_VALUE);
+  const XMLCh* text = RequiredAttribute(element, Tag::XML_ATT_VALUE_VALUE);
   const XMLCh* property = Attribute(element, Tag::XML_ATT_VALUE_PROPERTY);
   for (const PropertyRow& row : kProperties) {
     if (!Equals(property, row.text)) continue;

@@ -5,6 +5,7 @@
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/translate/BaseTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
+#include "kestrel/translate/XmlText.h"
 
 namespace MCKestrel_800 {
 
@@ -22,6 +23,11 @@ int VerifyIntAt(const xercesc::DOMElement* element, const XMLCh* text) {
   } catch (const KestrelException& fault) {
     FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
   }
+}
+
+const XMLCh* RequiredAttribute(const xercesc::DOMElement* element, const char16_t* name) {
+  const XMLCh* text = FindAttribute(element, name);
+  return text != nullptr ? text : BaseTranslator::GetAttributeForced(element, Narrow(ToXMLCh(name)));
 }
 
 }  // namespace MCKestrel_800

@@ -1,4 +1,4 @@
-// Numbers in attributes, checked: a text that is not a number is reported with the element that holds it.
+// Attributes, checked: what is absent or not a number is reported with the element that should hold it.
 
 #ifndef KESTREL_TRANSLATE_VERIFIEDTEXT_H
 #define KESTREL_TRANSLATE_VERIFIEDTEXT_H
@@ -15,6 +15,10 @@ namespace MCKestrel_800 {
 /// the element's place when they refuse it. Null is refused like the empty text.
 double VerifyDoubleAt(const xercesc::DOMElement* element, const XMLCh* text);
 int VerifyIntAt(const xercesc::DOMElement* element, const XMLCh* text);
+
+/// What BaseTranslator::GetAttributeForced gives, without converting the name on the way: for what is read
+/// often.
+const XMLCh* RequiredAttribute(const xercesc::DOMElement* element, const char16_t* name);
 
 }  // namespace MCKestrel_800
 
