@@ -104,8 +104,8 @@ class KESTREL_API BaseTranslator : public ScoreTranslator {
   static double VerifyDouble(const std::string& text);
   static double VerifyDouble(const XMLCh* text);
 
-  /// The number of a date/time text of the type, as DateTimeValue has it. Code 3 when the text is not of the
-  /// type.
+  /// The number of a date/time text of the type: seconds, as DateTimeValue::GetDouble gives them. Code 3 when
+  /// the text is not of the type.
   static double VerifyDateTime(const std::string& text, DateTimeType type);
   static double VerifyDateTime(const XMLCh* text, DateTimeType type);
 
