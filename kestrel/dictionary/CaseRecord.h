@@ -13,14 +13,14 @@ namespace MCKestrel_800 {
 
 class NumericValue;
 
-/// A case record whose slots are written in place: filling an occupied slot by position allocates nothing for numbers
-/// and dates, and for texts only when a text is longer than any before it in that slot.
+/// A case record whose slots are written in place: filling an occupied slot by position allocates nothing for
+/// numbers and dates, and for texts only when a text is longer than any before it in that slot.
 ///
 /// A record is filled once with `Add` and then reused for case after case. Copies are deep.
 class KESTREL_API CaseRecord : public ScoreCaseRecord {
  public:
-  /// Reserves room for `n` values; the record starts without slots. A number that is no sensible count is not taken
-  /// at its word: room beyond a limit is made when it is needed.
+  /// Reserves room for `n` values; the record starts without slots. A number that is no sensible count is not
+  /// taken at its word: room beyond a limit is made when it is needed.
   explicit CaseRecord(int n = 0);
   CaseRecord(const CaseRecord& other);
   CaseRecord& operator=(const CaseRecord& other);
@@ -58,7 +58,8 @@ class KESTREL_API CaseRecord : public ScoreCaseRecord {
 
   std::map<std::string, int> positions_;
   std::vector<ScoreValue*> values_;
-  // values_[i] again where it is exactly a NumericValue, else null: spares the per-case road asking for its type.
+  // values_[i] again where it is exactly a NumericValue, else null: spares the per-case road asking for its
+  // type.
   std::vector<NumericValue*> numbers_;
   unsigned long long stamp_;
 };

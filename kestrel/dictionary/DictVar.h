@@ -120,8 +120,8 @@ class KESTREL_API DictVar : public ScoreDictVar {
   bool emptyCateValues_ = false;
   std::string flagTypeTrueValue_;
 
-  // missingValues_ and valueLabels_ again where they are our own sets, which answer without a copy or a walk; else
-  // null. Asked for when a set is put in, so that no case pays for it.
+  // missingValues_ and valueLabels_ again where they are our own sets, which answer without a copy or a walk;
+  // else null. Asked for when a set is put in, so that no case pays for it.
   const MissingValueSet* indexedMissingValues_ = nullptr;
   const ValueLabelSet* indexedValueLabels_ = nullptr;
 };

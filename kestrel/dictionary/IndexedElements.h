@@ -1,4 +1,5 @@
-// What the sets of value labels and of value probabilities have in common: owned elements, found by their value.
+// What the sets of value labels and of value probabilities have in common: owned elements, found by their
+// value.
 
 #ifndef KESTREL_DICTIONARY_INDEXEDELEMENTS_H
 #define KESTREL_DICTIONARY_INDEXEDELEMENTS_H
@@ -12,19 +13,21 @@
 
 namespace MCKestrel_800 {
 
-/// Elements of an interface with `GetValue`, `operator==` and `Clone`, owned and in order of arrival, with look-ups
-/// that answer as a walk would.
+/// Elements of an interface with `GetValue`, `operator==` and `Clone`, owned and in order of arrival, with
+/// look-ups that answer as a walk would.
 ///
-/// `Element` is the implementation whose elements are filed by their value; it keeps a pointer `changed_` to a flag
-/// that it sets when its value is replaced. Other implementations are asked each time. While the flag is up, look-ups
-/// walk; the next `Add` or `Remove` files everything anew. Nothing const changes anything, so readers need no lock.
+/// `Element` is the implementation whose elements are filed by their value; it keeps a pointer `changed_` to
+/// a flag that it sets when its value is replaced. Other implementations are asked each time. While the flag
+/// is up, look-ups walk; the next `Add` or `Remove` files everything anew. Nothing const changes anything, so
+/// readers need no lock.
 template <class Interface, class Element>
 class IndexedElements {
  public:
   static constexpr std::size_t kNone = ValueIndex::kNone;
 
   IndexedElements() = default;
-  IndexedElements(const IndexedElements& other) { AppendClones(other); }
+  // Through the default constructor, so that the destructor runs when a clone cannot be made.
+  IndexedElements(const IndexedElements& other) : IndexedElements() { AppendClones(other); }
   IndexedElements& operator=(const IndexedElements& other) {
     if (this == &other) return *this;
     IndexedElements copy(other);
@@ -41,10 +44,12 @@ class IndexedElements {
   bool Add(Interface* element) {
     if (element == nullptr) return false;
     elements_.push_back(element);
-    if (changed_ || (index_.Size() == 0 && elements_.size() > ValueIndex::kSmall)) {
+    const bool outgrown = index_.Size() == 0 && elements_.size() > ValueIndex::kSmall;
+    if (changed_ || outgrown) {
       FileAll();
     } else {
-      File(element);
+      Watch(element);
+      if (index_.Size() != 0) FileNext(*element);
     }
     return true;
   }
@@ -65,13 +70,24 @@ class IndexedElements {
     return true;
   }
 
-  /// The position of the first element whose value equals `value`; kNone for null.
+  /// The first position whose element's value says that it equals `value`; kNone for null.
   std::size_t FirstWithValue(const ScoreValue* value) const {
     if (value == nullptr) return kNone;
     return First(value, [&](std::size_t position) {
       const ScoreValue* own = elements_[position]->GetValue();
-      return own != nullptr && *value == *own;
+      return own != nullptr && *own == *value;
     });
+  }
+
+  /// True when `value` says of some element's value that it equals it. Values of foreign classes apart, the
+  /// same as asking the other way round.
+  bool AnyEqualTo(const ScoreValue* value) const {
+    if (value == nullptr) return false;
+    const auto matches = [&](std::size_t position) {
+      const ScoreValue* own = elements_[position]->GetValue();
+      return own != nullptr && *value == *own;
+    };
+    return First(value, matches) != kNone;
   }
 
   /// True when some element's value gives `Equal(value, exact, emptyStringOK)`.
@@ -119,13 +135,6 @@ class IndexedElements {
     if (IsOwnKind(*element)) static_cast<Element*>(element)->changed_ = &changed_;
   }
 
-  /// Watches the newest element and, when an index is kept, files it.
-  void File(Interface* element) {
-    Watch(element);
-    if (index_.Size() + 1 != elements_.size() || elements_.size() <= ValueIndex::kSmall) return;
-    FileNext(*element);
-  }
-
   void FileNext(const Interface& element) {
     const ValueKey key = IsOwnKind(element) ? MakeValueKey(element.GetValue()) : ValueKey();
     if (key.kind == ValueKey::kForeign) {
@@ -144,19 +153,23 @@ class IndexedElements {
     index_.Clear();
     othersThanText_ = 0;
     changed_ = false;
-    for (Interface* element : elements_) Watch(element);
+    for (Interface* element : elements_)
+      Watch(element);
     if (elements_.size() <= ValueIndex::kSmall) return;
-    for (const Interface* element : elements_) FileNext(*element);
+    for (const Interface* element : elements_)
+      FileNext(*element);
   }
 
   void AppendClones(const IndexedElements& other) {
     elements_.reserve(other.elements_.size());
-    for (const Interface* element : other.elements_) elements_.push_back(element->Clone());
+    for (const Interface* element : other.elements_)
+      elements_.push_back(element->Clone());
     FileAll();
   }
 
   void Clear() {
-    for (Interface* element : elements_) delete element;
+    for (Interface* element : elements_)
+      delete element;
     elements_.clear();
     index_.Clear();
     othersThanText_ = 0;

@@ -1,4 +1,5 @@
-// The one implementation of ScoreMissingValueSet, with look-ups that do not grow with the number of single values.
+// The one implementation of ScoreMissingValueSet, with look-ups that do not grow with the number of single
+// values.
 
 #ifndef KESTREL_DICTIONARY_MISSINGVALUESET_H
 #define KESTREL_DICTIONARY_MISSINGVALUESET_H
@@ -11,8 +12,9 @@
 
 namespace MCKestrel_800 {
 
-/// A missing-value set whose answers are those of a walk from the first range to the last. Once the set has grown
-/// beyond a few ranges, duplicates and single values are found through an index; true intervals are still walked.
+/// A missing-value set whose answers are those of a walk from the first range to the last. Once the set has
+/// grown beyond a few ranges, duplicates and single values are found through an index; true intervals are
+/// still walked.
 ///
 /// A range must not be changed through a pointer that was kept after it was added.
 /// The index changes in `Add` and `Remove` alone: a set that nobody changes may be read by several threads.

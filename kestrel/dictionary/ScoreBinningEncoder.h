@@ -11,7 +11,8 @@
 namespace MCKestrel_800 {
 
 /// Maps a number to the index of its bin. With the ascending cut points c[0..k-1] the bins are (-inf, c[0]],
-/// (c[0], c[1]], ..., (c[k-1], +inf), numbered 0 to k. It registers nothing: `Encode` and `EncodeConst` agree.
+/// (c[0], c[1]], ..., (c[k-1], +inf), numbered 0 to k. It registers nothing: `Encode` and `EncodeConst`
+/// agree.
 ///
 /// In the forms that take a value or a text, what is no number, NaN and the system-missing value give -1.
 class KESTREL_API ScoreBinningEncoder : public ScoreEncoder {
@@ -27,8 +28,8 @@ class KESTREL_API ScoreBinningEncoder : public ScoreEncoder {
   int GetNumberOfCategories() const override;
   int Encode(const ScoreValue* value) override;
   int Encode(const std::string& text) override;
-  /// The index of the number's bin. Every number has one: the system-missing value lies below all cut points, and NaN,
-  /// which is below nothing, goes to the last bin.
+  /// The index of the number's bin. Every number has one: the system-missing value lies below all cut points,
+  /// and NaN, which is below nothing, goes to the last bin.
   double Encode(double number) const;
   int EncodeConst(const std::string& text) const override;
   int EncodeConst(const ScoreValue* value) const override;

@@ -13,9 +13,9 @@ namespace MCKestrel_800 {
 
 /// Hands out codes 0, 1, 2, ... to numbers in the order of their first appearance.
 ///
-/// Numbers are the same when they compare equal exactly; 0 and -0 are one. A number that is not a number (NaN) is no
-/// category: it gives -1 and is not registered. A text that does not read as a number stands for the system-missing
-/// value, which is encoded like any other.
+/// Numbers are the same when they compare equal exactly; 0 and -0 are one. A number that is not a number
+/// (NaN) is no category: it gives -1 and is not registered. A text that does not read as a number stands for
+/// the system-missing value, which is encoded like any other.
 class KESTREL_API ScoreCatNumericEncoder : public ScoreEncoder {
  public:
   /// Reserves room for `n` categories, within reason.

@@ -15,9 +15,9 @@ namespace MCKestrel_800 {
 
 /// Hands out codes 0, 1, 2, ... to texts in the order of their first appearance.
 ///
-/// Unless no-space-trim is set, the key of a text is the text without its trailing blanks; a text of nothing but
-/// blanks has the key " " when empty-string-OK is set and the empty key otherwise. A text whose key is registered gets
-/// that key's code. `EncodeConst` allocates nothing.
+/// Unless no-space-trim is set, the key of a text is the text without its trailing blanks; a text of nothing
+/// but blanks has the key " " when empty-string-OK is set and the empty key otherwise. A text whose key is
+/// registered gets that key's code. `EncodeConst` allocates nothing.
 class KESTREL_API ScoreCatStringEncoder : public ScoreEncoder {
  public:
   /// Reserves room for `n` categories, within reason.

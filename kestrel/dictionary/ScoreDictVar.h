@@ -18,13 +18,15 @@
 
 namespace MCKestrel_800 {
 
-/// A variable: its name, its storage kind and measurement level, the values it may take and those that count as
-/// missing. `IsMissingValue` and `IsValidValue` are the one test of missing and valid case values.
+/// A variable: its name, its storage kind and measurement level, the values it may take and those that count
+/// as missing. `IsMissingValue` and `IsValidValue` are the one test of missing and valid case values.
 ///
-/// Setters that take an object own it from then on and overwrite the pointer held so far without deleting that object:
-/// whoever replaces one disposes of the old one. What getters return stays owned by the variable.
+/// Setters that take an object own it from then on and overwrite the pointer held so far without deleting
+/// that object: whoever replaces one disposes of the old one. What getters return stays owned by the
+/// variable.
 ///
-/// A variable is built on one thread; afterwards several threads may read it as long as nobody calls a setter.
+/// A variable is built on one thread; afterwards several threads may read it as long as nobody calls a
+/// setter.
 class KESTREL_API ScoreDictVar {
  public:
   enum VariableType : int { kNUMERIC_VAR = 0, STRING_VAR = 1, kDATETIME_VAR = 4 };
@@ -40,11 +42,11 @@ class KESTREL_API ScoreDictVar {
   /// True when the names are the same bytes; nothing else is compared.
   virtual bool operator==(const ScoreDictVar& other) const = 0;
 
-  /// True for null; for the system-missing number of a variable that is not a text; and for a value in one of the
-  /// missing ranges, unless the variable is not a text and the value carries a label.
+  /// True for null; for the system-missing number of a variable that is not a text; and for a value in one of
+  /// the missing ranges, unless the variable is not a text and the value carries a label.
   virtual bool IsMissingValue(const ScoreValue* value) const = 0;
-  /// False for a missing value. A categorical variable with labels takes the labelled values alone, a numeric variable
-  /// without labels takes numbers and dates, any other variable takes everything.
+  /// False for a missing value. A categorical variable with labels takes the labelled values alone, a numeric
+  /// variable without labels takes numbers and dates, any other variable takes everything.
   virtual bool IsValidValue(const ScoreValue* value) const = 0;
 
   /// An empty name is refused: false, nothing changes.
@@ -70,8 +72,8 @@ class KESTREL_API ScoreDictVar {
   virtual ScoreMissingValueSet* GetMissingValues() const = 0;
   virtual void SetMissingValues(ScoreMissingValueSet* missingValues) = 0;
   virtual void SetValueLabels(ScoreValueLabelSet* valueLabels) = 0;
-  /// A new value of this variable's storage kind read from the text, owned by the caller; null for a kind other than
-  /// number and text.
+  /// A new value of this variable's storage kind read from the text, owned by the caller; null for a kind
+  /// other than number and text.
   virtual ScoreValue* ToMyValue(const std::string& text) const = 0;
   virtual void Display(std::ostream& os) const = 0;
   /// 1 for a continuous variable, else the number of value labels.
@@ -82,7 +84,8 @@ class KESTREL_API ScoreDictVar {
   virtual void SetEncodedValueIndex(int index) = 0;
   virtual int GetValueIndex() const = 0;
   virtual int GetEncodedValueIndex() const = 0;
-  /// Whether trailing blanks count when a text is matched with the categories. Ignored unless the variable is a text.
+  /// Whether trailing blanks count when a text is matched with the categories. Ignored unless the variable is
+  /// a text.
   virtual void SetNoSpaceTrim(bool noSpaceTrim) = 0;
   virtual bool GetNoSpaceTrim() const = 0;
   /// Whether the empty text is a value. Ignored unless the variable is a text.
@@ -109,9 +112,9 @@ class KESTREL_API ScoreDictVar {
   virtual void SetEncoder(ScoreEncoder* encoder) = 0;
   virtual void SetEmptyCateValues(bool empty) = 0;
   virtual bool IsEmptyCateValues() const = 0;
-  /// Adds a category. The variable gets an empty label set if it has none, whatever follows. A null value or an empty
-  /// label is refused: false, and the caller keeps `value`. When the set holds an equal value, `value` is deleted and
-  /// the result is false. Otherwise the variable owns `value`: true.
+  /// Adds a category. The variable gets an empty label set if it has none, whatever follows. A null value or
+  /// an empty label is refused: false, and the caller keeps `value`. When the set holds an equal value,
+  /// `value` is deleted and the result is false. Otherwise the variable owns `value`: true.
   virtual bool AddScoreValueLabel(ScoreValue* value, const std::string& label) = 0;
   virtual void SetNumericDataType(NumericDataType type) = 0;
   virtual NumericDataType GetNumericDataType() const = 0;

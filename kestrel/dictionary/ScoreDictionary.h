@@ -22,16 +22,17 @@ class KESTREL_API ScoreDictionary {
 
   /// A deep copy, owned by the caller.
   virtual ScoreDictionary* Clone() const = 0;
-  /// Adds clones of the other dictionary's variables whose names are not here yet, and takes over its list of names:
-  /// names that only this dictionary held leave the list, though their variables stay.
-  /// Always false, so the result says nothing about success.
+  /// Adds clones of the other dictionary's variables whose names are not here yet, and takes over its list of
+  /// names: names that only this dictionary held leave the list, though their variables stay. Always false,
+  /// so the result says nothing about success.
   virtual bool AddVar(const ScoreDictionary* other) = 0;
-  /// Adds one variable under `name` and takes ownership of it. An empty name or a null variable is refused (false).
-  /// When the name is taken, the first variable stays, the name is listed a second time and the result is true all the
-  /// same: the new variable is then neither kept nor deleted and still belongs to the caller, who can tell by asking
-  /// `GetVar`.
+  /// Adds one variable under `name` and takes ownership of it. An empty name or a null variable is refused
+  /// (false). When the name is taken, the first variable stays, the name is listed a second time and the
+  /// result is true all the same: the new variable is then neither kept nor deleted and still belongs to the
+  /// caller, who can tell by asking `GetVar`.
   virtual bool AddVar(const std::string& name, ScoreDictVar* var) = 0;
-  /// Removes and deletes one variable. The list of names is left as it is. False when there is no such variable.
+  /// Removes and deletes one variable. The list of names is left as it is. False when there is no such
+  /// variable.
   virtual bool RemoveVar(const std::string& name) = 0;
   /// The variable of that name, still owned by the dictionary, or null.
   virtual ScoreDictVar* GetVar(const std::string& name) = 0;

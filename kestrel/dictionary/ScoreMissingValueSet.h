@@ -12,18 +12,19 @@
 
 namespace MCKestrel_800 {
 
-/// An ordered collection of ranges, which it owns. A single missing value is a range whose ends are the same value.
+/// An ordered collection of ranges, which it owns. A single missing value is a range whose ends are the same
+/// value.
 class KESTREL_API ScoreMissingValueSet {
  public:
   virtual ~ScoreMissingValueSet();
 
   /// A deep copy, owned by the caller.
   virtual ScoreMissingValueSet* Clone() const = 0;
-  /// Appends a range and takes ownership of it. Null, and a range equal to a stored one, are refused: false, and the
-  /// caller still owns the range.
+  /// Appends a range and takes ownership of it. Null, and a range equal to a stored one, are refused: false,
+  /// and the caller still owns the range.
   virtual bool Add(ScoreValueRange* range) = 0;
-  /// Removes and deletes the first range equal to the argument, which stays the caller's. False when it is null or
-  /// nothing matches.
+  /// Removes and deletes the first range equal to the argument, which stays the caller's. False when it is
+  /// null or nothing matches.
   virtual bool Remove(const ScoreValueRange* range) = 0;
   virtual std::size_t Size() const = 0;
   /// True when some stored range equals the argument; false for null.

@@ -16,8 +16,8 @@ class KESTREL_API ScoreValueLabel {
  public:
   virtual ~ScoreValueLabel();
 
-  /// Replaces value and label. Takes ownership of `value` and frees the value held so far. A null value or an empty
-  /// label is refused: false, nothing changes and the caller keeps `value`.
+  /// Replaces value and label. Takes ownership of `value` and frees the value held so far. A null value or an
+  /// empty label is refused: false, nothing changes and the caller keeps `value`.
   virtual bool SetValueLabel(ScoreValue* value, const std::string& label) = 0;
   /// Replaces the label. An empty label is refused: false, nothing changes.
   virtual bool SetLabel(const std::string& label) = 0;

@@ -15,8 +15,9 @@ class KESTREL_API ScoreValueProbability {
  public:
   virtual ~ScoreValueProbability();
 
-  /// Replaces value and probability. Takes ownership of `value` and frees the value held so far. A null value, or a
-  /// probability that is not a number from 0 to 1, is refused: false, nothing changes and the caller keeps `value`.
+  /// Replaces value and probability. Takes ownership of `value` and frees the value held so far. A null
+  /// value, or a probability that is not a number from 0 to 1, is refused: false, nothing changes and the
+  /// caller keeps `value`.
   virtual bool SetValueProbability(ScoreValue* value, double probability) = 0;
   /// Replaces the probability. One that is not a number from 0 to 1 is refused: false, nothing changes.
   virtual bool SetProbability(double probability) = 0;

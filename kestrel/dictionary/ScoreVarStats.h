@@ -8,7 +8,8 @@
 
 namespace MCKestrel_800 {
 
-/// Minimum, maximum, mean and standard deviation of a variable, in its own unit, and what replaces a missing value.
+/// Minimum, maximum, mean and standard deviation of a variable, in its own unit, and what replaces a missing
+/// value.
 class KESTREL_API ScoreVarStats {
  public:
   virtual ~ScoreVarStats();
@@ -19,8 +20,8 @@ class KESTREL_API ScoreVarStats {
   virtual void SetMax(double max) = 0;
   virtual void SetStddev(double stddev) = 0;
   virtual void SetMean(double mean) = 0;
-  /// Frees the replacement held so far and keeps a clone of the argument, or nothing when it is null. The caller keeps
-  /// its own value.
+  /// Frees the replacement held so far and keeps a clone of the argument, or nothing when it is null. The
+  /// caller keeps its own value.
   virtual void SetMissingReplacement(const ScoreValue* value) = 0;
   virtual double GetMin() const = 0;
   virtual double GetMax() const = 0;

@@ -14,9 +14,9 @@ namespace MCKestrel_800 {
 
 /// Where a value is filed and where values equal to it may be filed.
 ///
-/// Numbers are equal within a relative tolerance, so equal numbers need not share a place: a number is filed by its
-/// leading digits, and what equals it lies there or, near the edge, in one neighbouring place. Texts are filed without
-/// their trailing blanks, which never count.
+/// Numbers are equal within a relative tolerance, so equal numbers need not share a place: a number is filed
+/// by its leading digits, and what equals it lies there or, near the edge, in one neighbouring place. Texts
+/// are filed without their trailing blanks, which never count.
 struct ValueKey {
   enum Kind : std::uint8_t {
     kForeign,  ///< null or a class of its own: it decides itself what it equals, so it has to be asked
@@ -27,8 +27,9 @@ struct ValueKey {
   };
 
   Kind kind = kForeign;
-  std::uint32_t own = 0;        ///< where it is filed
-  std::uint32_t neighbour = 0;  ///< the other place where an equal value may be; the same as `own` when there is none
+  std::uint32_t own = 0;  ///< where it is filed
+  std::uint32_t neighbour =
+      0;  ///< the other place where an equal value may be; the same as `own` when there is none
 
   bool IsFiled() const { return kind >= kNumber; }
 };
@@ -38,8 +39,8 @@ KESTREL_API ValueKey MakeValueKey(const ScoreValue* value);
 /// The place of a pair of values, such as the two ends of an interval.
 KESTREL_API std::uint32_t JoinPlaces(std::uint32_t first, std::uint32_t second);
 
-/// Keeps, for each position of a list, the place where its element is filed. The positions of one place are visited in
-/// ascending order, so that the first match is the one that a walk would find.
+/// Keeps, for each position of a list, the place where its element is filed. The positions of one place are
+/// visited in ascending order, so that the first match is the one that a walk would find.
 ///
 /// Several elements may share a place by chance: a visitor has to compare. About 12 bytes per element.
 /// Places come from a keyed hash with a key of this process: a document cannot be made to crowd one of them.
@@ -86,8 +87,8 @@ class KESTREL_API ValueIndex {
     }
     return limit;
   }
-  /// The first position for which `matches(position)` holds, among those where a value of this key may have an equal;
-  /// kNone when there is none. The key must not be foreign.
+  /// The first position for which `matches(position)` holds, among those where a value of this key may have
+  /// an equal; kNone when there is none. The key must not be foreign.
   template <class Matches>
   std::size_t FirstOf(const ValueKey& key, const Matches& matches) const {
     std::size_t first = kNone;
@@ -104,8 +105,9 @@ class KESTREL_API ValueIndex {
   void Link(std::uint32_t position);
   void LinkAll();
 
-  std::vector<std::uint32_t> places_;   // by position
-  std::vector<std::uint32_t> next_;     // by position: the next one in the same chain, in a ring; kUnlinked if in none
+  std::vector<std::uint32_t> places_;  // by position
+  std::vector<std::uint32_t>
+      next_;  // by position: the next one in the same chain, in a ring; kUnlinked if in none
   std::vector<std::uint32_t> tails_;    // by the place's low bits: the last position of the chain
   std::vector<std::uint32_t> foreign_;  // ascending
   std::size_t linked_ = 0;

@@ -12,12 +12,12 @@
 
 namespace MCKestrel_800 {
 
-/// A value-label set whose answers are those of a walk from the first element to the last, found through an index once
-/// the set has grown beyond a few elements.
+/// A value-label set whose answers are those of a walk from the first element to the last, found through an
+/// index once the set has grown beyond a few elements.
 ///
-/// The index follows `ValueLbl::SetValueLabel` on an element. A value must not be changed through a pointer that was
-/// kept after the value was given to its label.
-/// The index changes in `Add` and `Remove` alone: a set that nobody changes may be read by several threads.
+/// The index follows `ValueLbl::SetValueLabel` on an element. A value must not be changed through a pointer
+/// that was kept after the value was given to its label. The index changes in `Add` and `Remove` alone: a set
+/// that nobody changes may be read by several threads.
 class KESTREL_API ValueLabelSet : public ScoreValueLabelSet {
  public:
   ValueLabelSet();
@@ -34,10 +34,11 @@ class KESTREL_API ValueLabelSet : public ScoreValueLabelSet {
   bool Contains(const ScoreValue* value) const override;
   void Display(std::ostream& os) const override;
 
-  /// The first element whose value equals `value`, or null. It stays owned by the set.
-  const ScoreValueLabel* Find(const ScoreValue* value) const;
-  /// True when `Equal(value, exact, emptyStringOK)` holds for some element's value: how the categories of a string
-  /// variable are matched. False for null.
+  /// True when `value` says of some element's value that it equals it: how the categories of a variable other
+  /// than text are matched. False for null.
+  bool ContainsEqualTo(const ScoreValue* value) const;
+  /// True when `Equal(value, exact, emptyStringOK)` holds for some element's value: how the categories of a
+  /// string variable are matched. False for null.
   bool ContainsEqual(const ScoreValue* value, bool exact, bool emptyStringOK) const;
 
  private:

@@ -39,8 +39,8 @@ class KESTREL_API ValueLbl : public ScoreValueLabel {
 
   std::unique_ptr<ScoreValue> value_;
   std::string label_;
-  // Belongs to the set that owns this label: set when the value is replaced, so that the set's index is not trusted
-  // any more. A copy starts without it.
+  // Belongs to the set that owns this label: set when the value is replaced, so that the set's index is not
+  // trusted any more. A copy starts without it.
   bool* changed_ = nullptr;
 };
 

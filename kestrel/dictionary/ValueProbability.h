@@ -38,8 +38,8 @@ class KESTREL_API ValueProbability : public ScoreValueProbability {
 
   std::unique_ptr<ScoreValue> value_;
   double probability_;
-  // Belongs to the set that owns this object: set when the value is replaced, so that the set's index is not trusted
-  // any more. A copy starts without it.
+  // Belongs to the set that owns this object: set when the value is replaced, so that the set's index is not
+  // trusted any more. A copy starts without it.
   bool* changed_ = nullptr;
 };
 

@@ -1,4 +1,5 @@
-// The one implementation of ScoreValueProbabilitySet, with look-ups that do not grow with the number of values.
+// The one implementation of ScoreValueProbabilitySet, with look-ups that do not grow with the number of
+// values.
 
 #ifndef KESTREL_DICTIONARY_VALUEPROBABILITYSET_H
 #define KESTREL_DICTIONARY_VALUEPROBABILITYSET_H
@@ -11,12 +12,12 @@
 
 namespace MCKestrel_800 {
 
-/// A value-probability set whose answers are those of a walk from the first element to the last, found through an
-/// index once the set has grown beyond a few elements.
+/// A value-probability set whose answers are those of a walk from the first element to the last, found
+/// through an index once the set has grown beyond a few elements.
 ///
-/// The index follows `ValueProbability::SetValueProbability` on an element. A value must not be changed through a
-/// pointer that was kept after the value was given to its element.
-/// The index changes in `Add` and `Remove` alone: a set that nobody changes may be read by several threads.
+/// The index follows `ValueProbability::SetValueProbability` on an element. A value must not be changed
+/// through a pointer that was kept after the value was given to its element. The index changes in `Add` and
+/// `Remove` alone: a set that nobody changes may be read by several threads.
 class KESTREL_API ValueProbabilitySet : public ScoreValueProbabilitySet {
  public:
   ValueProbabilitySet();

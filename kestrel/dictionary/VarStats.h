@@ -12,8 +12,8 @@ namespace MCKestrel_800 {
 /// Summary statistics held as four numbers and an owned replacement value.
 class KESTREL_API VarStats : public ScoreVarStats {
  public:
-  /// The widest limits (the system-missing value and the largest finite number), mean 0, standard deviation 1, no
-  /// replacement.
+  /// The widest limits (the system-missing value and the largest finite number), mean 0, standard deviation
+  /// 1, no replacement.
   VarStats();
   VarStats(double min, double max, double mean, double stddev);
   VarStats(const VarStats& other);
