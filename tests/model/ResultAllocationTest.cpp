@@ -3,53 +3,34 @@
 
 #include <gtest/gtest.h>
 
-#include <atomic>
-#include <cstdlib>
-#include <new>
 #include <string>
 #include <vector>
 
 #include "kestrel/model/Results.h"
-
-namespace {
-
-std::atomic<size_t> allocations{0};
-
-}  // namespace
-
-void* operator new(size_t size) {
-  allocations.fetch_add(1, std::memory_order_relaxed);
-  if (void* memory = std::malloc(size != 0 ? size : 1)) return memory;
-  throw std::bad_alloc();
-}
-void operator delete(void* memory) noexcept {
-  std::free(memory);
-}
-void operator delete(void* memory, size_t) noexcept {
-  std::free(memory);
-}
+#include "tests/model/AllocationCount.h"
 
 namespace {
 
 using namespace MCKestrel_800;
+using kestrel_tests::CountAllocations;
 
 TEST(ResultAllocation, IsCountedHere) {
-  const size_t before = allocations;
+  const size_t before = CountAllocations();
   const std::vector<int> some(100);
-  EXPECT_GT(allocations, before) << some.size();
+  EXPECT_GT(CountAllocations(), before) << some.size();
 }
 
 TEST(ResultAllocation, RegressionCasesNeedNone) {
   RegResult result;
   NumericValue number;
-  const size_t before = allocations;
+  const size_t before = CountAllocations();
   for (int i = 0; i < 1000; ++i) {
     result.Reset();
     number.SetDoubleValue(i);
     result.SetPrediction(&number);
     result.SetStandardError(0.5);
   }
-  EXPECT_EQ(allocations, before);
+  EXPECT_EQ(CountAllocations(), before);
   EXPECT_EQ(result.GetPrediction()->GetDouble(), 999.0);
 }
 
@@ -63,9 +44,9 @@ void ExpectNoneAfterTheFirstCase(const std::vector<Value>& categories) {
       result.AddCategoryProbability(&category, 0.125);
     result.SetPrediction(&categories[i % 2]);
     result.SetProbability(0.125);
-    if (i == 1) after_first = allocations;
+    if (i == 1) after_first = CountAllocations();
   }
-  EXPECT_EQ(allocations, after_first);
+  EXPECT_EQ(CountAllocations(), after_first);
   EXPECT_EQ(result.GetCategoryCount(), categories.size());
 }
 
