@@ -1,0 +1,135 @@
+// From a host's case record to the flat vector of numbers that models compute with. All reading of records,
+// all treatment of missing, invalid and outlying values and all coding of categories happens here, once per
+// input.
+
+#ifndef KESTREL_PLUGINS_SUPPORT_CASEVECTOR_H
+#define KESTREL_PLUGINS_SUPPORT_CASEVECTOR_H
+
+#include <limits>
+#include <map>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "kestrel/foundation/NumericValue.h"
+#include "plugins/support/MiningField.h"
+#include "plugins/support/ValueRules.h"
+
+namespace MCKestrel_800 {
+
+class ScoreCaseRecord;
+
+/// The inputs of a model as slots, one double each:
+///   a number slot    the number itself (of a date/time its number), or the system-missing value;
+///   a category slot  the category's code (see ValueRules), kMissingCategory, or kOtherCategory for a value
+///   that has no
+///                    code: valid in a field that lists no categories, or invalid and used as it is.
+/// Values are treated as MiningSchema says. Two rules fill what it leaves open:
+///   - the empty text in a category slot is missing, rather than invalid, when the field lists categories and
+///   it is not
+///     one of them: it is what ScoreCaseRecord::SetMissingValue leaves behind;
+///   - an invalid value that a number slot uses as it is counts as the number that its text reads as, or as
+///   missing when
+///     it reads as none.
+///
+/// Building: AddNumber and AddCategory for each input that the model reads, in any order, repeated as it
+/// likes; then Seal. Fields and their variables must outlive the vector. Afterwards Fill is called for each
+/// case; it allocates nothing for numbers and for texts and serves one case at a time.
+class CaseVector {
+ public:
+  static constexpr double kMissingCategory = -2.0;
+  static constexpr double kOtherCategory = -1.0;
+
+  /// What Fill met, as bits.
+  enum Outcome : unsigned {
+    kComplete = 0,
+    kMissingNumber = 1,  ///< a number slot holds the system-missing value
+    kInvalidInput = 2    ///< a value makes the case invalid; the vector is not to be used
+  };
+
+  CaseVector();
+  ~CaseVector();
+  CaseVector(const CaseVector&) = delete;
+  CaseVector& operator=(const CaseVector&) = delete;
+
+  /// The slot that holds the field as a number; the field must not be a text. An input asked for twice is one
+  /// slot. map_missing_to  takes the place of a value that is still missing after the field's own treatment;
+  /// NaN for none.
+  int AddNumber(const MiningField& field, double map_missing_to = std::numeric_limits<double>::quiet_NaN());
+
+  /// The slot that holds the field as a category code. An input asked for twice is one slot.
+  int AddCategory(const MiningField& field);
+
+  /// The code of a value in a category slot; see ValueRules::AddCategory.
+  int AddCategoryValue(int slot, const ScoreValue& value);
+
+  /// To be called once, after the last slot and category value.
+  void Seal();
+
+  /// The number of codes of a category slot, from 0.
+  int GetCodeCount(int slot) const;
+
+  int GetSlotCount() const { return static_cast<int>(slots_.size()); }
+
+  /// Reads a case. Names that the record does not have are missing. The positions of the names are looked up
+  /// again only when the record's layout stamp is another one than before, or 0. Returns the Outcome bits.
+  unsigned Fill(const ScoreCaseRecord& record);
+
+  /// The values by slot, as the last Fill left them.
+  const double* GetValues() const { return values_.data(); }
+
+  /// After Fill returned kInvalidInput: the position in GetFields() of the first field, by slot, whose value
+  /// made the case invalid.
+  int GetInvalidField() const;
+
+  /// The fields that the slots read, each once, in the order in which they were first asked for.
+  const std::vector<const MiningField*>& GetFields() const { return fields_; }
+
+ private:
+  struct Slot {
+    int position = -1;  ///< in the record
+    /// A number slot of a field whose numbers are all valid and none an outlier: two tests a case.
+    bool is_plain = false;
+    unsigned missing_outcome = kComplete;
+    double missing_value = NumericValue::gSysmisValue;
+  };
+  struct Treatment {
+    const MiningField* field;
+    ValueRules* rules;
+    bool is_category;
+    double map_missing_to;
+    int field_position;
+    bool is_text = false;
+    bool has_outliers = false;
+    double invalid_value = NumericValue::gSysmisValue;
+  };
+
+  int AddSlot(const MiningField& field, bool is_category, double map_missing_to);
+  void Prepare(int number);
+  void LookUpPositions(const ScoreCaseRecord& record);
+  template <typename Source>
+  unsigned FillFrom(const Source& source);
+  unsigned FillTreated(int number, const ScoreValue* value);
+  unsigned FillNumber(int number, double value);
+  unsigned FillMissing(int number);
+  unsigned FillInvalid(int number, const ScoreValue& value);
+  unsigned RefuseCase(int number);
+
+  /// What the loop over all slots reads.
+  std::vector<Slot> slots_;
+  /// What slots with more than the plain rule read besides, by slot.
+  std::vector<Treatment> treatments_;
+  std::vector<double> values_;
+  std::vector<const MiningField*> fields_;
+  std::vector<std::unique_ptr<ValueRules>> rules_;  ///< by field
+  // Needed until Seal alone.
+  std::map<std::string, int> slot_numbers_;
+  std::map<const MiningField*, int> field_positions_;
+  unsigned long long layout_stamp_ = 0;
+  int positions_end_ = 0;
+  int invalid_slot_ = -1;
+};
+
+}  // namespace MCKestrel_800
+
+#endif  // KESTREL_PLUGINS_SUPPORT_CASEVECTOR_H
