@@ -141,29 +141,47 @@ void SetVariableType(const DOMElement* field, const FieldSettings& settings, Sco
   }
 }
 
-std::unique_ptr<ScoreDictVar> ReadDataField(DOMElement* field, const std::string& name) {
-  auto variable = std::make_unique<DictVar>(name, ScoreDictVar::kNUMERIC_VAR);
+/// Reads all of a field but its name into its variable.
+void ReadDataField(DOMElement* field, DictVar& variable) {
   const XMLCh* label = Attribute(field, Tag::XML_ATT_DATAFIELD_DISPLAYNAME);
-  if (!IsEmpty(label)) variable->SetLabel(Narrow(label));
-  ReadOpType(field, *variable);
+  if (!IsEmpty(label)) variable.SetLabel(Narrow(label));
+  ReadOpType(field, variable);
 
   FieldSettings settings;
   settings.storageType = Attribute(field, Tag::XML_ATT_STORAGETYPE);
-  ReadExtensions(field, settings, *variable);
-  SetVariableType(field, settings, *variable);
-  variable->SetNoSpaceTrim(settings.noSpaceTrim);
-  variable->SetEmptyStringOK(settings.emptyStringOk);
+  ReadExtensions(field, settings, variable);
+  SetVariableType(field, settings, variable);
+  variable.SetNoSpaceTrim(settings.noSpaceTrim);
+  variable.SetEmptyStringOK(settings.emptyStringOk);
 
-  if (variable->GetMLevel() == ScoreDictVar::kContinuous) {
-    if (variable->GetVarType() == ScoreDictVar::STRING_VAR) {
+  if (variable.GetMLevel() == ScoreDictVar::kContinuous) {
+    if (variable.GetVarType() == ScoreDictVar::STRING_VAR) {
       FailAt(field, KestrelException::kInvalidType, "string variable can't be continuous!!");
     }
-    PMMLTranslator::ParseContinuousValues(field, variable.get());
+    PMMLTranslator::ParseContinuousValues(field, &variable);
   } else {
-    PMMLTranslator::ParseCategoricalValues(field, variable.get());
-    PMMLTranslator::SetupCatEncoder(variable.get());
+    PMMLTranslator::ParseCategoricalValues(field, &variable);
+    PMMLTranslator::SetupCatEncoder(&variable);
   }
-  return variable;
+}
+
+/// Adds a variable for a field to the dictionary, which owns it from here on.
+DictVar& AddVariable(const DOMElement* field, BaseDictionary& dictionary) {
+  const XMLCh* wideName = RequiredAttribute(field, Tag::XML_ATT_DATAFIELD_NAME);
+  if (IsEmpty(wideName)) {
+    FailAt(field, KestrelException::kStructure, "<DataField>'s name can't be null string !!");
+  }
+  const std::string name = Narrow(wideName);
+  auto variable = std::make_unique<DictVar>(name, ScoreDictVar::kNUMERIC_VAR);
+  // A dictionary that does not grow had the name already and left the variable to us. Asking it first would
+  // search its map twice, which large dictionaries feel.
+  const std::size_t sizeBefore = dictionary.Size();
+  dictionary.AddVar(name, variable.get());
+  if (dictionary.Size() == sizeBefore) {
+    FailOnField(field, KestrelException::kUnknownVariable, name,
+                ": Invalid Variable Name -- alreay in the dictionary");
+  }
+  return *variable.release();
 }
 
 void CheckNumberOfFields(const DOMElement* dictionary, size_t count) {
@@ -190,16 +208,7 @@ ScoreDictionary* PMMLTranslator::ParseDictionary(DOMNode* dataDictionary, bool /
     if (!ElementIs(child, Tag::XML_ELE_DATAFIELD)) {
       FailAt(child, KestrelException::kStructure, "<DataField> or <Extension> is required here!!");
     }
-    const XMLCh* wideName = RequiredAttribute(child, Tag::XML_ATT_DATAFIELD_NAME);
-    if (IsEmpty(wideName)) {
-      FailAt(child, KestrelException::kStructure, "<DataField>'s name can't be null string !!");
-    }
-    const std::string name = Narrow(wideName);
-    if (dictionary->GetVar(name) != nullptr) {
-      FailOnField(child, KestrelException::kUnknownVariable, name,
-                  ": Invalid Variable Name -- alreay in the dictionary");
-    }
-    dictionary->AddVar(name, ReadDataField(child, name).release());
+    ReadDataField(child, AddVariable(child, *dictionary));
   }
   const DOMElement* element = static_cast<const DOMElement*>(dataDictionary);
   if (dictionary->Size() == 0) FailAt(element, KestrelException::kStructure, "<DataDictionary is EMPTY!!");

@@ -68,6 +68,10 @@ struct Sample {
   size_t step;  ///< every how many-th element and attribute is broken: all of the short documents
 };
 
+void PrintTo(const Sample& sample, std::ostream* out) {
+  *out << sample.name;
+}
+
 constexpr Sample kSamples[] = {{"heating_small.xml", 1},
                                {"heating_fields.xml", 1},
                                {"heating_extensions.xml", 1},
@@ -104,7 +108,7 @@ TEST_P(BrokenDocuments, WithBrokenAttributesAreReadOrRefused) {
       kestrel_test::WithBrokenAttributes(DocumentText(GetParam().name), GetParam().step);
   ASSERT_GT(mutants.size(), 50u);
   const std::map<int, size_t> codes = ReadAll(mutants);
-  for (const int expected : {4, 11, 12})
+  for (const int expected : {4, 11})
     EXPECT_TRUE(codes.count(expected)) << expected;
 }
 
@@ -136,12 +140,12 @@ TEST(BrokenDocument, OfEachKindIsAmongThem) {
     }
   }
   EXPECT_GT(count, 150u);
-  EXPECT_EQ(codes, (std::set<int>{0, 1, 3, 4, 6, 7, 8, 11, 12}));
+  EXPECT_EQ(codes, (std::set<int>{0, 1, 3, 4, 5, 6, 7, 8, 11, 12}));
 }
 
 /// The text in UTF-16 with the bytes of each character in the given order.
 std::string Utf16(const std::string& text, bool bigEndian, bool byteOrderMark) {
-  std::u16string wide = NarrowToUtf16(text);
+  std::u16string wide = MCXML_800::NarrowToUtf16(text);
   if (byteOrderMark) wide.insert(wide.begin(), u'\uFEFF');
   std::string bytes;
   for (const char16_t unit : wide) {

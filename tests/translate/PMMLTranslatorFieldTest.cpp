@@ -430,7 +430,8 @@ TEST(PMMLTranslatorFields, OfWholeDocumentsAreRead) {
   EXPECT_EQ(fields->GetVar("town")->GetLabel(), "Städte & Dörfer");
   EXPECT_EQ(ValuesOf(static_cast<const DictVar&>(*fields->GetVar("class"))), "3= 1= 2= [9,9] 3");
   EXPECT_EQ(ValuesOf(static_cast<const DictVar&>(*fields->GetVar("outside"))),
-            "(-inf,-60] [60,inf) [-99,-99] [99,99] 1");
+            "(Undefined,-60] [60,inf) [-99,-99] [99,99] 1")
+      << "minus infinity is written like every number below the system-missing value";
 
   const auto extensions = ReadDictionary(DocumentText("heating_extensions.xml"));
   EXPECT_EQ(extensions->Size(), 9u);
