@@ -21,8 +21,6 @@ constexpr char kNoDocument[] = "\nInput XML is not parseable into a document";
 constexpr char kNoRoot[] = "\nInvalid XML document or no dtd file avaible in current directory";
 constexpr char kEmptyRootTag[] = "\nInvalid XML document: root tag name is empty!!";
 constexpr char kUnreadable[] = "Could not read model file";
-constexpr size_t kBaseCalls = 1000000;
-constexpr size_t kCallsPerInputByte = 2;
 
 size_t MemoryQuota(size_t inputBytes, const DocumentLimits& limits) {
   return limits.baseMemoryBytes + limits.memoryPerInputByte * inputBytes;
@@ -35,7 +33,8 @@ size_t MemoryQuota(size_t inputBytes, const DocumentLimits& limits) {
 class ParsedDocument::Impl {
  public:
   Impl(size_t inputBytes, const DocumentLimits& limits)
-      : arena_(MemoryQuota(inputBytes, limits), kBaseCalls + kCallsPerInputByte * inputBytes) {}
+      : arena_(MemoryQuota(inputBytes, limits),
+               limits.baseAllocations + limits.allocationsPerInputByte * inputBytes) {}
   ~Impl() { delete parser_; }
   Impl(const Impl&) = delete;
   Impl& operator=(const Impl&) = delete;
@@ -71,15 +70,16 @@ ParsedDocument::Impl::Ended ParsedDocument::Impl::Run(const StreamBlocks& text, 
     parser_->parse(source);
     return Ended::kNormally;
   } catch (const LimitReached&) {
+    parser_->NoteLastElement();
     return Ended::kAtLimit;
   } catch (const xercesc::OutOfMemoryException&) {
-    parser_->NoteCurrentPlace();
+    parser_->NoteLastElement();
     return Ended::kAtLimit;
   } catch (const xercesc::DOMException& e) {
     message = Narrow(e.getMessage());
   } catch (...) {
   }
-  parser_->NoteCurrentPlace();
+  parser_->NoteLastElement();
   return Ended::kByException;
 }
 

@@ -23,6 +23,8 @@ struct DocumentLimits {
   size_t maxInputBytes = size_t{256} << 20;   ///< of the document itself
   size_t baseMemoryBytes = size_t{64} << 20;  ///< memory that every document may use
   size_t memoryPerInputByte = 100;            ///< and this much for each of its bytes
+  size_t baseAllocations = 1000000;           ///< requests for memory that every document may make
+  size_t allocationsPerInputByte = 2;         ///< and so many for each of its bytes
   size_t maxDepth = 512;                      ///< elements inside one another
   size_t maxAttributes = 256;                 ///< of one element
   size_t maxNames = 4096;                     ///< distinct element and attribute names
@@ -55,8 +57,9 @@ class KESTREL_API ParsedDocument {
 /// Reads a whole document from the stream and parses it. Opens no file and no connection whatever the
 /// document names. in  left at its end with its exception mask as it was; need not be seekable. Errors:
 /// KestrelException, with line and column for a malformed document:
-///   code 2 "Could not read model file"  the stream failed, or the document is larger than the limit;
-///   code 6 "Invalid XML file!!"         malformed, or asking for more than the limits allow;
+///   code 2 "Could not read model file"  the stream failed;
+///   code 6 "Invalid XML file!!"         malformed, larger or asking for more than the limits allow, or using
+///                                       something that lies outside it;
 ///   code 4                              nothing in it that could be a document, or no root element;
 ///   code 5                              the parser could not be initialised, in this call or an earlier one.
 /// Threads: any number of calls at once, the process's first ones included.

@@ -4,6 +4,7 @@
 #include <xercesc/dom/impl/DOMDocumentImpl.hpp>
 #include <xercesc/framework/XMLAttr.hpp>
 #include <xercesc/framework/XMLElementDecl.hpp>
+#include <xercesc/framework/XMLErrorCodes.hpp>
 #include <xercesc/internal/ReaderMgr.hpp>
 #include <xercesc/internal/XMLScanner.hpp>
 
@@ -19,6 +20,20 @@ bool IsWhitespace(const XMLCh* text, XMLSize_t length) {
     if (c != u' ' && c != u'\n' && c != u'\t' && c != u'\r') return false;
   }
   return true;
+}
+
+// Entities used as none may be. Before the root element the parser stops at them without a word about why,
+// and the document would pass for an empty one.
+bool IsEntityMisuse(unsigned int code) {
+  switch (code) {
+    case xercesc::XMLErrs::NoExtRefsInAttValue:
+    case xercesc::XMLErrs::NoUnparsedEntityRefs:
+    case xercesc::XMLErrs::PERefInMarkupInIntSubset:
+    case xercesc::XMLErrs::RecursiveEntity:
+      return true;
+    default:
+      return false;
+  }
 }
 
 }  // namespace
@@ -76,10 +91,11 @@ TreeParser::TreeParser(LoadArena* arena, const DocumentLimits& limits)
 
 TreeParser::~TreeParser() = default;
 
-void TreeParser::NoteCurrentPlace() {
+// Not asked of the parser, whose readers are gone when an exception has come out of it.
+void TreeParser::NoteLastElement() {
   if (errorLine_ != 0) return;
-  errorLine_ = getScanner()->getReaderMgr()->getLineNumber();
-  errorColumn_ = getScanner()->getReaderMgr()->getColumnNumber();
+  errorLine_ = elementLine_;
+  errorColumn_ = elementColumn_;
 }
 
 void TreeParser::CountName(const XMLCh* pooledName) {
@@ -90,17 +106,16 @@ void TreeParser::startElement(const xercesc::XMLElementDecl& declaration, const 
                               const XMLCh* const prefix,
                               const xercesc::RefVectorOf<xercesc::XMLAttr>& attributes,
                               const XMLSize_t attributeCount, const bool isEmpty, const bool isRoot) {
-  if (open_.size() >= limits_.maxDepth || attributeCount > limits_.maxAttributes) {
-    NoteCurrentPlace();
-    throw LimitReached();
-  }
-  pendingWhitespace_.clear();
   xercesc::ReaderMgr::LastExtEntityInfo place;
   getScanner()->getReaderMgr()->getLastExtEntityInfo(place);
+  elementLine_ = place.lineNumber;
+  elementColumn_ = place.colNumber;
+  if (open_.size() >= limits_.maxDepth || attributeCount > limits_.maxAttributes) throw LimitReached();
+  pendingWhitespace_.clear();
   // Not through createElement, which checks the name again. The node is larger than its kind, so it must not
   // come from what was freed of that kind.
   TreeElement* const element =
-      new (fDocument) TreeElement(fDocument, declaration.getFullName(), place.lineNumber, place.colNumber);
+      new (fDocument) TreeElement(fDocument, declaration.getFullName(), elementLine_, elementColumn_);
   CountName(element->getTagName());
   if (attributeCount != 0) AddAttributes(element, attributes, attributeCount);
   if (open_.empty()) {
@@ -189,10 +204,14 @@ void TreeParser::CloseElement() {
   open_.pop_back();
 }
 
-void TreeParser::error(const unsigned int, const XMLCh* const, const xercesc::XMLErrorReporter::ErrTypes type,
-                       const XMLCh* const, const XMLCh* const, const XMLCh* const, const XMLFileLoc line,
-                       const XMLFileLoc column) {
-  if (type == xercesc::XMLErrorReporter::ErrType_Warning || errorLine_ != 0) return;
+void TreeParser::error(const unsigned int code, const XMLCh* const domain,
+                       const xercesc::XMLErrorReporter::ErrTypes type, const XMLCh* const, const XMLCh* const,
+                       const XMLCh* const, const XMLFileLoc line, const XMLFileLoc column) {
+  if (type == xercesc::XMLErrorReporter::ErrType_Warning) return;
+  if (IsEntityMisuse(code) && xercesc::XMLString::equals(domain, xercesc::XMLUni::fgXMLErrDomain)) {
+    entityRefused_ = true;
+  }
+  if (errorLine_ != 0) return;
   errorLine_ = line;
   errorColumn_ = column;
 }

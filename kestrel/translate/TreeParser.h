@@ -60,13 +60,15 @@ class TreeParser final : public xercesc::XercesDOMParser {
   TreeParser(const TreeParser&) = delete;
   TreeParser& operator=(const TreeParser&) = delete;
 
-  /// Whether the document wanted something read that lies outside it. Nothing was.
+  /// Whether the document used an entity that lies outside it, or one in a way that none may be. Nothing was
+  /// read.
   bool IsEntityRefused() const { return entityRefused_; }
   /// The place of the first error; 0 when there was none, or it has no place.
   XMLFileLoc GetErrorLine() const { return errorLine_; }
   XMLFileLoc GetErrorColumn() const { return errorColumn_; }
-  /// The place that the parser has reached.
-  void NoteCurrentPlace();
+  /// Takes the place of the last element for the first error's, unless that is known: for faults that come
+  /// without one.
+  void NoteLastElement();
 
   void startElement(const xercesc::XMLElementDecl& declaration, const unsigned int uriId,
                     const XMLCh* const prefix, const xercesc::RefVectorOf<xercesc::XMLAttr>& attributes,
@@ -122,6 +124,8 @@ class TreeParser final : public xercesc::XercesDOMParser {
   std::u16string pendingWhitespace_;
   NameCounter names_;
   bool entityRefused_ = false;
+  XMLFileLoc elementLine_ = 0;
+  XMLFileLoc elementColumn_ = 0;
   XMLFileLoc errorLine_ = 0;
   XMLFileLoc errorColumn_ = 0;
 };
