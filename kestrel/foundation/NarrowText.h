@@ -7,6 +7,7 @@
 #include <string>
 #include <string_view>
 
+#include "kestrel/foundation/Locale.h"
 #include "kestrel/platform/Export.h"
 
 namespace MCXML_800 {
@@ -18,10 +19,6 @@ KESTREL_API std::string Utf16ToNarrow(const char16_t* text, size_t length);
 /// The same, added to the end of `out`, which may have room from before.
 KESTREL_API void AppendUtf16AsNarrow(const char16_t* text, size_t length, std::string& out);
 KESTREL_API std::u16string NarrowToUtf16(std::string_view text);
-
-/// Whether narrow text is UTF-8 (not 0) or the process's code page (0). A host sets it before its first load.
-KESTREL_API void SetUTF8mode(int on);
-KESTREL_API int qUTF8mode();
 
 }  // namespace MCXML_800
 
