@@ -25,13 +25,13 @@ size_t allocations = 0;
 }  // namespace
 
 // Counts every allocation of the program, the library and the plug-in.
-void* operator new(size_t size) {
+[[gnu::noinline]] void* operator new(size_t size) {
   ++allocations;
   if (void* memory = std::malloc(size)) return memory;
   throw std::bad_alloc();
 }
-void operator delete(void* memory) noexcept { std::free(memory); }
-void operator delete(void* memory, size_t) noexcept { std::free(memory); }
+[[gnu::noinline]] void operator delete(void* memory) noexcept { std::free(memory); }
+[[gnu::noinline]] void operator delete(void* memory, size_t) noexcept { std::free(memory); }
 
 namespace kestrel_bench {
 namespace {

@@ -8,6 +8,7 @@
 
 #include "kestrel/dictionary/CaseRecord.h"
 #include "kestrel/dictionary/ScoreDictVar.h"
+#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
 #include "kestrel/model/ModelFactory.h"
@@ -76,7 +77,7 @@ TEST_P(EveryExample, AgreesWithItsTrainingProgram) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Examples, EveryExample, testing::ValuesIn(ExampleFolders()),
-                         [](const auto& info) { return TestNameOf(info.param); });
+                         [](const auto& example) { return TestNameOf(example.param); });
 
 }  // namespace
 }  // namespace kestrel_tests
