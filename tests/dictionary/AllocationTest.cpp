@@ -1,10 +1,7 @@
-// What is done for each case must not touch the heap. The allocation functions of this test program count.
+// What is done for each case must not touch the heap. AllocationCounter.cpp counts.
 
 #include <gtest/gtest.h>
 
-#include <atomic>
-#include <cstdlib>
-#include <new>
 #include <string>
 
 #include "kestrel/dictionary/CaseRecord.h"
@@ -13,24 +10,8 @@
 #include "kestrel/dictionary/ScoreBinningEncoder.h"
 #include "kestrel/dictionary/ScoreCatNumericEncoder.h"
 #include "kestrel/dictionary/ScoreCatStringEncoder.h"
+#include "tests/dictionary/AllocationCounter.h"
 #include "tests/dictionary/TestValues.h"
-
-namespace {
-std::atomic<long> allocations{0};
-}
-
-void* operator new(std::size_t size) {
-  allocations.fetch_add(1, std::memory_order_relaxed);
-  void* memory = std::malloc(size == 0 ? 1 : size);
-  if (memory == nullptr) throw std::bad_alloc();
-  return memory;
-}
-void operator delete(void* memory) noexcept {
-  std::free(memory);
-}
-void operator delete(void* memory, std::size_t) noexcept {
-  std::free(memory);
-}
 
 namespace kestrel_test {
 namespace {
@@ -38,9 +19,9 @@ namespace {
 /// How often the heap was asked while the function ran.
 template <class Function>
 long AllocationsIn(const Function& function) {
-  const long before = allocations.load();
+  const long before = AllocationsSoFar();
   function();
-  return allocations.load() - before;
+  return AllocationsSoFar() - before;
 }
 
 // Longer than what a string keeps without the heap.
