@@ -38,7 +38,7 @@ class RegressionEquation {
   };
   struct Linear {
     double coefficient;
-    int slot;
+    std::size_t slot;
   };
   struct Power {
     double coefficient;
@@ -67,6 +67,7 @@ class RegressionEquation {
   void AddStep(StepKind kind, std::size_t size_after);
   void AddCategories(std::size_t begin, std::size_t end, std::size_t claim, const CaseVector& inputs);
   double Multiply(const Product& product, const double* values) const;
+  static double AddLinear(double y, const Linear* term, const Linear* end, const double* values);
   static double Raise(double base, const Power& power);
 
   const RegressionTable* table_;

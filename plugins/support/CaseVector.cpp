@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstring>
+#include <typeinfo>
 
 #include "kestrel/dictionary/ScoreCaseRecord.h"
 #include "kestrel/foundation/NumberText.h"
@@ -20,16 +21,25 @@ double NumberOf(const ScoreValue& value) {
   return ParseDouble(text.data(), text.data() + text.size(), number) ? number : NumericValue::gSysmisValue;
 }
 
+std::uint64_t BitsOf(double number) {
+  std::uint64_t bits;
+  std::memcpy(&bits, &number, sizeof bits);
+  return bits;
+}
+
+// No other number has this pattern, so comparing the bits is comparing the numbers.
+constexpr std::uint64_t kSysmisBits = 0xFFEFFFFFFFFFFFFFu;
+
 /// Values by position from the array that a record with a layout stamp shows.
 struct ArraySource {
   const ScoreValue* const* values;
-  const ScoreValue* At(int position) const { return values[position]; }
+  const ScoreValue* At(std::size_t position) const { return values[position]; }
 };
 
 /// Values by position from a record that promises nothing.
 struct RecordSource {
   const ScoreCaseRecord& record;
-  const ScoreValue* At(int position) const { return record.Get(position); }
+  const ScoreValue* At(std::size_t position) const { return record.Get(static_cast<int>(position)); }
 };
 
 }  // namespace
@@ -58,47 +68,48 @@ int CaseVector::AddSlot(const MiningField& field, bool is_category, double map_m
     fields_.push_back(&field);
     rules_.push_back(std::make_unique<ValueRules>(*field.variable));
   }
-  slots_.emplace_back();
-  treatments_.push_back({&field, rules_[place->second].get(), is_category, map_missing_to, place->second});
+  slots_.push_back({&field, rules_[place->second].get(), is_category, map_missing_to, place->second});
   return number;
 }
 
 int CaseVector::AddCategoryValue(int slot, const ScoreValue& value) {
-  return treatments_[slot].rules->AddCategory(value);
+  return slots_[slot].rules->AddCategory(value);
 }
 
 int CaseVector::GetCodeCount(int slot) const {
-  return treatments_[slot].rules->GetCodeCount();
+  return slots_[slot].rules->GetCodeCount();
 }
 
 void CaseVector::Seal() {
   for (const std::unique_ptr<ValueRules>& rules : rules_)
     rules->Seal();
-  for (int i = 0; i < GetSlotCount(); ++i)
-    Prepare(i);
+  for (Slot& slot : slots_)
+    Prepare(slot);
+  for (int i = 0; i < GetSlotCount(); ++i) {
+    if (!slots_[i].is_plain) other_slots_.push_back(i);
+  }
+  plain_slots_.reserve(slots_.size());
   values_.assign(slots_.size(), NumericValue::gSysmisValue);
   slot_numbers_.clear();
   field_positions_.clear();
 }
 
-void CaseVector::Prepare(int number) {
-  Slot& slot = slots_[number];
-  Treatment& treatment = treatments_[number];
-  const MiningField& field = *treatment.field;
+void CaseVector::Prepare(Slot& slot) {
+  const MiningField& field = *slot.field;
   const ScoreDictVar& variable = *field.variable;
-  const auto place = [&](const ScoreValue& value) {
-    return treatment.is_category ? static_cast<double>(treatment.rules->FindCode(value)) : value.GetDouble();
+  const auto place = [&slot](const ScoreValue& value) {
+    return slot.is_category ? static_cast<double>(slot.rules->FindCode(value)) : value.GetDouble();
   };
-  treatment.is_text = variable.GetVarType() == ScoreDictVar::STRING_VAR;
-  treatment.has_outliers =
+  slot.is_text = variable.GetVarType() == ScoreDictVar::STRING_VAR;
+  slot.has_outliers =
       variable.GetMLevel() == ScoreDictVar::kContinuous && field.outliers != ScoreDictVar::kAsIs;
-  slot.missing_value = treatment.is_category ? kMissingCategory : NumericValue::gSysmisValue;
-  if (!std::isnan(treatment.map_missing_to)) slot.missing_value = treatment.map_missing_to;
+  if (slot.is_category) slot.missing_value = kMissingCategory;
+  if (!std::isnan(slot.map_missing_to)) slot.missing_value = slot.map_missing_to;
   if (field.missing_replacement != nullptr) slot.missing_value = place(*field.missing_replacement);
   if (slot.missing_value == NumericValue::gSysmisValue) slot.missing_outcome = kMissingNumber;
-  if (field.invalid_replacement != nullptr) treatment.invalid_value = place(*field.invalid_replacement);
-  slot.is_plain = !treatment.is_category && !treatment.has_outliers && !field.missing_is_invalid &&
-                  treatment.rules->TakesEveryNumber();
+  if (field.invalid_replacement != nullptr) slot.invalid_value = place(*field.invalid_replacement);
+  slot.is_plain =
+      !slot.is_category && !slot.has_outliers && !field.missing_is_invalid && slot.rules->TakesEveryNumber();
 }
 
 unsigned CaseVector::Fill(const ScoreCaseRecord& record) {
@@ -119,95 +130,109 @@ unsigned CaseVector::Fill(const ScoreCaseRecord& record) {
 void CaseVector::LookUpPositions(const ScoreCaseRecord& record) {
   const int size = static_cast<int>(record.Size());
   positions_end_ = 0;
+  absent_outcome_ = kComplete;
+  plain_slots_.clear();
   for (int i = 0; i < GetSlotCount(); ++i) {
-    const int position = record.GetIndex(treatments_[i].field->name);
-    slots_[i].position = position < size ? position : -1;
-    positions_end_ = std::max(positions_end_, slots_[i].position + 1);
+    Slot& slot = slots_[i];
+    const int position = record.GetIndex(slot.field->name);
+    slot.position = position < size ? position : -1;
+    positions_end_ = std::max(positions_end_, slot.position + 1);
+    if (!slot.is_plain) continue;
+    if (slot.position >= 0) {
+      plain_slots_.push_back({static_cast<std::size_t>(slot.position), static_cast<std::size_t>(i),
+                              BitsOf(slot.missing_value), slot.missing_outcome});
+    } else {
+      values_[i] = slot.missing_value;
+      absent_outcome_ |= slot.missing_outcome;
+    }
   }
 }
 
 template <typename Source>
 unsigned CaseVector::FillFrom(const Source& source) {
-  unsigned outcome = kComplete;
-  double* out = values_.data();
-  const int count = GetSlotCount();
-  const Slot* slots = slots_.data();
-  for (int i = 0; i < count; ++i) {
-    const Slot& slot = slots[i];
-    const ScoreValue* value = slot.position < 0 ? nullptr : source.At(slot.position);
-    if (slot.is_plain) {
-      // An empty slot reads like a system-missing number, so that no branch depends on which values are
-      // missing.
-      if (value == nullptr) value = &NumericValue::SYSMIS;
-      if (value->GetType() == ScoreValue::kNumeric) {
-        const double number = value->GetDouble();
-        const bool is_missing = number == NumericValue::gSysmisValue;
-        out[i] = is_missing ? slot.missing_value : number;
-        outcome |= is_missing ? slot.missing_outcome : 0u;
-        continue;
-      }
-    }
-    outcome |= FillTreated(i, value);
-    if ((outcome & kInvalidInput) != 0) return outcome;
+  invalid_slot_ = GetSlotCount();
+  std::uint64_t outcome = absent_outcome_;
+  double* const values = values_.data();
+  const PlainSlot* const end = plain_slots_.data() + plain_slots_.size();
+  for (const PlainSlot* slot = plain_slots_.data(); slot != end; ++slot) {
+    outcome |= FillPlain(*slot, source.At(slot->position), values);
   }
-  return outcome;
+  for (const int number : other_slots_) {
+    const int position = slots_[number].position;
+    outcome |= FillTreated(number, position < 0 ? nullptr : source.At(static_cast<std::size_t>(position)));
+  }
+  return static_cast<unsigned>(outcome);
+}
+
+// Which values of a case are missing is as good as random, so nothing here branches on it: an empty slot
+// reads like a system-missing number, and the replacement is picked by a mask. Values of other classes than
+// the library's own number (addresses of type descriptions are compared, which at worst sends a number there,
+// too) take the general way.
+inline std::uint64_t CaseVector::FillPlain(const PlainSlot& slot, const ScoreValue* value, double* values) {
+  if (value == nullptr) value = &NumericValue::SYSMIS;
+  if (&typeid(*value) != &typeid(NumericValue)) return FillTreated(static_cast<int>(slot.number), value);
+  const std::uint64_t bits = BitsOf(static_cast<const NumericValue*>(value)->NumericValue::GetDouble());
+  const std::uint64_t mask = 0u - static_cast<std::uint64_t>(bits == kSysmisBits);
+  const std::uint64_t chosen = bits ^ ((bits ^ slot.missing_bits) & mask);
+  std::memcpy(&values[slot.number], &chosen, sizeof chosen);
+  return slot.missing_outcome & mask;
 }
 
 unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {
-  const Treatment& treatment = treatments_[number];
+  const Slot& slot = slots_[number];
   if (value == nullptr) return FillMissing(number);
   int code = ValueRules::kUnknown;
   ValueRules::Verdict verdict;
-  if (treatment.is_text && value->GetType() == ScoreValue::kString) {
+  if (slot.is_text && value->GetType() == ScoreValue::kString) {
     const std::string& text = static_cast<const StringValue*>(value)->GetText();
-    verdict = treatment.rules->JudgeText(text, code);
+    verdict = slot.rules->JudgeText(text, code);
     if (verdict == ValueRules::kInvalid && text.empty()) verdict = ValueRules::kMissing;
   } else {
-    verdict = treatment.rules->Judge(value);
-    if (verdict == ValueRules::kValid && !treatment.has_outliers) {
-      if (!treatment.is_category) return FillNumber(number, NumberOf(*value));
-      code = treatment.rules->FindCode(*value);
+    verdict = slot.rules->Judge(value);
+    if (verdict == ValueRules::kValid && !slot.has_outliers) {
+      if (!slot.is_category) return FillNumber(number, NumberOf(*value));
+      code = slot.rules->FindCode(*value);
     }
   }
   if (verdict == ValueRules::kMissing) return FillMissing(number);
   if (verdict == ValueRules::kInvalid) return FillInvalid(number, *value);
-  if (treatment.has_outliers) return FillNumber(number, NumberOf(*value));
+  if (slot.has_outliers) return FillNumber(number, NumberOf(*value));
   values_[number] = code;
   return kComplete;
 }
 
 // A valid number, into a slot of either kind.
 unsigned CaseVector::FillNumber(int number, double value) {
-  const Treatment& treatment = treatments_[number];
+  const Slot& slot = slots_[number];
   if (value == NumericValue::gSysmisValue) return FillMissing(number);
-  if (treatment.has_outliers) {
-    const MiningField& field = *treatment.field;
+  if (slot.has_outliers) {
+    const MiningField& field = *slot.field;
     if (value < field.low_value || value > field.high_value) {
       if (field.outliers == ScoreDictVar::kAsMissingValues) return FillMissing(number);
       value = value < field.low_value ? field.low_value : field.high_value;
     }
   }
-  values_[number] = treatment.is_category ? treatment.rules->FindCode(NumericValue(value)) : value;
+  values_[number] = slot.is_category ? slot.rules->FindCode(NumericValue(value)) : value;
   return kComplete;
 }
 
 unsigned CaseVector::FillMissing(int number) {
-  if (treatments_[number].field->missing_is_invalid) return RefuseCase(number);
+  if (slots_[number].field->missing_is_invalid) return RefuseCase(number);
   values_[number] = slots_[number].missing_value;
   return slots_[number].missing_outcome;
 }
 
 unsigned CaseVector::FillInvalid(int number, const ScoreValue& value) {
-  const Treatment& treatment = treatments_[number];
-  switch (treatment.field->invalid) {
+  const Slot& slot = slots_[number];
+  switch (slot.field->invalid) {
     case MiningField::InvalidTreatment::kAsMissing:
       return FillMissing(number);
     case MiningField::InvalidTreatment::kAsValue:
-      values_[number] = treatment.invalid_value;
+      values_[number] = slot.invalid_value;
       return kComplete;
     case MiningField::InvalidTreatment::kAsIs:
-      if (treatment.is_category) {
-        values_[number] = treatment.rules->FindCode(value);
+      if (slot.is_category) {
+        values_[number] = slot.rules->FindCode(value);
         return kComplete;
       }
       values_[number] = NumberOf(value);
@@ -218,12 +243,12 @@ unsigned CaseVector::FillInvalid(int number, const ScoreValue& value) {
 }
 
 unsigned CaseVector::RefuseCase(int number) {
-  invalid_slot_ = number;
+  invalid_slot_ = std::min(invalid_slot_, number);
   return kInvalidInput;
 }
 
 int CaseVector::GetInvalidField() const {
-  return treatments_[invalid_slot_].field_position;
+  return slots_[invalid_slot_].field_position;
 }
 
 }  // namespace MCKestrel_800

@@ -5,6 +5,8 @@
 #ifndef KESTREL_PLUGINS_SUPPORT_CASEVECTOR_H
 #define KESTREL_PLUGINS_SUPPORT_CASEVECTOR_H
 
+#include <cstddef>
+#include <cstdint>
 #include <limits>
 #include <map>
 #include <memory>
@@ -86,39 +88,47 @@ class CaseVector {
   const std::vector<const MiningField*>& GetFields() const { return fields_; }
 
  private:
-  struct Slot {
-    int position = -1;  ///< in the record
-    /// A number slot of a field whose numbers are all valid and none an outlier: two tests a case.
-    bool is_plain = false;
-    unsigned missing_outcome = kComplete;
-    double missing_value = NumericValue::gSysmisValue;
+  /// A number slot of a field whose numbers are all valid and none an outlier: what the loop over most slots
+  /// reads.
+  struct PlainSlot {
+    std::size_t position;  ///< in the record
+    std::size_t number;
+    std::uint64_t missing_bits;  ///< of the value that takes the place of a missing one
+    std::uint64_t missing_outcome;
   };
-  struct Treatment {
+  struct Slot {
     const MiningField* field;
     ValueRules* rules;
     bool is_category;
     double map_missing_to;
     int field_position;
+    bool is_plain = false;
     bool is_text = false;
     bool has_outliers = false;
+    int position = -1;  ///< in the record; -1 when it does not have the name
+    unsigned missing_outcome = kComplete;
+    double missing_value = NumericValue::gSysmisValue;
     double invalid_value = NumericValue::gSysmisValue;
   };
 
   int AddSlot(const MiningField& field, bool is_category, double map_missing_to);
-  void Prepare(int number);
+  static void Prepare(Slot& slot);
   void LookUpPositions(const ScoreCaseRecord& record);
   template <typename Source>
   unsigned FillFrom(const Source& source);
+  std::uint64_t FillPlain(const PlainSlot& slot, const ScoreValue* value, double* values);
   unsigned FillTreated(int number, const ScoreValue* value);
   unsigned FillNumber(int number, double value);
   unsigned FillMissing(int number);
   unsigned FillInvalid(int number, const ScoreValue& value);
   unsigned RefuseCase(int number);
 
-  /// What the loop over all slots reads.
   std::vector<Slot> slots_;
-  /// What slots with more than the plain rule read besides, by slot.
-  std::vector<Treatment> treatments_;
+  /// Of the record layout at hand: the plain slots whose names it has, and what those without add to each
+  /// outcome.
+  std::vector<PlainSlot> plain_slots_;
+  unsigned absent_outcome_ = kComplete;
+  std::vector<int> other_slots_;
   std::vector<double> values_;
   std::vector<const MiningField*> fields_;
   std::vector<std::unique_ptr<ValueRules>> rules_;  ///< by field
@@ -127,7 +137,7 @@ class CaseVector {
   std::map<const MiningField*, int> field_positions_;
   unsigned long long layout_stamp_ = 0;
   int positions_end_ = 0;
-  int invalid_slot_ = -1;
+  int invalid_slot_ = 0;
 };
 
 }  // namespace MCKestrel_800
