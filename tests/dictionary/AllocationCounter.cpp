@@ -24,10 +24,10 @@ void operator delete(void* memory, std::size_t) noexcept {
   std::free(memory);
 }
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 
 long AllocationsSoFar() {
   return allocations.load();
 }
 
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

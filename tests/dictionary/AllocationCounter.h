@@ -3,11 +3,11 @@
 #ifndef KESTREL_TESTS_DICTIONARY_ALLOCATIONCOUNTER_H
 #define KESTREL_TESTS_DICTIONARY_ALLOCATIONCOUNTER_H
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 
 /// Calls of operator new since the program started.
 long AllocationsSoFar();
 
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800
 
 #endif  // KESTREL_TESTS_DICTIONARY_ALLOCATIONCOUNTER_H

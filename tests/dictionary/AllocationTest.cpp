@@ -13,7 +13,7 @@
 #include "tests/dictionary/AllocationCounter.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 /// How often the heap was asked while the function ran.
@@ -108,4 +108,4 @@ TEST(Allocations, AskingForMissingAndValidValuesMakesNone) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

@@ -7,7 +7,7 @@
 #include "kestrel/dictionary/DictVar.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 using Names = std::vector<std::string>;
@@ -148,4 +148,4 @@ TEST(BaseDictionary, DisplaysItsVariablesInOrderOfTheirNames) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

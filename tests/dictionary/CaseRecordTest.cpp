@@ -10,7 +10,7 @@
 #include "kestrel/dictionary/DictVar.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 using Names = std::vector<std::string>;
@@ -292,4 +292,4 @@ TEST(ScoreCaseRecord, PromisesNothingByDefault) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

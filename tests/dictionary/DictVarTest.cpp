@@ -13,7 +13,7 @@
 #include "kestrel/dictionary/VarStats.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 using V = ScoreDictVar;
@@ -569,4 +569,4 @@ TEST(DictVar, DisplayShowsLabelsMissingValuesAndMeasureInThatOrder) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

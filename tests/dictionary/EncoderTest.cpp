@@ -8,7 +8,7 @@
 #include "kestrel/dictionary/ScoreCatStringEncoder.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 using Texts = std::vector<std::string>;
@@ -319,4 +319,4 @@ TEST(ScoreEncoder, ReservingAWildNumberIsHarmless) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

@@ -6,7 +6,7 @@
 
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 TEST(MissingValueSet, RefusesNullAndEqualRangesWithoutDeletingThem) {
@@ -111,4 +111,4 @@ TEST(MissingValueSet, CopiesAreDeepAndDisplayTheRanges) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

@@ -19,9 +19,7 @@
 #include "kestrel/foundation/StringValue.h"
 #include "kestrel/predicates/Range.h"
 
-namespace kestrel_test {
-
-using namespace MCKestrel_800;
+namespace MCKestrel_800 {
 
 inline NumericValue* NewNumber(double number) {
   return new NumericValue(number);
@@ -214,6 +212,6 @@ class WholeRange : public ScoreValueRange {
   NumericValue value_;
 };
 
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800
 
 #endif  // KESTREL_TESTS_DICTIONARY_TESTVALUES_H

@@ -16,7 +16,7 @@
 #include "kestrel/dictionary/ValueProbabilitySet.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 using Random = std::mt19937;
@@ -338,4 +338,4 @@ TEST(ValueIndex, ManyEqualElementsDoNotSlowDownTheirLookUp) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

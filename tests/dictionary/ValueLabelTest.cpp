@@ -7,7 +7,7 @@
 #include "kestrel/dictionary/ValueLbl.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 TEST(ValueLbl, SetValueLabelTakesBothOrNothing) {
@@ -172,4 +172,4 @@ TEST(ValueLabelSet, DisplaysItsLabelsInOrder) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

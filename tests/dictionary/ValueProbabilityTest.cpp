@@ -7,7 +7,7 @@
 #include "kestrel/dictionary/ValueProbabilitySet.h"
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
@@ -114,4 +114,4 @@ TEST(ValueProbabilitySet, CopiesAreDeepAndDisplayInOrder) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800

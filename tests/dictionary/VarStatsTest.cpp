@@ -7,7 +7,7 @@
 
 #include "tests/dictionary/TestValues.h"
 
-namespace kestrel_test {
+namespace MCKestrel_800 {
 namespace {
 
 TEST(VarStats, StartsWithTheWidestLimits) {
@@ -72,4 +72,4 @@ TEST(VarStats, CopiesAreDeep) {
 }
 
 }  // namespace
-}  // namespace kestrel_test
+}  // namespace MCKestrel_800
