@@ -9,7 +9,6 @@
 #include <xercesc/util/XMLUni.hpp>
 
 #include "kestrel/foundation/NarrowText.h"
-#include "kestrel/foundation/PliantTranscoder.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
 
@@ -57,22 +56,6 @@ ScoreModel* BaseTranslator::ParseFromTree(std::istream&, const std::string&) {
 
 ScoreModel* BaseTranslator::ParseFromTree(std::istream&, const std::string&, const std::string&) {
   return nullptr;
-}
-
-void BaseTranslator::CreateTranscoder(const std::string& encoding) {
-  transcoder_ = std::make_shared<MCXML_800::PliantTranscoder>(encoding.empty() ? "CP1252" : encoding.c_str());
-}
-
-MCXML_800::PliantTranscoder* BaseTranslator::GetTranscoder() const {
-  return transcoder_.get();
-}
-
-bool BaseTranslator::IsEqual(MCXML_800::PliantTranscoder* transcoder, const XMLCh* wide,
-                             const std::string& narrow) {
-  if (transcoder == nullptr) return IsEqual(wide, narrow);
-  std::string text;
-  if (!IsEmpty(wide)) transcoder->transcodeTo(wide, text);
-  return text == narrow;
 }
 
 bool BaseTranslator::IsEqual(const XMLCh* wide, const std::string& narrow) {

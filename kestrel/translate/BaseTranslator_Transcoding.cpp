@@ -1,0 +1,27 @@
+// The translator's transcoder, for documents whose texts a plug-in wants in one encoding.
+
+#include "kestrel/foundation/PliantTranscoder.h"
+#include "kestrel/translate/BaseTranslator.h"
+#include "kestrel/translate/ParserPlatform.h"
+#include "kestrel/translate/XmlText.h"
+
+namespace MCKestrel_800 {
+
+void BaseTranslator::CreateTranscoder(const std::string& encoding) {
+  RequireParser();  // transcoders are the parser library's
+  transcoder_ = std::make_shared<MCXML_800::PliantTranscoder>(encoding.empty() ? "CP1252" : encoding.c_str());
+}
+
+MCXML_800::PliantTranscoder* BaseTranslator::GetTranscoder() const {
+  return transcoder_.get();
+}
+
+bool BaseTranslator::IsEqual(MCXML_800::PliantTranscoder* transcoder, const XMLCh* wide,
+                             const std::string& narrow) {
+  if (transcoder == nullptr) return IsEqual(wide, narrow);
+  std::string text;
+  if (!IsEmpty(wide)) transcoder->transcodeTo(wide, text);
+  return text == narrow;
+}
+
+}  // namespace MCKestrel_800
