@@ -6,6 +6,7 @@
 #include <typeinfo>
 
 #include "kestrel/dictionary/ScoreCaseRecord.h"
+#include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/NumberText.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
@@ -13,8 +14,12 @@
 namespace MCKestrel_800 {
 namespace {
 
-// The number that a value stands for; a text counts when all of it is a number.
-double NumberOf(const ScoreValue& value) {
+// The number that a value of the variable stands for: of a date/time the number in the variable's unit, of a
+// text the number that all of it reads as.
+double NumberOf(const ScoreValue& value, const ScoreDictVar& variable) {
+  if (value.GetType() == ScoreValue::kDateTime && variable.GetDateTimeType() != kNoDateTime) {
+    return static_cast<const DateTimeValue&>(value).GetDoubleValue(variable.GetDateTimeType());
+  }
   if (value.GetType() != ScoreValue::kString) return value.GetDouble();
   const std::string& text = static_cast<const StringValue&>(value).GetText();
   double number;
@@ -98,7 +103,8 @@ void CaseVector::Prepare(Slot& slot) {
   const MiningField& field = *slot.field;
   const ScoreDictVar& variable = *field.variable;
   const auto place = [&slot](const ScoreValue& value) {
-    return slot.is_category ? static_cast<double>(slot.rules->FindCode(value)) : value.GetDouble();
+    return slot.is_category ? static_cast<double>(slot.rules->FindCode(value))
+                            : NumberOf(value, *slot.field->variable);
   };
   slot.is_text = variable.GetVarType() == ScoreDictVar::STRING_VAR;
   slot.has_outliers =
@@ -190,13 +196,13 @@ unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {
   } else {
     verdict = slot.rules->Judge(value);
     if (verdict == ValueRules::kValid && !slot.has_outliers) {
-      if (!slot.is_category) return FillNumber(number, NumberOf(*value));
+      if (!slot.is_category) return FillNumber(number, NumberOf(*value, *slot.field->variable));
       code = slot.rules->FindCode(*value);
     }
   }
   if (verdict == ValueRules::kMissing) return FillMissing(number);
   if (verdict == ValueRules::kInvalid) return FillInvalid(number, *value);
-  if (slot.has_outliers) return FillNumber(number, NumberOf(*value));
+  if (slot.has_outliers) return FillNumber(number, NumberOf(*value, *slot.field->variable));
   values_[number] = code;
   return kComplete;
 }
@@ -235,7 +241,7 @@ unsigned CaseVector::FillInvalid(int number, const ScoreValue& value) {
         values_[number] = slot.rules->FindCode(value);
         return kComplete;
       }
-      values_[number] = NumberOf(value);
+      values_[number] = NumberOf(value, *slot.field->variable);
       return values_[number] == NumericValue::gSysmisValue ? FillMissing(number) : kComplete;
     default:
       return RefuseCase(number);

@@ -22,7 +22,9 @@ namespace MCKestrel_800 {
 class ScoreCaseRecord;
 
 /// The inputs of a model as slots, one double each:
-///   a number slot    the number itself (of a date/time its number), or the system-missing value;
+///   a number slot    the number itself (of a date/time the number in its field's unit), or the
+///   system-missing
+///                    value;
 ///   a category slot  the category's code (see ValueRules), kMissingCategory, or kOtherCategory for a value
 ///   that has no
 ///                    code: valid in a field that lists no categories, or invalid and used as it is.

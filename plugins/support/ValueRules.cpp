@@ -75,7 +75,8 @@ void ValueRules::CompileLabels() {
     if (type_ != ScoreDictVar::STRING_VAR && (IsNumber(value) || IsDate(value))) {
       labelled_.Add(value->GetDouble(), code);
       if (lists_categories_) numbers_.Add(value->GetDouble(), code);
-    } else if (type_ == ScoreDictVar::STRING_VAR && IsText(value)) {
+    } else if (type_ == ScoreDictVar::STRING_VAR && value != nullptr) {
+      // Encoders take any value of a text variable by its text.
       if (lists_categories_) texts_.Add(value->GetString(), code);
     } else {
       continue;
