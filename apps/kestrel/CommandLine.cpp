@@ -1,0 +1,207 @@
+#include "apps/kestrel/CommandLine.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <map>
+#include <sstream>
+
+#include "apps/kestrel/CheckCommand.h"
+#include "apps/kestrel/CopyCommand.h"
+#include "apps/kestrel/DescribeCommand.h"
+#include "apps/kestrel/OutputFile.h"
+#include "apps/kestrel/ProgramError.h"
+#include "apps/kestrel/ScoreCommand.h"
+
+namespace kestrel_program {
+namespace {
+
+constexpr const char* kVersionText = "kestrel " KESTREL_VERSION;
+
+constexpr const char* kScoreHelp =
+    "The table has a line with the columns' names first; cells are separated by commas, tabs, semicolons or "
+    "vertical\n"
+    "bars. Columns may stand in any order, those that the model does not read are ignored. A cell in "
+    "quotation marks\n"
+    "may hold separators, line ends and quotation marks written twice; blanks around a cell do not count "
+    "unless they\n"
+    "are in quotation marks. Numbers have a decimal point (not inf or nan), dates and times are written as\n"
+    "2024-02-29, 13:05:59 and 2024-02-29T13:05:59. All text is UTF-8.\n"
+    "\n"
+    "The output has the columns that are kept, then\n"
+    "  prediction              the predicted number or category\n"
+    "  probability             of the predicted category (classifications)\n"
+    "  probability_<category>  of each category that the target lists, in its order (classifications)\n"
+    "A case without prediction has empty cells (null in jsonl). A name that a kept column has already gets "
+    "\"_2\"\n"
+    "behind it. A file that is written appears when it is complete, not before.\n";
+
+/// What the options of all commands are read into.
+struct Values {
+  std::string model;
+  std::string names_file;
+  std::string data = "-";
+  std::string output = "-";
+  std::string delimiter;
+  std::string format = "csv";
+  std::string on_error = "stop";
+  std::vector<std::string> keep;
+  std::vector<std::string> missing;
+  bool shows_statistics = false;
+  bool as_json = false;
+};
+
+/// Stands for every column; no table has such a name by chance.
+constexpr const char* kAllColumns = "*";
+
+const std::map<std::string, char>& DelimiterNames() {
+  static const std::map<std::string, char> names = {{"comma", ','}, {"tab", '\t'}, {"semicolon", ';'},
+                                                    {"pipe", '|'},  {",", ','},    {"\t", '\t'},
+                                                    {"\\t", '\t'},  {";", ';'},    {"|", '|'}};
+  return names;
+}
+
+char DelimiterOf(const Values& values) {
+  if (values.delimiter.empty()) return 0;
+  const auto found = DelimiterNames().find(values.delimiter);
+  if (found != DelimiterNames().end()) return found->second;
+  throw ProgramError(kUsage, "--delimiter: \"" + values.delimiter +
+                                 "\" is none of comma, tab, semicolon, pipe or the character itself");
+}
+
+TableWriter::Format FormatOf(const Values& values) {
+  return values.format == "jsonl" ? TableWriter::Format::kJsonLines : TableWriter::Format::kCsv;
+}
+
+void AddModel(CLI::App& command, Values& values) {
+  command.add_option("MODEL", values.model, "The model's document; - for the standard input")->required();
+  command
+      .add_option("--models", values.names_file,
+                  "A file with the model elements to look for, instead of all that PMML has")
+      ->type_name("FILE");
+}
+
+void AddTable(CLI::App& command, Values& values) {
+  command.add_option("DATA", values.data, "The table; - or nothing for the standard input");
+  command.add_option("-o,--output", values.output, "The file to write; - or nothing for the standard output")
+      ->type_name("FILE");
+  command
+      .add_option(
+          "--delimiter", values.delimiter,
+          "What separates the table's cells: comma, tab, semicolon, pipe or the character itself; found "
+          "out from the first line when not given")
+      ->type_name("NAME");
+  command
+      .add_option("--format", values.format,
+                  "The output: csv (with commas, the default) or jsonl (an object a line)")
+      ->check(CLI::IsMember({"csv", "jsonl"}))
+      ->type_name("FORMAT");
+}
+
+void AddScore(CLI::App& program, Values& values) {
+  CLI::App& command = *program.add_subcommand("score", "Score the cases of a table");
+  AddModel(command, values);
+  AddTable(command, values);
+  command.add_flag(
+      "--keep{*}", values.keep,
+      "Copy the table's columns beside the predictions: all with --keep, some with --keep=NAME,NAME");
+  command
+      .add_option("--missing", values.missing,
+                  "Texts that stand for a missing value, beside the empty cell: NA,?")
+      ->delimiter(',')
+      ->allow_extra_args(false)
+      ->type_name("TEXT,...");
+  command
+      .add_option(
+          "--on-error", values.on_error,
+          "A case that cannot be read or scored: stop (the default) there, or null: leave its prediction "
+          "empty and go on")
+      ->check(CLI::IsMember({"stop", "null"}))
+      ->type_name("WHAT");
+  command.add_flag("--stats", values.shows_statistics,
+                   "Tell in the end how many cases there were and how fast it went");
+  command.footer(std::string(kScoreHelp) + "\n" + kExitCodesHelp);
+}
+
+void AddDescribe(CLI::App& program, Values& values) {
+  CLI::App& command = *program.add_subcommand("describe", "Show what a model is and what it reads");
+  AddModel(command, values);
+  command.add_flag("--json", values.as_json, "Write one JSON object instead of a table");
+}
+
+void AddCheck(CLI::App& program, Values& values) {
+  CLI::App& command =
+      *program.add_subcommand("check", "Tell whether a document is good, or what is wrong and where");
+  AddModel(command, values);
+}
+
+void AddCopy(CLI::App& program, Values& values) {
+  CLI::App& command = *program.add_subcommand(
+      "copy-table", "Read a table and write it again, without a model (to measure against)");
+  AddTable(command, values);
+}
+
+ExitCode RunScore(const Values& values) {
+  ScoreOptions options;
+  options.model = values.model;
+  options.data = values.data;
+  options.output = values.output;
+  options.names_file = values.names_file;
+  options.delimiter = DelimiterOf(values);
+  options.keep_all = std::count(values.keep.begin(), values.keep.end(), kAllColumns) > 0;
+  options.keep = values.keep;
+  options.missing = values.missing;
+  options.goes_on_after_faults = values.on_error == "null";
+  options.format = FormatOf(values);
+  options.shows_statistics = values.shows_statistics;
+  return Score(options);
+}
+
+ExitCode Run(const CLI::App& program, const Values& values) {
+  if (program.got_subcommand("score")) return RunScore(values);
+  if (program.got_subcommand("describe")) return Describe(values.model, values.names_file, values.as_json);
+  if (program.got_subcommand("check")) return Check(values.model, values.names_file);
+  CopyOptions options;
+  options.data = values.data;
+  options.output = values.output;
+  options.delimiter = DelimiterOf(values);
+  options.format = FormatOf(values);
+  return CopyTable(options);
+}
+
+}  // namespace
+
+ExitCode RunCommandLine(const std::vector<std::string>& arguments) {
+  Values values;
+  CLI::App program("Scores predictive models (PMML documents).", "kestrel");
+  AddScore(program, values);
+  AddDescribe(program, values);
+  AddCheck(program, values);
+  AddCopy(program, values);
+  program.require_subcommand(1);
+  program.set_version_flag("--version", kVersionText, "Show the version");
+  program.set_help_flag("-h,--help", "Show this help");
+  program.footer(std::string("\"kestrel COMMAND --help\" tells more about a command.\n\n") + kExitCodesHelp);
+  for (CLI::App* command : program.get_subcommands({})) {
+    command->set_version_flag("--version", kVersionText, "Show the version");
+    command->set_help_flag("-h,--help", "Show this help");
+    if (command->get_footer().empty()) command->footer(kExitCodesHelp);
+  }
+  try {
+    // The last one goes first: that is how the parser takes them.
+    program.parse(std::vector<std::string>(arguments.rbegin(), arguments.rend()));
+  } catch (const CLI::Success& wanted) {
+    std::ostringstream text;
+    program.exit(wanted, text, text);
+    OutputFile output("-");
+    output.GetBuffer() += text.str();
+    output.Finish();
+    return kDone;
+  } catch (const CLI::ParseError& fault) {
+    throw ProgramError(kUsage,
+                       std::string(fault.what()) +
+                           "\n  hint: kestrel --help lists the commands, kestrel COMMAND --help its options");
+  }
+  return Run(program, values);
+}
+
+}  // namespace kestrel_program

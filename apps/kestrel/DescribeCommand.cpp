@@ -1,0 +1,128 @@
+#include "apps/kestrel/DescribeCommand.h"
+
+#include <algorithm>
+#include <array>
+#include <memory>
+#include <nlohmann/json.hpp>
+#include <string>
+#include <vector>
+
+#include "apps/kestrel/LoadedModel.h"
+#include "apps/kestrel/ModelDescription.h"
+#include "apps/kestrel/OutputFile.h"
+#include "apps/kestrel/ShownText.h"
+#include "kestrel/model/ScoreModel.h"
+
+namespace kestrel_program {
+namespace {
+
+/// Keys in the order in which they are put in, because people read them.
+using Json = nlohmann::ordered_json;
+
+Json ToJson(const FieldDescription& field) {
+  Json object;
+  object["name"] = field.name;
+  if (!field.label.empty()) object["label"] = field.label;
+  object["type"] = field.type;
+  object["level"] = field.level;
+  object["role"] = field.role;
+  object["read"] = field.is_read;
+  object["categories"] = Json::array();
+  for (const FieldDescription::Category& category : field.categories) {
+    Json entry;
+    entry["value"] = category.value;
+    if (!category.label.empty()) entry["label"] = category.label;
+    object["categories"].push_back(entry);
+  }
+  object["missing"] = field.missing;
+  return object;
+}
+
+Json ToJson(const ModelDescription& model) {
+  Json object;
+  object["kind"] = model.kind;
+  object["version"] = model.version;
+  object["target"] = model.has_target ? ToJson(model.target) : Json();
+  object["inputs"] = Json::array();
+  for (const FieldDescription& field : model.inputs)
+    object["inputs"].push_back(ToJson(field));
+  return object;
+}
+
+using TableLine = std::array<std::string, 6>;
+
+std::string Join(const std::vector<std::string>& texts) {
+  std::string joined;
+  for (const std::string& text : texts)
+    joined += (joined.empty() ? "" : ", ") + ShownText(text);
+  return joined.empty() ? "-" : joined;
+}
+
+TableLine ToLine(const FieldDescription& field) {
+  std::vector<std::string> categories;
+  for (const FieldDescription::Category& category : field.categories) {
+    categories.push_back(category.label.empty() ? category.value
+                                                : category.value + " (" + category.label + ")");
+  }
+  const bool is_target = field.role == "target";
+  return {ShownText(field.name), field.type,
+          field.level,           field.role + (field.is_read || is_target ? "" : " (not read)"),
+          Join(field.missing),   Join(categories)};
+}
+
+/// Characters, not bytes: names need not be ASCII.
+std::size_t WidthOf(const std::string& text) {
+  return static_cast<std::size_t>(std::count_if(
+      text.begin(), text.end(), [](char c) { return (static_cast<unsigned char>(c) & 0xC0u) != 0x80u; }));
+}
+
+void AppendAligned(const std::vector<TableLine>& lines, std::string& out) {
+  std::array<std::size_t, 6> widths{};
+  for (const TableLine& line : lines) {
+    for (std::size_t i = 0; i < line.size(); ++i)
+      widths[i] = std::max(widths[i], WidthOf(line[i]));
+  }
+  for (const TableLine& line : lines) {
+    out += "  ";
+    for (std::size_t i = 0; i < line.size(); ++i) {
+      out += line[i];
+      if (i + 1 < line.size()) out.append(widths[i] - WidthOf(line[i]) + 2, ' ');
+    }
+    out += '\n';
+  }
+}
+
+void AppendText(const ModelDescription& model, std::string& out) {
+  out += "kind:    " + model.kind + "\n";
+  out += "version: " + (model.version.empty() ? std::string("-") : ShownText(model.version)) + "\n";
+  const TableLine kHeading = {"name", "type", "level", "role", "missing values", "categories"};
+  out += "target:\n";
+  if (model.has_target) {
+    AppendAligned({kHeading, ToLine(model.target)}, out);
+  } else {
+    out += "  none\n";
+  }
+  out += "inputs: " + std::to_string(model.inputs.size()) + "\n";
+  if (model.inputs.empty()) return;
+  std::vector<TableLine> lines = {kHeading};
+  for (const FieldDescription& field : model.inputs)
+    lines.push_back(ToLine(field));
+  AppendAligned(lines, out);
+}
+
+}  // namespace
+
+ExitCode Describe(const std::string& model, const std::string& names_file, bool as_json) {
+  const std::unique_ptr<MCKestrel_800::ScoreModel> loaded = LoadModel(model, names_file);
+  const ModelDescription description(*loaded);
+  OutputFile output("-");
+  if (as_json) {
+    output.GetBuffer() += ToJson(description).dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+  } else {
+    AppendText(description, output.GetBuffer());
+  }
+  output.Finish();
+  return kDone;
+}
+
+}  // namespace kestrel_program

@@ -1,0 +1,60 @@
+// What the model answers, as columns of the output.
+
+#ifndef KESTREL_APPS_KESTREL_PREDICTIONCOLUMNS_H
+#define KESTREL_APPS_KESTREL_PREDICTIONCOLUMNS_H
+
+#include <cstddef>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace MCKestrel_800 {
+class ScoreClsResult;
+class ScoreModel;
+class ScoreResult;
+class ScoreValue;
+}  // namespace MCKestrel_800
+
+namespace kestrel_program {
+
+class TableWriter;
+
+/// The text of a value as the program writes it: numbers in their shortest form, dates and times in ISO 8601.
+std::string TextOf(const MCKestrel_800::ScoreValue& value);
+
+/// "prediction"; for classifications also "probability" and a "probability_" with the category's text for
+/// each category of the target, in the order in which the target lists them. A target without a list has the
+/// categories that the model gives for a case of zeros, and none when it cannot score that. A model that
+/// keeps the categories' probabilities to itself has no columns for them.
+class PredictionColumns {
+ public:
+  /// The model must outlive this object.
+  explicit PredictionColumns(MCKestrel_800::ScoreModel& model);
+  ~PredictionColumns();
+  PredictionColumns(const PredictionColumns&) = delete;
+  PredictionColumns& operator=(const PredictionColumns&) = delete;
+
+  const std::vector<std::string>& GetNames() const { return names_; }
+
+  /// What the model's Score is to fill.
+  MCKestrel_800::ScoreResult* GetResult() { return result_.get(); }
+
+  /// Writes the result as it is after Score; cells that it has nothing for are missing.
+  void Write(TableWriter& writer) const;
+  /// Writes missing cells.
+  void WriteMissing(TableWriter& writer) const;
+
+ private:
+  void FindCategories(MCKestrel_800::ScoreModel& model);
+  void FindCategoriesByScoring(MCKestrel_800::ScoreModel& model);
+  void WriteCategories(TableWriter& writer) const;
+
+  std::unique_ptr<MCKestrel_800::ScoreResult> result_;
+  MCKestrel_800::ScoreClsResult* classification_;  ///< the result, or null when it is no classification
+  std::vector<std::unique_ptr<MCKestrel_800::ScoreValue>> categories_;
+  std::vector<std::string> names_;
+};
+
+}  // namespace kestrel_program
+
+#endif  // KESTREL_APPS_KESTREL_PREDICTIONCOLUMNS_H
