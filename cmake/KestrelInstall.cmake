@@ -6,8 +6,13 @@ set(KESTREL_PACKAGE_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/kestrel)
 install(TARGETS kestrel_core EXPORT kestrelTargets
   LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
   RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
-install(DIRECTORY ${PROJECT_SOURCE_DIR}/kestrel DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}
-  FILES_MATCHING PATTERN "*.h" PATTERN "*.inc")
+# The public headers are those that kestrel/kestrel.h lists.
+file(STRINGS ${PROJECT_SOURCE_DIR}/kestrel/kestrel.h headers REGEX "^#include")
+list(TRANSFORM headers REPLACE "^#include \"(.*)\"$" "\\1")
+foreach(header kestrel/kestrel.h kestrel/translate/PMMLModelTags.inc ${headers})
+  cmake_path(GET header PARENT_PATH folder)
+  install(FILES ${PROJECT_SOURCE_DIR}/${header} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/${folder})
+endforeach()
 install(FILES ${PROJECT_SOURCE_DIR}/kestrel/model/modeldll.txt DESTINATION ${CMAKE_INSTALL_DATADIR}/kestrel)
 install(FILES ${PROJECT_SOURCE_DIR}/LICENSE ${PROJECT_SOURCE_DIR}/README.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
 

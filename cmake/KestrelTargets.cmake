@@ -8,7 +8,7 @@ function(kestrel_add_plugin tag)
     PREFIX ""
     OUTPUT_NAME ${tag}800r
     LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib/kestrel/plugins
-    BUILD_RPATH "$ORIGIN/../.."
+    BUILD_WITH_INSTALL_RPATH ON
     INSTALL_RPATH "$ORIGIN/../..")
   target_link_libraries(${target} PRIVATE kestrel::kestrel XercesC::XercesC)
   install(TARGETS ${target} LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}/kestrel/plugins)

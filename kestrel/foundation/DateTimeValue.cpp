@@ -122,8 +122,10 @@ int DateTimeValue::GetInt() const {
 std::string DateTimeValue::GetString() const {
   if (IsSystemMissingValue()) return "Undefined";
   int64_t y = 0, mon = 0, d = 0, h = 0, min = 0, s = 0;
-  ExtractDate(seconds_, y, mon, d);
-  ExtractTime(seconds_, h, min, s);
+  // The day that has begun, other than ExtractDate's: date and time must read back to the same seconds.
+  const int64_t whole = WholeSeconds(std::floor(seconds_));
+  Calendar::DateOfDays(whole / fSeconds_Per_Day - (whole % fSeconds_Per_Day < 0 ? 1 : 0), y, mon, d);
+  ExtractTime(std::floor(seconds_), h, min, s);
   char date[48], time[48];
   std::snprintf(date, sizeof date, "%s%04lld-%02d-%02d", y < 0 ? "-" : "",
                 static_cast<long long>(y < 0 ? -y : y), static_cast<int>(mon), static_cast<int>(d));

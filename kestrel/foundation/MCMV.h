@@ -5,10 +5,12 @@
 
 #include <limits>
 
+#include "kestrel/platform/Export.h"
+
 namespace MCCommon_800 {
 
 /// The missing value of numerical functions: the same double as `NumericValue::gSysmisValue`.
-class MCMV {
+class KESTREL_API MCMV {
  public:
   static constexpr double gMissingValue = std::numeric_limits<double>::lowest();
 

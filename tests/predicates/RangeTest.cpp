@@ -1,0 +1,215 @@
+#include "kestrel/predicates/Range.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <memory>
+#include <sstream>
+
+#include "kestrel/foundation/DateTimeValue.h"
+#include "kestrel/foundation/NumericValue.h"
+#include "kestrel/foundation/StringValue.h"
+
+namespace MCKestrel_800 {
+namespace {
+
+constexpr double kSysmis = NumericValue::gSysmisValue;
+constexpr double kInfinity = NumericValue::gInfinity;
+
+NumericValue* Number(double x) {
+  return new NumericValue(x);
+}
+StringValue* Text(const char* text) {
+  return new StringValue(text);
+}
+
+TEST(Range, HoldsNumbersByItsEndsAndFlags) {
+  struct Row {
+    double min, max;
+    bool low, high;
+    double x;
+    bool inside;
+    const char* why;
+  };
+  const Row kRows[] = {
+      {5, 5, false, false, 5, true, "a single value ignores the flags"},
+      {5, 5, true, true, 5 + 1e-14, true, "a single value has the tolerance"},
+      {5, 5, true, true, 5.1, false, "a single value is one value"},
+      {0, 10, true, false, 0, true, "the low end is included"},
+      {0, 10, true, false, 10, false, "the high end is not"},
+      {0, 10, true, false, 9.999999999999, true, "just inside"},
+      {0, 10, false, true, 0, false, "the low end is not included"},
+      {0, 10, false, true, 10, true, "the high end is"},
+      {0, 10, true, true, 10 + 1e-13, true, "within the tolerance of an included end"},
+      {1, 10, true, true, 1 - 1e-14, true, "within the tolerance of an included end"},
+      {1, 10, false, false, 1 + 1e-14, true, "strictly inside, near an excluded end"},
+      {1, 10, false, false, 1 - 1e-14, false, "outside, near an excluded end"},
+      {0, 10, true, true, -1, false, "below"},
+      {0, 10, true, true, 11, false, "above"},
+      {-kInfinity, kInfinity, true, true, 1e300, true, "everything"},
+      {-kInfinity, kInfinity, true, true, kSysmis, false, "but the missing value"},
+      {-kInfinity, kInfinity, true, true, -kInfinity, false, "an infinity equals no end"},
+      {kSysmis, 10, true, true, -1e307, true, "a missing minimum reaches down"},
+      {10, 0, true, true, 5, false, "ends the wrong way round hold nothing inside"},
+      {10, 0, true, true, 10, true, "but their included ends"},
+      {0, 10, true, true, NAN, false, "no number is nowhere"},
+  };
+  for (const Row& row : kRows) {
+    const Range range(row.min, row.max, row.low, row.high);
+    EXPECT_EQ(range.IsInRange(row.x), row.inside) << row.why;
+    const NumericValue value(row.x);
+    EXPECT_EQ(range.IsInRange(&value), row.inside) << row.why;
+  }
+}
+
+TEST(Range, KeepsAMissingMinimumAsMinusInfinityInTheValueAlone) {
+  const Range range(kSysmis, 1.0, true, true);
+  EXPECT_EQ(range.GetMin()->GetDouble(), -kInfinity);
+  EXPECT_EQ(range.GetMax()->GetDouble(), 1.0);
+}
+
+TEST(Range, FillsAbsentEndsWithInfinities) {
+  const Range low(nullptr, Number(3), false, true), high(Number(3), nullptr, true, false),
+      both(static_cast<ScoreValue*>(nullptr), nullptr, false, false);
+  EXPECT_EQ(low.GetMin()->GetDouble(), -kInfinity);
+  EXPECT_EQ(high.GetMax()->GetDouble(), kInfinity);
+  EXPECT_TRUE(low.IsInRange(-1e300));
+  EXPECT_FALSE(low.IsInRange(4));
+  EXPECT_TRUE(high.IsInRange(3));
+  EXPECT_TRUE(high.IsInRange(1e300));
+  EXPECT_TRUE(both.IsInRange(0.0));
+}
+
+TEST(Range, TakesAMissingMinimumButNotMaximumForAnInfinity) {
+  const Range range(Number(kSysmis), Number(kSysmis), true, true);
+  EXPECT_EQ(range.GetMin()->GetDouble(), -kInfinity);
+  EXPECT_EQ(range.GetMax()->GetDouble(), kSysmis);
+  EXPECT_FALSE(range.IsInRange(0.0));
+}
+
+TEST(Range, OneObjectForBothEndsIsASingleValue) {
+  NumericValue* const value = Number(7);
+  const Range range(value, value, false, false);
+  EXPECT_NE(range.GetMin(), range.GetMax());
+  EXPECT_TRUE(range.IsInRange(7));
+  EXPECT_FALSE(range.IsInRange(7.1));
+}
+
+TEST(Range, EqualEndsAreASingleValue) {
+  const Range range(Text("ab"), Text("ab  "), false, false);
+  const StringValue same("ab"), other("b");
+  EXPECT_TRUE(range.IsInRange(&same));
+  EXPECT_FALSE(range.IsInRange(&other));
+}
+
+TEST(Range, SingleValuesCompareByTheValuesOwnRules) {
+  const Range text(Text("no answer"));
+  const StringValue padded("no answer  "), other("No answer");
+  EXPECT_TRUE(text.IsInRange(&padded));
+  EXPECT_FALSE(text.IsInRange(&other));
+  EXPECT_TRUE(text.GetLowEnd());
+  EXPECT_TRUE(text.GetHighEnd());
+  const Range date(new DateTimeValue(5.0, kDateVal));
+  const DateTimeValue same(5.0, kTimeVal);
+  const NumericValue number(5.0);
+  EXPECT_TRUE(date.IsInRange(&same));
+  EXPECT_FALSE(date.IsInRange(&number));
+  const Range missing(Number(kSysmis));
+  EXPECT_EQ(missing.GetMin()->GetDouble(), -kInfinity);
+}
+
+TEST(Range, HoldsNothingButNumbersBetweenItsEnds) {
+  const Range range(0, 10, true, true);
+  const StringValue text("5");
+  const DateTimeValue date(5.0, kDateVal);
+  const NumericValue missing;
+  EXPECT_FALSE(range.IsInRange(&text));
+  EXPECT_FALSE(range.IsInRange(&date));
+  EXPECT_FALSE(range.IsInRange(&missing));
+  EXPECT_FALSE(range.IsInRange(static_cast<const ScoreValue*>(nullptr)));
+  const Range texts(Text("a"), Text("c"), true, true);
+  const StringValue between("b");
+  EXPECT_FALSE(texts.IsInRange(&between));
+}
+
+TEST(Range, ReplacesEndsWithoutDeletingTheOldOnes) {
+  Range range(0, 10, true, true);
+  const std::unique_ptr<const ScoreValue> oldMin(range.GetMin()), oldMax(range.GetMax());
+  range.SetMin(nullptr);
+  EXPECT_EQ(range.GetMin(), oldMin.get());
+  range.SetMin(Number(4));
+  range.SetMax(Number(6));
+  EXPECT_TRUE(range.IsInRange(5));
+  EXPECT_FALSE(range.IsInRange(3));
+  EXPECT_FALSE(range.IsInRange(7));
+
+  const std::unique_ptr<const ScoreValue> four(range.GetMin());
+  range.SetMin(Number(kSysmis));
+  EXPECT_EQ(range.GetMin()->GetDouble(), -kInfinity);
+  EXPECT_TRUE(range.IsInRange(-1e300));
+
+  const std::unique_ptr<const ScoreValue> lowest(range.GetMin());
+  range.SetMin(Number(6));
+  EXPECT_TRUE(range.IsInRange(6 + 1e-14)) << "the ends are equal now";
+  const std::unique_ptr<const ScoreValue> six(range.GetMax());
+  range.SetMax(Number(kSysmis));
+  EXPECT_EQ(range.GetMax()->GetDouble(), kSysmis) << "a missing maximum stays";
+  const std::unique_ptr<const ScoreValue> missing(range.GetMax());
+  range.SetMax(nullptr);
+  EXPECT_EQ(range.GetMax(), nullptr);
+}
+
+TEST(Range, EqualsByEndsAndFlags) {
+  const Range range(0, 10, true, false);
+  EXPECT_TRUE(range == Range(0, 10, true, false));
+  EXPECT_TRUE(range == Range(0, 10 + 1e-13, true, false));
+  EXPECT_FALSE(range == Range(1, 10, true, false));
+  EXPECT_FALSE(range == Range(0, 11, true, false));
+  EXPECT_FALSE(range == Range(0, 10, false, false));
+  EXPECT_FALSE(range == Range(0, 10, true, true));
+  EXPECT_FALSE(range == Range(Text("0"), Text("10"), true, false));
+}
+
+TEST(Range, CopiesDeeply) {
+  Range range(0, 10, true, false), other(Text("x"));
+  const Range copy(range);
+  EXPECT_TRUE(copy == range);
+  EXPECT_NE(copy.GetMin(), range.GetMin());
+  const std::unique_ptr<ScoreValueRange> clone(range.Clone());
+  EXPECT_TRUE(*clone == range);
+  other = range;
+  EXPECT_TRUE(other == range);
+  EXPECT_TRUE(other.IsInRange(5));
+  Range& self = other;
+  other = self;
+  EXPECT_TRUE(other == range);
+}
+
+TEST(Range, DisplaysItsEnds) {
+  struct Row {
+    Range range;
+    const char* text;
+  };
+  const Row kRows[] = {
+      {Range(0, 10.5, true, false),
+       "  Start Range Display   \nMinValue: 0;  MaxValue: 10.5; High End not included; lower End included\n "
+       "End of Range "
+       "Display\n\n"},
+      {Range(Text("a"), Text("b"), false, true),
+       "  Start Range Display   \nMinValue: a;  MaxValue: b; High End included; lower End not included\n End "
+       "of Range "
+       "Display\n\n"},
+      {Range(new DateTimeValue(86400.0, kDateVal)),
+       "  Start Range Display   \nMinValue: 86400;  MaxValue: 86400; High End included; lower End included\n "
+       "End of Range "
+       "Display\n\n"},
+  };
+  for (const Row& row : kRows) {
+    std::ostringstream out;
+    row.range.Display(out);
+    EXPECT_EQ(out.str(), row.text);
+  }
+}
+
+}  // namespace
+}  // namespace MCKestrel_800
