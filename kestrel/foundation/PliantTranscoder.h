@@ -20,12 +20,12 @@ namespace MCXML_800 {
 /// Holds the parser library's transcoder for one encoding.
 ///
 /// The parser library must be initialised before, and must stay so for as long as the object lives: the class
-/// does not do it, since whoever reads documents has done it. Without it, and for an encoding that is unknown,
-/// null, or has shift states (such as "ISO-2022-JP", whose texts cannot be taken one by one), IsValid is false
-/// and every conversion refuses.
+/// does not do it, since whoever reads documents has done it. Without it, and for an encoding that is
+/// unknown, null, or has shift states (such as "ISO-2022-JP", whose texts cannot be taken one by one),
+/// IsValid is false and every conversion refuses.
 ///
-/// What cannot be converted is replaced: by the encoding's own substitute on the way out, by U+FFFD on the way
-/// in. Texts may be of any length; each call starts anew, whatever the one before ended in.
+/// What cannot be converted is replaced: by the encoding's own substitute on the way out, by U+FFFD on the
+/// way in. Texts may be of any length; each call starts anew, whatever the one before ended in.
 ///
 /// Threads: one at a time.
 class KESTREL_API PliantTranscoder {
@@ -50,10 +50,12 @@ class KESTREL_API PliantTranscoder {
   XMLCh* ChangeChar2XML(const char* text, size_t length) const;
 
  private:
+  bool DecodeWithTranscoder(const char* text, size_t length, std::u16string& out) const;
   std::u16string Decode(const char* text, size_t length) const;
 
   std::unique_ptr<xercesc::XMLTranscoder> transcoder_;
   std::string encoding_;
+  size_t unit_bytes_ = 1;
 };
 
 }  // namespace MCXML_800

@@ -23,7 +23,10 @@ KESTREL_API std::string CharacterLocaleName();
 
 /// Whether the system's programs use UTF-8 for narrow text unless told otherwise.
 KESTREL_API bool NarrowTextIsUtf8ByDefault();
-/// The name of the code page of the process's narrow text, such as "ISO-8859-1" or "windows-1252".
+/// The number of the code page of the process's narrow text, such as 1252; 0 where code pages have none.
+KESTREL_API long CodePageNumber();
+/// The name of that code page, such as "ISO-8859-1" or "windows-1252". On Linux it is that of the C locale of
+/// the moment.
 KESTREL_API std::string CodePageName();
 
 }  // namespace MCKestrel_800

@@ -26,6 +26,9 @@ std::string CharacterLocaleName() {
 bool NarrowTextIsUtf8ByDefault() {
   return true;
 }
+long CodePageNumber() {
+  return 0;
+}
 std::string CodePageName() {
   return nl_langinfo(CODESET);
 }

@@ -27,6 +27,9 @@ std::string CharacterLocaleName() {
 bool NarrowTextIsUtf8ByDefault() {
   return false;
 }
+long CodePageNumber() {
+  return static_cast<long>(GetACP());
+}
 std::string CodePageName() {
   return "windows-" + std::to_string(GetACP());
 }
