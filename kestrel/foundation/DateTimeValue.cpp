@@ -40,7 +40,13 @@ const NumericForm* FormOf(DateTimeType type) {
   return type >= kDate && type <= kDateTimeSecondsSince1980 ? &kForms[type] : nullptr;
 }
 
-/// Seconds cut toward zero to an integer; what no calendar reaches is clamped, and no number is 0.
+/// Whether the seconds stand for a point in time: not undefined, not infinite, and a number.
+bool IsMoment(double seconds) {
+  return std::isfinite(seconds) && !NumericValue::IsSystemMissingValue(seconds);
+}
+
+/// Seconds cut toward zero to an integer; what no calendar reaches is clamped, and what is undefined or no
+/// number is 0.
 int64_t WholeSeconds(double seconds) {
   if (std::isnan(seconds) || NumericValue::IsSystemMissingValue(seconds)) return 0;
   constexpr double kFarthest = 9e18;
@@ -69,6 +75,43 @@ bool ReadThree(std::string_view text, char separator, int64_t (&numbers)[3]) {
   if (!digits || piece != 2) return false;
   numbers[2] = number;
   return true;
+}
+
+bool ReadDate(std::string_view text, int64_t (&numbers)[3]) {
+  return ReadThree(text, '-', numbers) && DateTimeValue::IsValidDate(numbers[0], numbers[1], numbers[2]);
+}
+bool ReadTime(std::string_view text, int64_t (&numbers)[3]) {
+  return ReadThree(text, ':', numbers) && DateTimeValue::IsValidTime(numbers[0], numbers[1], numbers[2]);
+}
+
+int64_t SecondsOfDay(int64_t seconds) {
+  const int64_t t = seconds % Calendar::kSeconds_Per_Day;
+  return t < 0 ? t + Calendar::kSeconds_Per_Day : t;
+}
+
+void SplitTime(int64_t t, int64_t& h, int64_t& m, int64_t& s) {
+  h = t / 3600;
+  m = (t - 3600 * h) / 60;
+  s = t - 3600 * h - 60 * m;
+}
+
+/// Year, month or day (0, 1, 2) of the seconds, and hour, minute or second; missing when there are none.
+double DatePart(double seconds, int part) {
+  if (!IsMoment(seconds)) return NumericValue::gSysmisValue;
+  int64_t parts[3];
+  DateTimeValue::ExtractDate(seconds, parts[0], parts[1], parts[2]);
+  return static_cast<double>(parts[part]);
+}
+double TimePart(double seconds, int part) {
+  if (!IsMoment(seconds)) return NumericValue::gSysmisValue;
+  int64_t parts[3];
+  DateTimeValue::ExtractTime(seconds, parts[0], parts[1], parts[2]);
+  return static_cast<double>(parts[part]);
+}
+
+/// A duration in seconds in a longer unit; a missing one stays missing.
+double InUnits(double seconds, double unit) {
+  return NumericValue::IsSystemMissingValue(seconds) ? seconds : seconds / unit;
 }
 
 int64_t DaysSince1970(int64_t y, int64_t m, int64_t d) {
@@ -120,25 +163,21 @@ int DateTimeValue::GetInt() const {
 }
 
 std::string DateTimeValue::GetString() const {
-  if (IsSystemMissingValue()) return "Undefined";
+  if (!IsMoment(seconds_)) return "Undefined";
   int64_t y = 0, mon = 0, d = 0, h = 0, min = 0, s = 0;
-  // The day that has begun, other than ExtractDate's: date and time must read back to the same seconds.
-  const int64_t whole = WholeSeconds(std::floor(seconds_));
-  Calendar::DateOfDays(whole / fSeconds_Per_Day - (whole % fSeconds_Per_Day < 0 ? 1 : 0), y, mon, d);
-  ExtractTime(std::floor(seconds_), h, min, s);
-  char date[48], time[48];
+  // Rounded downwards, unlike the extraction of a date, so that the text of a time before 1970 reads back.
+  const int64_t seconds = WholeSeconds(std::floor(seconds_));
+  const int64_t t = SecondsOfDay(seconds);
+  SplitTime(t, h, min, s);
+  Calendar::DateOfDays((seconds - t) / fSeconds_Per_Day, y, mon, d);
+  char date[48], time[16];
   std::snprintf(date, sizeof date, "%s%04lld-%02d-%02d", y < 0 ? "-" : "",
                 static_cast<long long>(y < 0 ? -y : y), static_cast<int>(mon), static_cast<int>(d));
   std::snprintf(time, sizeof time, "%02d:%02d:%02d", static_cast<int>(h), static_cast<int>(min),
                 static_cast<int>(s));
-  switch (kind_) {
-    case kDateVal:
-      return date;
-    case kTimeVal:
-      return time;
-    default:
-      return std::string(date) + "T" + time;
-  }
+  if (kind_ == kDateVal) return date;
+  if (kind_ == kTimeVal) return time;
+  return std::string(date) + "T" + time;
 }
 
 void DateTimeValue::SetDateTimeValue(double seconds, DateTimeValType kind) {
@@ -191,48 +230,28 @@ void DateTimeValue::FromString(const std::string& text, DateTimeType type) {
 }
 
 double DateTimeValue::ExtractYear() const {
-  int64_t y = 0, m = 0, d = 0;
-  ExtractDate(seconds_, y, m, d);
-  return IsSystemMissingValue() ? seconds_ : static_cast<double>(y);
+  return DatePart(seconds_, 0);
 }
 double DateTimeValue::ExtractMonth() const {
-  int64_t y = 0, m = 0, d = 0;
-  ExtractDate(seconds_, y, m, d);
-  return IsSystemMissingValue() ? seconds_ : static_cast<double>(m);
+  return DatePart(seconds_, 1);
 }
 double DateTimeValue::ExtractDay() const {
-  int64_t y = 0, m = 0, d = 0;
-  ExtractDate(seconds_, y, m, d);
-  return IsSystemMissingValue() ? seconds_ : static_cast<double>(d);
+  return DatePart(seconds_, 2);
 }
 double DateTimeValue::ExtractHour() const {
-  int64_t h = 0, m = 0, s = 0;
-  ExtractTime(seconds_, h, m, s);
-  return IsSystemMissingValue() ? seconds_ : static_cast<double>(h);
+  return TimePart(seconds_, 0);
 }
 double DateTimeValue::ExtractMinute() const {
-  int64_t h = 0, m = 0, s = 0;
-  ExtractTime(seconds_, h, m, s);
-  return IsSystemMissingValue() ? seconds_ : static_cast<double>(m);
+  return TimePart(seconds_, 1);
 }
 double DateTimeValue::ExtractSecond() const {
-  int64_t h = 0, m = 0, s = 0;
-  ExtractTime(seconds_, h, m, s);
-  return IsSystemMissingValue() ? seconds_ : static_cast<double>(s);
+  return TimePart(seconds_, 2);
 }
 
 double DateTimeValue::ComputeDurationSeconds(const DateTimeValue& other) const {
-  return IsSystemMissingValue() || other.IsSystemMissingValue() ? NumericValue::gSysmisValue
-                                                                : seconds_ - other.seconds_;
+  if (!IsMoment(seconds_) || !IsMoment(other.seconds_)) return NumericValue::gSysmisValue;
+  return seconds_ - other.seconds_;
 }
-
-namespace {
-/// A duration in seconds in a longer unit; a missing one stays missing.
-double InUnits(double seconds, double unit) {
-  return NumericValue::IsSystemMissingValue(seconds) ? seconds : seconds / unit;
-}
-}  // namespace
-
 double DateTimeValue::ComputeDurationMinutes(const DateTimeValue& other) const {
   return InUnits(ComputeDurationSeconds(other), 60.0);
 }
@@ -297,11 +316,7 @@ void DateTimeValue::ExtractDate(double seconds, int64_t& y, int64_t& m, int64_t&
 }
 
 void DateTimeValue::ExtractTime(double seconds, int64_t& h, int64_t& m, int64_t& s) {
-  int64_t t = WholeSeconds(seconds) % fSeconds_Per_Day;
-  if (t < 0) t += fSeconds_Per_Day;
-  h = t / 3600;
-  m = (t - 3600 * h) / 60;
-  s = t - 3600 * h - 60 * m;
+  SplitTime(SecondsOfDay(WholeSeconds(seconds)), h, m, s);
 }
 
 std::string DateTimeValue::TrimString(const std::string& text, char c) {
@@ -313,7 +328,7 @@ std::string DateTimeValue::TrimString(const std::string& text, char c) {
 bool DateTimeValue::ParseDate(const std::string& text, int64_t& y, int64_t& m, int64_t& d) {
   if (text.empty()) return true;
   int64_t numbers[3];
-  if (!ReadThree(text, '-', numbers) || !IsValidDate(numbers[0], numbers[1], numbers[2])) return false;
+  if (!ReadDate(text, numbers)) return false;
   y = numbers[0];
   m = numbers[1];
   d = numbers[2];
@@ -323,7 +338,7 @@ bool DateTimeValue::ParseDate(const std::string& text, int64_t& y, int64_t& m, i
 bool DateTimeValue::ParseTime(const std::string& text, int64_t& h, int64_t& m, int64_t& s) {
   if (text.empty()) return true;
   int64_t numbers[3];
-  if (!ReadThree(text, ':', numbers) || !IsValidTime(numbers[0], numbers[1], numbers[2])) return false;
+  if (!ReadTime(text, numbers)) return false;
   h = numbers[0];
   m = numbers[1];
   s = numbers[2];
@@ -336,9 +351,18 @@ bool DateTimeValue::ParseDateTime(const std::string& text, int64_t& y, int64_t& 
   if (text.empty()) return true;
   const size_t split = text.find('T');
   if (split == std::string::npos) return false;
-  const std::string date = text.substr(0, split), time = text.substr(split + 1);
-  // An empty half is no half.
-  return !date.empty() && !time.empty() && ParseDate(date, y, mon, d) && ParseTime(time, h, min, s);
+  const std::string_view date = std::string_view(text).substr(0, split);
+  const std::string_view time = std::string_view(text).substr(split + 1);
+  // Unlike a whole text, a half must not be empty: "T01:00:00" has no day to count from.
+  int64_t day[3], clock[3];
+  if (!ReadDate(date, day) || !ReadTime(time, clock)) return false;
+  y = day[0];
+  mon = day[1];
+  d = day[2];
+  h = clock[0];
+  min = clock[1];
+  s = clock[2];
+  return true;
 }
 
 bool DateTimeValue::ParseDouble(const std::string& text, double& number) {
