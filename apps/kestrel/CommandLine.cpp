@@ -3,6 +3,7 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <map>
+#include <memory>
 #include <sstream>
 
 #include "apps/kestrel/CheckCommand.h"
@@ -34,6 +35,16 @@ constexpr const char* kScoreHelp =
     "A case without prediction has empty cells (null in jsonl). A name that a kept column has already gets "
     "\"_2\"\n"
     "behind it. A file that is written appears when it is complete, not before.\n";
+
+/// Shows an option that may have a value behind "=" as such; the parser's own way shows its stand-in for no
+/// value.
+class HelpFormatter : public CLI::Formatter {
+ public:
+  std::string make_option_name(const CLI::Option* option, bool is_positional) const override {
+    return option->check_name("--keep") ? "--keep[=NAME,...]"
+                                        : CLI::Formatter::make_option_name(option, is_positional);
+  }
+};
 
 /// What the options of all commands are read into.
 struct Values {
@@ -73,7 +84,9 @@ TableWriter::Format FormatOf(const Values& values) {
 }
 
 void AddModel(CLI::App& command, Values& values) {
-  command.add_option("MODEL", values.model, "The model's document; - for the standard input")->required();
+  command.add_option("MODEL", values.model, "The model's document; - for the standard input")
+      ->required()
+      ->type_name("FILE");
   command
       .add_option("--models", values.names_file,
                   "A file with the model elements to look for, instead of all that PMML has")
@@ -81,7 +94,8 @@ void AddModel(CLI::App& command, Values& values) {
 }
 
 void AddTable(CLI::App& command, Values& values) {
-  command.add_option("DATA", values.data, "The table; - or nothing for the standard input");
+  command.add_option("DATA", values.data, "The table; - or nothing for the standard input")
+      ->type_name("FILE");
   command.add_option("-o,--output", values.output, "The file to write; - or nothing for the standard output")
       ->type_name("FILE");
   command
@@ -105,11 +119,12 @@ void AddScore(CLI::App& program, Values& values) {
       "--keep{*}", values.keep,
       "Copy the table's columns beside the predictions: all with --keep, some with --keep=NAME,NAME");
   command
-      .add_option("--missing", values.missing,
-                  "Texts that stand for a missing value, beside the empty cell: NA,?")
+      .add_option(
+          "--missing", values.missing,
+          "Texts that stand for a missing value beside the empty cell, with commas between them: NA,?")
       ->delimiter(',')
       ->allow_extra_args(false)
-      ->type_name("TEXT,...");
+      ->type_name("TEXT");
   command
       .add_option(
           "--on-error", values.on_error,
@@ -173,6 +188,7 @@ ExitCode Run(const CLI::App& program, const Values& values) {
 ExitCode RunCommandLine(const std::vector<std::string>& arguments) {
   Values values;
   CLI::App program("Scores predictive models (PMML documents).", "kestrel");
+  program.formatter(std::make_shared<HelpFormatter>());
   AddScore(program, values);
   AddDescribe(program, values);
   AddCheck(program, values);

@@ -181,7 +181,7 @@ class ScoreRun {
     for (const ScoreDictVar* variable : predictors_) {
       const int slot = cases_.GetRecord().GetIndex(variable->GetName());
       if (!variable->IsMissingValue(cases_.GetRecord().Get(slot)) || ++count > kMost) continue;
-      list += (count == 1 ? " because values are missing: " : ", ") + ShownText(variable->GetName());
+      list += (count == 1 ? "; missing are " : ", ") + ShownText(variable->GetName());
     }
     return count > kMost ? list + ", ..." : list;
   }
