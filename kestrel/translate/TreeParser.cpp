@@ -14,6 +14,9 @@ namespace MCKestrel_800 {
 
 namespace {
 
+// 16 are usual at the greatest number of names.
+constexpr unsigned kMaxNamesInBucket = 256;
+
 bool IsWhitespace(const XMLCh* text, XMLSize_t length) {
   for (XMLSize_t i = 0; i < length; ++i) {
     const XMLCh c = text[i];
@@ -99,7 +102,13 @@ void TreeParser::NoteLastElement() {
 }
 
 void TreeParser::CountName(const XMLCh* pooledName) {
-  if (names_.Add(pooledName) > limits_.maxNames) throw LimitReached();
+  const size_t before = names_.GetCount();
+  const size_t count = names_.Add(pooledName);
+  if (count == before) return;
+  // Names chosen to fall into one of the parser's buckets make every look-up walk past all of them.
+  const bool isCrowded =
+      ++namesInBucket_[xercesc::XMLString::hash(pooledName, kNameBuckets)] > kMaxNamesInBucket;
+  if (isCrowded || count > limits_.maxNames) throw LimitReached();
 }
 
 void TreeParser::startElement(const xercesc::XMLElementDecl& declaration, const unsigned int uriId,

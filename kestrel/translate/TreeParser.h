@@ -102,7 +102,9 @@ class TreeParser final : public xercesc::XercesDOMParser {
   class NameCounter {
    public:
     NameCounter() : slots_(256, nullptr) {}
+    /// Returns the number of names, this one included.
     size_t Add(const XMLCh* pooledName);
+    size_t GetCount() const { return count_; }
 
    private:
     void Grow();
@@ -123,6 +125,8 @@ class TreeParser final : public xercesc::XercesDOMParser {
   // Whitespace that is only worth a node if text follows, or if the element turns out to hold nothing else.
   std::u16string pendingWhitespace_;
   NameCounter names_;
+  static constexpr size_t kNameBuckets = 257;  // of the document's own table of names
+  unsigned namesInBucket_[kNameBuckets] = {};
   bool entityRefused_ = false;
   XMLFileLoc elementLine_ = 0;
   XMLFileLoc elementColumn_ = 0;

@@ -53,6 +53,25 @@ inline std::string NumberedElements(size_t count) {
   return result + "</PMML>";
 }
 
+/// Names that fall into one bucket of the parser's table (its hash is the text read as digits to the base
+/// 38), so that each look-up costs as much as there are names.
+inline std::string CollidingNames(size_t names, size_t elements) {
+  std::vector<std::string> tags;
+  for (unsigned long number = 0; tags.size() < names; ++number) {
+    std::string tag;
+    unsigned long hash = 0;
+    for (unsigned long rest = number, i = 0; i < 6; ++i, rest /= 26)
+      tag += static_cast<char>('a' + rest % 26);
+    for (const char c : tag)
+      hash = hash * 38 + (hash >> 24) + static_cast<unsigned char>(c);
+    if (hash % 257 == 7) tags.push_back("<" + tag + "/>");
+  }
+  std::string result = "<PMML>";
+  for (size_t i = 0; i < elements; ++i)
+    result += tags[i % names];
+  return result + "</PMML>";
+}
+
 inline std::string NumberedAttributes(size_t count) {
   std::string result = "<PMML";
   for (size_t i = 0; i < count; ++i)
@@ -100,6 +119,7 @@ inline std::vector<HostileDocument> Bombs() {
       {"100,000 attributes", NumberedAttributes(100000)},
       {"4,097 names", NumberedElements(4096)},
       {"100,000 names", NumberedElements(100000)},
+      {"4,000 names that collide, on 1,000,000 elements", CollidingNames(4000, 1000000)},
   };
 }
 
