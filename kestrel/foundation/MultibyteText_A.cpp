@@ -36,14 +36,15 @@ class CodePageScheme {
     return Step::Without(at, 1, true);
   }
 
+  /// Asks the converter, which waits for more after a lead byte. Its own table of them (ucnv_getStarters) is
+  /// copied whole for each question, and not every converter has one.
   bool IsLead(unsigned char byte) {
-    if (!startersKnown_) {
-      UErrorCode status = U_ZERO_ERROR;
-      ucnv_getStarters(converter_, starters_, &status);
-      if (U_FAILURE(status)) std::fill(std::begin(starters_), std::end(starters_), false);  // it has no table
-      startersKnown_ = true;
-    }
-    return starters_[byte];
+    ucnv_resetToUnicode(converter_);
+    const char text = static_cast<char>(byte);
+    const char* next = &text;
+    UErrorCode status = U_ZERO_ERROR;
+    ucnv_getNextUChar(converter_, &next, &text + 1, &status);
+    return status == U_TRUNCATED_CHAR_FOUND;
   }
 
   size_t SafePoint(const char* text, size_t, size_t index) {
@@ -78,8 +79,6 @@ class CodePageScheme {
   UConverter* converter_;
   UConverterToUCallback action_ = nullptr;
   const void* context_ = nullptr;
-  UBool starters_[256];
-  bool startersKnown_ = false;
 };
 
 /// Calls `operation` with the walk through the converter's kind of text.
