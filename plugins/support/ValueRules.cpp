@@ -72,7 +72,9 @@ void ValueRules::CompileLabels() {
     if (code < 0) code = position;
     ++position;
     if (type_ == ScoreDictVar::STRING_VAR ? !IsText(value) : !IsNumber(value)) compiled_ = false;
-    if (type_ != ScoreDictVar::STRING_VAR && (IsNumber(value) || IsDate(value))) {
+    // Numbers and dates are never equal, so a numeric variable finds no date.
+    if (type_ != ScoreDictVar::STRING_VAR &&
+        (IsNumber(value) || (IsDate(value) && type_ != ScoreDictVar::kNUMERIC_VAR))) {
       labelled_.Add(value->GetDouble(), code);
       if (lists_categories_) numbers_.Add(value->GetDouble(), code);
     } else if (type_ == ScoreDictVar::STRING_VAR && value != nullptr) {
