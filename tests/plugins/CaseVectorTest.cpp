@@ -32,10 +32,13 @@ class Inputs {
       : dictionary_(kestrel_test::ReadDictionary(kestrel_test::DictionaryOf(
             11, std::string(kestrel_tests::TestFields()) +
                     "<DataField name=\"u\" optype=\"continuous\" dataType=\"double\"><Value value=\"9\" "
-                    "property=\"missing\"/><Interval closure=\"closedClosed\" leftMargin=\"0\" rightMargin=\"100\"/>"
-                    "</DataField><DataField name=\"d\" optype=\"continuous\" dataType=\"dateDaysSince[1970]\"/>"))),
+                    "property=\"missing\"/><Interval closure=\"closedClosed\" leftMargin=\"0\" "
+                    "rightMargin=\"100\"/>"
+                    "</DataField><DataField name=\"d\" optype=\"continuous\" "
+                    "dataType=\"dateDaysSince[1970]\"/>"))),
         schema_(MiningSchema::Read(
-            kestrel_test::ReadTree("<MiningSchema>" + fields + "</MiningSchema>")->GetRoot(), dictionary_.get())) {}
+            kestrel_test::ReadTree("<MiningSchema>" + fields + "</MiningSchema>")->GetRoot(),
+            dictionary_.get())) {}
 
   const MiningField& Field(const std::string& name) const { return *schema_.Find(name); }
 
@@ -66,20 +69,26 @@ TEST(CaseVector, TreatsValuesAsTheSchemaSays) {
       {"replaced where empty", "x", "missingValueReplacement='4'", kNumber, {}, kOk, 4.0},
       {"present, so not replaced", "x", "missingValueReplacement='4'", kNumber, 0.0, kOk, 0.0},
       {"refused when missing", "x", "missingValueTreatment='returnInvalid'", kNumber, kSysmis, kRefused, 0},
-      {"refused in spite of a replacement", "x",
-       "missingValueTreatment='returnInvalid' missingValueReplacement='4'", kNumber, {}, kRefused, 0},
+      {"refused in spite of a replacement",
+       "x",
+       "missingValueTreatment='returnInvalid' missingValueReplacement='4'",
+       kNumber,
+       {},
+       kRefused,
+       0},
       {"a text is invalid", "x", "", kNumber, "1.5", kRefused, 0},
-      {"an invalid text as missing", "x", "invalidValueTreatment='asMissing'", kNumber, "1.5", kNoNumber, kSysmis},
+      {"an invalid text as missing", "x", "invalidValueTreatment='asMissing'", kNumber, "1.5", kNoNumber,
+       kSysmis},
       {"an invalid text as missing, replaced", "x",
        "invalidValueTreatment='asMissing' missingValueReplacement='4'", kNumber, "q", kOk, 4.0},
-      {"an invalid text as a value", "x", "invalidValueTreatment='asValue' invalidValueReplacement='6'", kNumber, "q",
-       kOk, 6.0},
+      {"an invalid text as a value", "x", "invalidValueTreatment='asValue' invalidValueReplacement='6'",
+       kNumber, "q", kOk, 6.0},
       {"a missing number is not an invalid one", "x",
        "invalidValueTreatment='asValue' invalidValueReplacement='6'", kNumber, kSysmis, kNoNumber, kSysmis},
       {"an invalid text as it is", "x", "invalidValueTreatment='asIs'", kNumber, "1.5", kOk, 1.5},
       {"no number in it", "x", "invalidValueTreatment='asIs'", kNumber, "1.5x", kNoNumber, kSysmis},
-      {"no number in it, replaced", "x", "invalidValueTreatment='asIs' missingValueReplacement='4'", kNumber, "",
-       kOk, 4.0},
+      {"no number in it, replaced", "x", "invalidValueTreatment='asIs' missingValueReplacement='4'", kNumber,
+       "", kOk, 4.0},
       // User-missing numbers and intervals
       {"user-missing", "u", "", kNumber, 9.0, kNoNumber, kSysmis},
       {"user-missing, replaced", "u", "missingValueReplacement='4'", kNumber, 9.0, kOk, 4.0},
@@ -87,25 +96,36 @@ TEST(CaseVector, TreatsValuesAsTheSchemaSays) {
       {"on the margin", "u", "", kNumber, 100.0, kOk, 100.0},
       // Outliers
       {"an outlier as it is", "x", "outliers='asIs' lowValue='0' highValue='10'", kNumber, 11.0, kOk, 11.0},
-      {"above, as extreme", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber, 11.0, kOk, 10.0},
-      {"below, as extreme", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber, -1.0, kOk, 0.0},
-      {"on the margin", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber, 10.0, kOk, 10.0},
+      {"above, as extreme", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber, 11.0, kOk,
+       10.0},
+      {"below, as extreme", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber, -1.0, kOk,
+       0.0},
+      {"on the margin", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber, 10.0, kOk,
+       10.0},
       {"inside", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber, 5.0, kOk, 5.0},
       {"one margin alone", "x", "outliers='asExtremeValues' highValue='10'", kNumber, -1e9, kOk, -1e9},
-      {"above, as missing", "x", "outliers='asMissingValues' lowValue='0' highValue='10'", kNumber, 11.0, kNoNumber,
-       kSysmis},
+      {"above, as missing", "x", "outliers='asMissingValues' lowValue='0' highValue='10'", kNumber, 11.0,
+       kNoNumber, kSysmis},
       {"above, as missing, replaced", "x",
-       "outliers='asMissingValues' lowValue='0' highValue='10' missingValueReplacement='50'", kNumber, 11.0, kOk, 50},
+       "outliers='asMissingValues' lowValue='0' highValue='10' missingValueReplacement='50'", kNumber, 11.0,
+       kOk, 50},
       {"above, as missing, refused", "x",
-       "outliers='asMissingValues' highValue='10' missingValueTreatment='returnInvalid'", kNumber, 11.0, kRefused, 0},
-      {"a missing number is no outlier", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'", kNumber,
-       kSysmis, kNoNumber, kSysmis},
-      {"a replacement is no outlier", "x",
-       "outliers='asExtremeValues' lowValue='0' highValue='10' missingValueReplacement='50'", kNumber, {}, kOk, 50},
+       "outliers='asMissingValues' highValue='10' missingValueTreatment='returnInvalid'", kNumber, 11.0,
+       kRefused, 0},
+      {"a missing number is no outlier", "x", "outliers='asExtremeValues' lowValue='0' highValue='10'",
+       kNumber, kSysmis, kNoNumber, kSysmis},
+      {"a replacement is no outlier",
+       "x",
+       "outliers='asExtremeValues' lowValue='0' highValue='10' missingValueReplacement='50'",
+       kNumber,
+       {},
+       kOk,
+       50},
       {"a value used as it is is no outlier", "x",
-       "outliers='asExtremeValues' lowValue='0' highValue='10' invalidValueTreatment='asIs'", kNumber, "50", kOk, 50},
-      {"categories have no outliers", "n", "outliers='asExtremeValues' lowValue='0' highValue='2'", kNumber, 3.0, kOk,
-       3.0},
+       "outliers='asExtremeValues' lowValue='0' highValue='10' invalidValueTreatment='asIs'", kNumber, "50",
+       kOk, 50},
+      {"categories have no outliers", "n", "outliers='asExtremeValues' lowValue='0' highValue='2'", kNumber,
+       3.0, kOk, 3.0},
       // Coded categories as numbers
       {"a listed number", "n", "", kNumber, 2.0, kOk, 2.0},
       {"a number that is not listed", "n", "", kNumber, 4.0, kRefused, 0},
@@ -118,7 +138,8 @@ TEST(CaseVector, TreatsValuesAsTheSchemaSays) {
       {"a missing code, replaced", "n", "missingValueReplacement='3'", kCategory, {}, kOk, 2.0},
       {"an unknown code", "n", "", kCategory, 4.0, kRefused, 0},
       {"an unknown code as it is", "n", "invalidValueTreatment='asIs'", kCategory, 4.0, kOk, kOther},
-      {"an outlier's margin as category", "x", "outliers='asExtremeValues' highValue='2'", kCategory, 7.0, kOk, 0.0},
+      {"an outlier's margin as category", "x", "outliers='asExtremeValues' highValue='2'", kCategory, 7.0,
+       kOk, 0.0},
       // Texts
       {"a category", "g", "", kCategory, "b", kOk, 1.0},
       {"with trailing blanks", "g", "", kCategory, "c  ", kOk, 2.0},
@@ -129,12 +150,13 @@ TEST(CaseVector, TreatsValuesAsTheSchemaSays) {
       {"refused when missing", "g", "missingValueTreatment='returnInvalid'", kCategory, {}, kRefused, 0},
       {"an unknown category", "g", "", kCategory, "q", kRefused, 0},
       {"case counts", "g", "", kCategory, "B", kRefused, 0},
-      {"an unknown category as missing", "g", "invalidValueTreatment='asMissing'", kCategory, "q", kOk, kMissing},
+      {"an unknown category as missing", "g", "invalidValueTreatment='asMissing'", kCategory, "q", kOk,
+       kMissing},
       {"an unknown category as missing, replaced", "g",
        "invalidValueTreatment='asMissing' missingValueReplacement='a'", kCategory, "q", kOk, 0.0},
       {"an unknown category as it is", "g", "invalidValueTreatment='asIs'", kCategory, "q", kOk, kOther},
-      {"an unknown category as a value", "g",
-       "invalidValueTreatment='asValue' invalidValueReplacement='b'", kCategory, "q", kOk, 1.0},
+      {"an unknown category as a value", "g", "invalidValueTreatment='asValue' invalidValueReplacement='b'",
+       kCategory, "q", kOk, 1.0},
       {"a number in place of a text", "g", "", kCategory, 1.0, kRefused, 0},
       {"a field without list takes every text", "t", "", kCategory, "q", kOk, kOther},
       {"the empty one, too", "t", "missingValueReplacement='a'", kCategory, "", kOk, kOther},
@@ -143,7 +165,8 @@ TEST(CaseVector, TreatsValuesAsTheSchemaSays) {
   for (const auto& row : kRows) {
     SCOPED_TRACE(std::string(row.name) + ": " + row.why);
     std::string attributes = row.attributes;
-    for (char& c : attributes) c = c == '\'' ? '"' : c;
+    for (char& c : attributes)
+      c = c == '\'' ? '"' : c;
     Inputs inputs("<MiningField name=\"" + row.name + "\" " + attributes + "/>");
     const MiningField& field = inputs.Field(row.name);
     CaseVector& vector = inputs.vector;
@@ -181,8 +204,9 @@ TEST(CaseVector, AnInputAskedForTwiceIsOneSlot) {
 }
 
 TEST(CaseVector, RecordsOfAnyLayoutWork) {
-  Inputs inputs("<MiningField name=\"x\"/><MiningField name=\"g\"/><MiningField name=\"z\" "
-                "missingValueReplacement=\"8\"/>");
+  Inputs inputs(
+      "<MiningField name=\"x\"/><MiningField name=\"g\"/><MiningField name=\"z\" "
+      "missingValueReplacement=\"8\"/>");
   CaseVector& vector = inputs.vector;
   const int x = vector.AddNumber(inputs.Field("x"));
   const int g = vector.AddCategory(inputs.Field("g"));
@@ -234,8 +258,9 @@ TEST(CaseVector, RecordsWithoutStampAreLookedUpEachTime) {
 }
 
 TEST(CaseVector, DatesCountInTheirFieldsUnit) {
-  Inputs inputs("<MiningField name=\"d\" outliers=\"asExtremeValues\" highValue=\"100\" "
-                "missingValueReplacement=\"3\"/>");
+  Inputs inputs(
+      "<MiningField name=\"d\" outliers=\"asExtremeValues\" highValue=\"100\" "
+      "missingValueReplacement=\"3\"/>");
   const int d = inputs.vector.AddNumber(inputs.Field("d"));
   inputs.vector.Seal();
   CaseRecord record;

@@ -54,7 +54,8 @@ TEST(LinkFunctions, ExtremeArgumentsGiveTheLimits) {
 }
 
 TEST(LinkFunctions, OtherMethodsHaveNone) {
-  for (const Normalization method : {Normalization::kSoftmax, Normalization::kSimplemax, Normalization::kExp}) {
+  for (const Normalization method :
+       {Normalization::kSoftmax, Normalization::kSimplemax, Normalization::kExp}) {
     EXPECT_FALSE(IsCumulative(method));
     EXPECT_TRUE(std::isnan(LinkBelow(method, 1.0)));
     EXPECT_TRUE(std::isnan(LinkAbove(method, 1.0)));
@@ -64,7 +65,8 @@ TEST(LinkFunctions, OtherMethodsHaveNone) {
 
 TEST(Normalization, NamesAreExact) {
   Normalization method = Normalization::kExp;
-  for (const char* text : {"none", "simplemax", "softmax", "logit", "probit", "cloglog", "exp", "loglog", "cauchit"}) {
+  for (const char* text :
+       {"none", "simplemax", "softmax", "logit", "probit", "cloglog", "exp", "loglog", "cauchit"}) {
     ASSERT_TRUE(FindNormalization(text, method)) << text;
     EXPECT_STREQ(NormalizationText(method), text);
   }

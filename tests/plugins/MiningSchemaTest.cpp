@@ -28,7 +28,8 @@ TEST(MiningSchema, ReadsEveryAttribute) {
   const auto dictionary = TestDictionary();
   const MiningSchema schema = ReadSchema(
       "<Extension name=\"a\"><MiningField name=\"nothing\"/></Extension>"
-      "<MiningField name=\"x\" importance=\"0.5\" outliers=\"asExtremeValues\" lowValue=\"-1\" highValue=\"1e3\""
+      "<MiningField name=\"x\" importance=\"0.5\" outliers=\"asExtremeValues\" lowValue=\"-1\" "
+      "highValue=\"1e3\""
       " missingValueReplacement=\"2.5\" missingValueTreatment=\"asMean\" invalidValueTreatment=\"asValue\""
       " invalidValueReplacement=\"7\"><Extension/></MiningField>"
       "<MiningField name=\"g\" usageType=\"supplementary\" missingValueReplacement=\"b\"/>",
@@ -67,10 +68,14 @@ TEST(MiningSchema, UsageTypesBecomeRoles) {
     const char* usage;
     ScoreModel::VarRole role;
   } kRows[] = {
-      {"active", ScoreModel::kPredictor},          {"predicted", ScoreModel::kTarget},
-      {"target", ScoreModel::kTarget},             {"supplementary", ScoreModel::kSupplementary},
-      {"order", ScoreModel::kOrder},               {"group", ScoreModel::kGroup},
-      {"frequencyWeight", ScoreModel::kFrequencyWeight}, {"analysisWeight", ScoreModel::kAnalysisWeight},
+      {"active", ScoreModel::kPredictor},
+      {"predicted", ScoreModel::kTarget},
+      {"target", ScoreModel::kTarget},
+      {"supplementary", ScoreModel::kSupplementary},
+      {"order", ScoreModel::kOrder},
+      {"group", ScoreModel::kGroup},
+      {"frequencyWeight", ScoreModel::kFrequencyWeight},
+      {"analysisWeight", ScoreModel::kAnalysisWeight},
   };
   for (const auto& row : kRows) {
     const auto dictionary = TestDictionary();
@@ -91,9 +96,10 @@ TEST(MiningSchema, MissingTreatmentMattersOnlyAsReturnInvalid) {
 
 TEST(MiningSchema, OptypeReplacesTheLevelInThisDictionary) {
   const auto dictionary = TestDictionary();
-  ReadSchema("<MiningField name=\"n\" optype=\"continuous\"/><MiningField name=\"x\" optype=\"categorical\"/>"
-             "<MiningField name=\"g\" optype=\"ordinal\"/>",
-             *dictionary);
+  ReadSchema(
+      "<MiningField name=\"n\" optype=\"continuous\"/><MiningField name=\"x\" optype=\"categorical\"/>"
+      "<MiningField name=\"g\" optype=\"ordinal\"/>",
+      *dictionary);
   EXPECT_EQ(dictionary->GetVar("n")->GetMLevel(), ScoreDictVar::kContinuous);
   EXPECT_EQ(dictionary->GetVar("x")->GetMLevel(), ScoreDictVar::kNominal);
   EXPECT_NE(dictionary->GetVar("x")->GetEncoder(), nullptr);

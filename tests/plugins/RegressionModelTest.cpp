@@ -51,80 +51,173 @@ TEST(RegressionModel, SumsItsTerms) {
   } kRows[] = {
       {"an intercept alone", "<RegressionTable intercept='2.5'/>", {}, 2.5},
       {"nothing at all", "<RegressionTable/>", {}, 0.0},
-      {"the intercept is 0 when absent", "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
-       {{"x", 3.0}}, 6.0},
-      {"two numbers", "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
-       "<NumericPredictor name='z' coefficient='-0.5'/></RegressionTable>", {{"x", 3.0}, {"z", 8.0}}, 3.0},
-      {"one number twice", "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
-       "<NumericPredictor name='x' exponent='2' coefficient='3'/></RegressionTable>", {{"x", -2.0}}, 9.0},
-      {"six numbers in a row", "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='1'/>"
+      {"the intercept is 0 when absent",
+       "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
+       {{"x", 3.0}},
+       6.0},
+      {"two numbers",
+       "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
+       "<NumericPredictor name='z' coefficient='-0.5'/></RegressionTable>",
+       {{"x", 3.0}, {"z", 8.0}},
+       3.0},
+      {"one number twice",
+       "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
+       "<NumericPredictor name='x' exponent='2' coefficient='3'/></RegressionTable>",
+       {{"x", -2.0}},
+       9.0},
+      {"six numbers in a row",
+       "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='1'/>"
        "<NumericPredictor name='z' coefficient='10'/><NumericPredictor name='n' coefficient='100'/>"
        "<NumericPredictor name='x' coefficient='1000'/><NumericPredictor name='z' coefficient='10000'/>"
-       "<NumericPredictor name='n' coefficient='100000'/></RegressionTable>", {{"x", 1.0}, {"z", 2.0}, {"n", 3.0}},
+       "<NumericPredictor name='n' coefficient='100000'/></RegressionTable>",
+       {{"x", 1.0}, {"z", 2.0}, {"n", 3.0}},
        1 + 1 + 20 + 300 + 1000 + 20000 + 300000},
-      {"cube of a negative base", "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='2'/>"
-       "</RegressionTable>", {{"x", -2.0}}, -16.0},
-      {"a large exponent", "<RegressionTable><NumericPredictor name='x' exponent='2000' coefficient='1'/>"
-       "</RegressionTable>", {{"x", -1.0}}, 1.0},
-      {"exponent 0 is 1 for every base", "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='2'/>"
-       "</RegressionTable>", {{"x", 0.0}}, 2.0},
-      {"a negative exponent", "<RegressionTable><NumericPredictor name='x' exponent='-2' coefficient='2'/>"
-       "</RegressionTable>", {{"x", 4.0}}, 0.125},
-      {"zero to a negative power has no value", "<RegressionTable><NumericPredictor name='x' exponent='-2' "
-       "coefficient='2'/></RegressionTable>", {{"x", 0.0}}, none},
-      {"a broken exponent", "<RegressionTable><NumericPredictor name='x' exponent='0.5' coefficient='2'/>"
-       "</RegressionTable>", {{"x", 2.25}}, 3.0},
-      {"a broken exponent of a negative base has no value", "<RegressionTable><NumericPredictor name='x' "
-       "exponent='0.5' coefficient='2'/></RegressionTable>", {{"x", -1.0}}, none},
-      {"overflow has no value", "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='1'/>"
-       "</RegressionTable>", {{"x", 1e200}}, none},
-      {"a number that is none has no value", "<RegressionTable><NumericPredictor name='x' coefficient='1'/>"
-       "</RegressionTable>", {{"x", std::nan("")}}, none},
-      {"a category", "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' coefficient='2'/>"
-       "<CategoricalPredictor name='g' value='b' coefficient='4'/></RegressionTable>", {{"g", "b  "}}, 5.0},
-      {"a category without coefficient", "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
+      {"cube of a negative base",
+       "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='2'/>"
+       "</RegressionTable>",
+       {{"x", -2.0}},
+       -16.0},
+      {"a large exponent",
+       "<RegressionTable><NumericPredictor name='x' exponent='2000' coefficient='1'/>"
+       "</RegressionTable>",
+       {{"x", -1.0}},
+       1.0},
+      {"exponent 0 is 1 for every base",
+       "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='2'/>"
+       "</RegressionTable>",
+       {{"x", 0.0}},
+       2.0},
+      {"a negative exponent",
+       "<RegressionTable><NumericPredictor name='x' exponent='-2' coefficient='2'/>"
+       "</RegressionTable>",
+       {{"x", 4.0}},
+       0.125},
+      {"zero to a negative power has no value",
+       "<RegressionTable><NumericPredictor name='x' exponent='-2' "
+       "coefficient='2'/></RegressionTable>",
+       {{"x", 0.0}},
+       none},
+      {"a broken exponent",
+       "<RegressionTable><NumericPredictor name='x' exponent='0.5' coefficient='2'/>"
+       "</RegressionTable>",
+       {{"x", 2.25}},
+       3.0},
+      {"a broken exponent of a negative base has no value",
+       "<RegressionTable><NumericPredictor name='x' "
+       "exponent='0.5' coefficient='2'/></RegressionTable>",
+       {{"x", -1.0}},
+       none},
+      {"overflow has no value",
+       "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='1'/>"
+       "</RegressionTable>",
+       {{"x", 1e200}},
+       none},
+      {"a number that is none has no value",
+       "<RegressionTable><NumericPredictor name='x' coefficient='1'/>"
+       "</RegressionTable>",
+       {{"x", std::nan("")}},
+       none},
+      {"a category",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' coefficient='2'/>"
+       "<CategoricalPredictor name='g' value='b' coefficient='4'/></RegressionTable>",
+       {{"g", "b  "}},
+       5.0},
+      {"a category without coefficient",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
        "coefficient='2'/><CategoricalPredictor name='g' value='b' coefficient='4'/></RegressionTable>",
-       {{"g", "c"}}, 1.0},
-      {"a missing category adds nothing", "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
-       "coefficient='2'/></RegressionTable>", {{"g", {}}}, 1.0},
-      {"a category given twice counts twice", "<RegressionTable intercept='1'><CategoricalPredictor name='g' "
-       "value='a' coefficient='2'/><CategoricalPredictor name='g' value='a' coefficient='3'/></RegressionTable>",
-       {{"g", "a"}}, 6.0},
-      {"a coded category", "<RegressionTable><CategoricalPredictor name='n' value='3' coefficient='7'/>"
-       "<CategoricalPredictor name='n' value='1' coefficient='5'/></RegressionTable>", {{"n", 3.0}}, 7.0},
-      {"a code and a number of one field", "<RegressionTable><NumericPredictor name='n' coefficient='10'/>"
-       "<CategoricalPredictor name='n' value='2' coefficient='5'/></RegressionTable>", {{"n", 2.0}}, 25.0},
-      {"a value of a continuous field", "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='0.5' "
-       "coefficient='5'/></RegressionTable>", {{"x", 0.5}}, 6.0},
-      {"a value that no case can have", "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='1e999' "
-       "coefficient='5'/></RegressionTable>", {{"x", 0.5}}, 1.0},
-      {"a text without list", "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
-       "coefficient='5'/></RegressionTable>", {{"t", "p"}}, 6.0},
-      {"another text without list", "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
-       "coefficient='5'/></RegressionTable>", {{"t", "q"}}, 1.0},
-      {"fields by turns", "<RegressionTable><CategoricalPredictor name='g' value='a' coefficient='1'/>"
+       {{"g", "c"}},
+       1.0},
+      {"a missing category adds nothing",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
+       "coefficient='2'/></RegressionTable>",
+       {{"g", {}}},
+       1.0},
+      {"a category given twice counts twice",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='g' "
+       "value='a' coefficient='2'/><CategoricalPredictor name='g' value='a' "
+       "coefficient='3'/></RegressionTable>",
+       {{"g", "a"}},
+       6.0},
+      {"a coded category",
+       "<RegressionTable><CategoricalPredictor name='n' value='3' coefficient='7'/>"
+       "<CategoricalPredictor name='n' value='1' coefficient='5'/></RegressionTable>",
+       {{"n", 3.0}},
+       7.0},
+      {"a code and a number of one field",
+       "<RegressionTable><NumericPredictor name='n' coefficient='10'/>"
+       "<CategoricalPredictor name='n' value='2' coefficient='5'/></RegressionTable>",
+       {{"n", 2.0}},
+       25.0},
+      {"a value of a continuous field",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='0.5' "
+       "coefficient='5'/></RegressionTable>",
+       {{"x", 0.5}},
+       6.0},
+      {"a value that no case can have",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='1e999' "
+       "coefficient='5'/></RegressionTable>",
+       {{"x", 0.5}},
+       1.0},
+      {"a text without list",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
+       "coefficient='5'/></RegressionTable>",
+       {{"t", "p"}},
+       6.0},
+      {"another text without list",
+       "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
+       "coefficient='5'/></RegressionTable>",
+       {{"t", "q"}},
+       1.0},
+      {"fields by turns",
+       "<RegressionTable><CategoricalPredictor name='g' value='a' coefficient='1'/>"
        "<CategoricalPredictor name='n' value='1' coefficient='2'/><CategoricalPredictor name='g' value='b' "
        "coefficient='4'/><CategoricalPredictor name='n' value='2' coefficient='8'/></RegressionTable>",
-       {{"g", "b"}, {"n", 1.0}}, 6.0},
-      {"a product", "<RegressionTable intercept='1'><PredictorTerm coefficient='2'><FieldRef field='x'/>"
-       "<FieldRef field='z'/><FieldRef field='x'/></PredictorTerm></RegressionTable>", {{"x", 3.0}, {"z", 5.0}}, 91.0},
-      {"a product of one", "<RegressionTable><PredictorTerm name='p' coefficient='2'><FieldRef field='n'/>"
-       "</PredictorTerm></RegressionTable>", {{"n", 3.0}}, 6.0},
-      {"a missing factor", "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x'/></PredictorTerm>"
-       "</RegressionTable>", {{"x", kSysmis}}, none},
-      {"a missing factor with a value for it", "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x' "
-       "mapMissingTo='4'/></PredictorTerm></RegressionTable>", {{"x", kSysmis}}, 8.0},
-      {"a missing number", "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
-       {{"x", kSysmis}}, none},
-      {"with coefficient 0, too", "<RegressionTable><NumericPredictor name='x' coefficient='0'/></RegressionTable>",
-       {{"x", {}}}, none},
-      {"with exponent 0, too", "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='1'/>"
-       "</RegressionTable>", {{"x", {}}}, none},
-      {"what no term names may be missing", "<RegressionTable><NumericPredictor name='x' coefficient='2'/>"
-       "</RegressionTable>", {{"x", 1.0}, {"z", kSysmis}, {"g", "no category"}}, 2.0},
-      {"extensions everywhere", "<RegressionTable intercept='1'><Extension/><NumericPredictor name='x' "
+       {{"g", "b"}, {"n", 1.0}},
+       6.0},
+      {"a product",
+       "<RegressionTable intercept='1'><PredictorTerm coefficient='2'><FieldRef field='x'/>"
+       "<FieldRef field='z'/><FieldRef field='x'/></PredictorTerm></RegressionTable>",
+       {{"x", 3.0}, {"z", 5.0}},
+       91.0},
+      {"a product of one",
+       "<RegressionTable><PredictorTerm name='p' coefficient='2'><FieldRef field='n'/>"
+       "</PredictorTerm></RegressionTable>",
+       {{"n", 3.0}},
+       6.0},
+      {"a missing factor",
+       "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x'/></PredictorTerm>"
+       "</RegressionTable>",
+       {{"x", kSysmis}},
+       none},
+      {"a missing factor with a value for it",
+       "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x' "
+       "mapMissingTo='4'/></PredictorTerm></RegressionTable>",
+       {{"x", kSysmis}},
+       8.0},
+      {"a missing number",
+       "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
+       {{"x", kSysmis}},
+       none},
+      {"with coefficient 0, too",
+       "<RegressionTable><NumericPredictor name='x' coefficient='0'/></RegressionTable>",
+       {{"x", {}}},
+       none},
+      {"with exponent 0, too",
+       "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='1'/>"
+       "</RegressionTable>",
+       {{"x", {}}},
+       none},
+      {"what no term names may be missing",
+       "<RegressionTable><NumericPredictor name='x' coefficient='2'/>"
+       "</RegressionTable>",
+       {{"x", 1.0}, {"z", kSysmis}, {"g", "no category"}},
+       2.0},
+      {"extensions everywhere",
+       "<RegressionTable intercept='1'><Extension/><NumericPredictor name='x' "
        "coefficient='2'><Extension/></NumericPredictor><PredictorTerm coefficient='3'><Extension/>"
-       "<FieldRef field='x'><Extension/></FieldRef></PredictorTerm></RegressionTable>", {{"x", 1.0}}, 6.0},
+       "<FieldRef field='x'><Extension/></FieldRef></PredictorTerm></RegressionTable>",
+       {{"x", 1.0}},
+       6.0},
   };
   for (const auto& row : kRows) {
     SCOPED_TRACE(row.why);
@@ -139,9 +232,11 @@ TEST(RegressionModel, SumsItsTerms) {
 }
 
 TEST(RegressionModel, AddsInDocumentOrder) {
-  const auto model = Regression("", "<RegressionTable intercept='1e16'><NumericPredictor name='x' coefficient='1'/>"
-                                    "<CategoricalPredictor name='g' value='a' coefficient='1'/>"
-                                    "<NumericPredictor name='z' coefficient='-1e16'/></RegressionTable>");
+  const auto model =
+      Regression("",
+                 "<RegressionTable intercept='1e16'><NumericPredictor name='x' coefficient='1'/>"
+                 "<CategoricalPredictor name='g' value='a' coefficient='1'/>"
+                 "<NumericPredictor name='z' coefficient='-1e16'/></RegressionTable>");
   // Each 1 is lost against 1e16 when it is added there, and not when it is added elsewhere.
   EXPECT_EQ(Predict(*model, {{"x", 1.0}, {"z", 1.0}, {"g", "a"}}), ((1e16 + 1.0) + 1.0) - 1e16);
 }
@@ -151,18 +246,19 @@ TEST(RegressionModel, ManyCategoriesTakeNoMoreThanTheirTerms) {
   std::string few, many;
   for (int i = 0; i < 3000; ++i) {
     fields += "<Value value=\"v" + std::to_string(i) + "\"/>";
-    const std::string term = "<CategoricalPredictor name='c' value='v" + std::to_string(i) + "' coefficient='" +
-                             std::to_string(i) + "'/>";
+    const std::string term = "<CategoricalPredictor name='c' value='v" + std::to_string(i) +
+                             "' coefficient='" + std::to_string(i) + "'/>";
     // In turns with another field: each stands alone.
     many += term + "<NumericPredictor name='x' coefficient='0'/>";
     if (i % 1000 == 7) few += term;
   }
   fields += "</DataField><DataField name=\"x\" optype=\"continuous\" dataType=\"double\"/>";
   for (const std::string& terms : {few, many}) {
-    const auto model = BuildModel("<PMML>" + kestrel_test::DictionaryOf(2, fields) +
-                                  "<RegressionModel functionName='regression'><MiningSchema><MiningField name='c'/>"
-                                  "<MiningField name='x'/></MiningSchema><RegressionTable intercept='0.5'>" + terms +
-                                  "</RegressionTable></RegressionModel></PMML>");
+    const auto model =
+        BuildModel("<PMML>" + kestrel_test::DictionaryOf(2, fields) +
+                   "<RegressionModel functionName='regression'><MiningSchema><MiningField name='c'/>"
+                   "<MiningField name='x'/></MiningSchema><RegressionTable intercept='0.5'>" +
+                   terms + "</RegressionTable></RegressionModel></PMML>");
     EXPECT_EQ(Predict(*model, {{"c", "v1007"}, {"x", 1.0}}), 1007.5);
     EXPECT_EQ(Predict(*model, {{"c", {}}, {"x", 1.0}}), 0.5);
   }
@@ -184,18 +280,21 @@ TEST(RegressionModel, NormalizesRegressions) {
       {"cauchit", 0.7048327646991335},
   };
   for (const auto& row : kRows) {
-    const auto model = Regression(std::string("normalizationMethod='") + row.method + "'",
-                                  "<RegressionTable intercept='0.25'><NumericPredictor name='x' coefficient='0.5'/>"
-                                  "</RegressionTable>");
+    const auto model =
+        Regression(std::string("normalizationMethod='") + row.method + "'",
+                   "<RegressionTable intercept='0.25'><NumericPredictor name='x' coefficient='0.5'/>"
+                   "</RegressionTable>");
     EXPECT_NEAR(Predict(*model, {{"x", 1.0}}), row.expected, 1e-12 * row.expected) << row.method;
   }
-  const auto growing = Regression("normalizationMethod='exp'",
-                                  "<RegressionTable><NumericPredictor name='x' coefficient='1'/></RegressionTable>");
+  const auto growing =
+      Regression("normalizationMethod='exp'",
+                 "<RegressionTable><NumericPredictor name='x' coefficient='1'/></RegressionTable>");
   EXPECT_TRUE(std::isnan(Predict(*growing, {{"x", 800.0}}))) << "overflow has no value";
 }
 
 TEST(RegressionModel, MissingResultsFollowThePolicy) {
-  const auto model = Regression("", "<RegressionTable><NumericPredictor name='x' coefficient='1'/></RegressionTable>");
+  const auto model =
+      Regression("", "<RegressionTable><NumericPredictor name='x' coefficient='1'/></RegressionTable>");
   const CaseRecord record = RecordOf({{"x", kSysmis}});
   RegResult result;
   for (const ScoreModel::MVPolicy policy : {ScoreModel::kNullPrediction, ScoreModel::kDefaultPrediction}) {
@@ -216,8 +315,10 @@ TEST(RegressionModel, MissingResultsFollowThePolicy) {
 }
 
 TEST(RegressionModel, RefusedValuesGiveAnErrorAndNoPrediction) {
-  const auto model = Regression("", "<RegressionTable><NumericPredictor name='x' coefficient='1'/>"
-                                    "<CategoricalPredictor name='g' value='a' coefficient='1'/></RegressionTable>");
+  const auto model =
+      Regression("",
+                 "<RegressionTable><NumericPredictor name='x' coefficient='1'/>"
+                 "<CategoricalPredictor name='g' value='a' coefficient='1'/></RegressionTable>");
   RegResult result;
   const NumericValue before(1.0);
   result.SetPrediction(&before);
@@ -241,15 +342,15 @@ TEST(RegressionModel, RefusedValuesGiveAnErrorAndNoPrediction) {
 }
 
 TEST(RegressionModel, TellsWhatItIs) {
-  const auto model =
-      BuildModel(DocumentOf("<RegressionModel functionName='regression' modelType='linearRegression' "
-                            "normalizationMethod='exp'><Extension/><MiningSchema><MiningField name='t' "
-                            "usageType='supplementary'/><MiningField name='z'/><MiningField name='g'/><MiningField "
-                            "name='x'/><MiningField name='y' usageType='predicted'/></MiningSchema><LocalTransformations/>"
-                            "<RegressionTable intercept='1.5'><NumericPredictor name='x' exponent='2' "
-                            "coefficient='0.1234567'/><NumericPredictor name='x' coefficient='3'/><CategoricalPredictor "
-                            "name='g' value='b' coefficient='-2'/><PredictorTerm coefficient='4'><FieldRef field='z'/>"
-                            "<FieldRef field='x'/></PredictorTerm></RegressionTable></RegressionModel>"));
+  const auto model = BuildModel(DocumentOf(
+      "<RegressionModel functionName='regression' modelType='linearRegression' "
+      "normalizationMethod='exp'><Extension/><MiningSchema><MiningField name='t' "
+      "usageType='supplementary'/><MiningField name='z'/><MiningField name='g'/><MiningField "
+      "name='x'/><MiningField name='y' usageType='predicted'/></MiningSchema><LocalTransformations/>"
+      "<RegressionTable intercept='1.5'><NumericPredictor name='x' exponent='2' "
+      "coefficient='0.1234567'/><NumericPredictor name='x' coefficient='3'/><CategoricalPredictor "
+      "name='g' value='b' coefficient='-2'/><PredictorTerm coefficient='4'><FieldRef field='z'/>"
+      "<FieldRef field='x'/></PredictorTerm></RegressionTable></RegressionModel>"));
   EXPECT_EQ(model->GetModelKind(), "RegressionModel");
   EXPECT_FALSE(model->SuppressCategoryProbabilities());
   ASSERT_EQ(model->GetPredictors().size(), 3u);
@@ -288,9 +389,11 @@ TEST(RegressionModel, TargetFieldNameServesWhereTheSchemaNamesNone) {
   model = BuildModel(DocumentOf(ModelOf("functionName='regression'", "", table)));
   EXPECT_EQ(model->GetTargetVar(), nullptr);
   EXPECT_EQ(Predict(*model, {}), 1.0) << "no target is needed for a number";
-  model = BuildModel(DocumentOf("<RegressionModel functionName='regression' targetFieldName='x'><MiningSchema>"
-                                "<MiningField name='x' usageType='target'/><MiningField name='y' usageType='target'/>"
-                                "</MiningSchema>" + table + "</RegressionModel>"));
+  model = BuildModel(
+      DocumentOf("<RegressionModel functionName='regression' targetFieldName='x'><MiningSchema>"
+                 "<MiningField name='x' usageType='target'/><MiningField name='y' usageType='target'/>"
+                 "</MiningSchema>" +
+                 table + "</RegressionModel>"));
   EXPECT_EQ(model->GetTargetVar()->GetName(), "x") << "chosen among several";
 }
 

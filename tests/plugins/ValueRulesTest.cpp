@@ -40,8 +40,8 @@ class Chance {
   }
 
   std::string Text() {
-    constexpr const char* kPool[] = {"", "a", "b", " a", "ab", "a longer text than eight", "a longer text than nine",
-                                     "1", "\xC3\xA4"};
+    constexpr const char* kPool[] = {
+        "", "a", "b", " a", "ab", "a longer text than eight", "a longer text than nine", "1", "\xC3\xA4"};
     std::string text = kPool[Below(static_cast<int>(std::size(kPool)))];
     if (OneIn(3)) text.append(static_cast<size_t>(1 + Below(3)), ' ');
     return text;
@@ -79,7 +79,8 @@ class Chance {
       if (kind == 0) range = std::make_unique<Range>(Value(variable).release());
       if (kind == 1) range = std::make_unique<Range>(Number(), Number(), OneIn(2), OneIn(2));
       if (kind == 2) {
-        range = std::make_unique<Range>(Value(variable).release(), Value(variable).release(), OneIn(2), OneIn(2));
+        range =
+            std::make_unique<Range>(Value(variable).release(), Value(variable).release(), OneIn(2), OneIn(2));
       }
       if (kind == 3) range = std::make_unique<Range>(nullptr, new NumericValue(Number()), OneIn(2), OneIn(2));
       if (missing->Add(range.get())) range.release();
@@ -103,7 +104,8 @@ class Chance {
 };
 
 std::string Describe(const ScoreDictVar& variable, const ScoreValue& value) {
-  std::string text = "value of type " + std::to_string(value.GetType()) + ": \"" + value.GetString() + "\"; variable ";
+  std::string text =
+      "value of type " + std::to_string(value.GetType()) + ": \"" + value.GetString() + "\"; variable ";
   text += std::to_string(variable.GetVarType()) + ", level " + std::to_string(variable.GetMLevel());
   if (variable.GetValueLabels() != nullptr) {
     for (const ScoreValueLabel* label : variable.GetValueLabels()->GetAllValueLabels()) {
@@ -115,7 +117,8 @@ std::string Describe(const ScoreDictVar& variable, const ScoreValue& value) {
 
 /// The first category that the value matches, both of the variable's own kind; null when there is none.
 const ScoreValue* FirstLabelOf(const ScoreDictVar& variable, const ScoreValue& value) {
-  if (variable.GetMLevel() == ScoreDictVar::kContinuous || variable.GetValueLabels() == nullptr) return nullptr;
+  if (variable.GetMLevel() == ScoreDictVar::kContinuous || variable.GetValueLabels() == nullptr)
+    return nullptr;
   for (const ScoreValueLabel* label : variable.GetValueLabels()->GetAllValueLabels()) {
     const ScoreValue* listed = label->GetValue();
     const bool is_match = variable.GetVarType() == ScoreDictVar::STRING_VAR
@@ -153,7 +156,8 @@ TEST(ValueRules, SayWhatTheVariableSays) {
           << Describe(*variable, *value) << ", round " << round;
     }
   }
-  for (const int count : seen) EXPECT_GT(count, 5000);
+  for (const int count : seen)
+    EXPECT_GT(count, 5000);
   EXPECT_GT(codes_seen, 5000);
 }
 
@@ -196,17 +200,21 @@ TEST(ValueRules, AListOfCategoriesTakesNoMore) {
 TEST(TextCodes, FindsEachOfManyTexts) {
   TextCodes codes(false);
   EXPECT_EQ(codes.Find("anything"), TextCodes::kUnknown);
-  for (int i = 0; i < 20000; ++i) EXPECT_EQ(codes.Add("category " + std::to_string(i * 7), i), i);
-  for (int i = 0; i < 20000; ++i) ASSERT_EQ(codes.Find("category " + std::to_string(i * 7) + " "), i);
+  for (int i = 0; i < 20000; ++i)
+    EXPECT_EQ(codes.Add("category " + std::to_string(i * 7), i), i);
+  for (int i = 0; i < 20000; ++i)
+    ASSERT_EQ(codes.Find("category " + std::to_string(i * 7) + " "), i);
   EXPECT_EQ(codes.Find("category 1"), TextCodes::kUnknown);
   EXPECT_EQ(codes.Find(std::string("category 0\0", 11)), TextCodes::kUnknown);
 }
 
 TEST(NumberCodes, FindsEachOfManyNumbers) {
   NumberCodes codes;
-  for (int i = 0; i < 20000; ++i) EXPECT_EQ(codes.Add((i * 7919) % 20011, i), i);
+  for (int i = 0; i < 20000; ++i)
+    EXPECT_EQ(codes.Add((i * 7919) % 20011, i), i);
   codes.Seal();
-  for (int i = 0; i < 20000; ++i) ASSERT_EQ(codes.Find((i * 7919) % 20011), i);
+  for (int i = 0; i < 20000; ++i)
+    ASSERT_EQ(codes.Find((i * 7919) % 20011), i);
   EXPECT_EQ(codes.Find(0.5), NumberCodes::kUnknown);
 }
 
