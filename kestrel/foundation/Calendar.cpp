@@ -11,8 +11,15 @@ int64_t Cut(int64_t x) {
   return std::clamp(x, -kFarthest, kFarthest);
 }
 
+/// Rounded downwards; b is positive.
 int64_t FloorDivide(int64_t a, int64_t b) {
   return a / b - (a % b < 0 ? 1 : 0);
+}
+
+/// What FloorDivide leaves: never negative.
+int64_t FloorRemainder(int64_t a, int64_t b) {
+  const int64_t rest = a % b;
+  return rest < 0 ? rest + b : rest;
 }
 
 /// Leap years before the year, counted from the year 1 and downwards below it.
@@ -53,13 +60,13 @@ int64_t DaysBetweenYear(int64_t a, int64_t b) {
 
 void DateOfDays(int64_t days, int64_t& year, int64_t& month, int64_t& day) {
   const int64_t J = Cut(days) + kJan_1_1970_JulianDay;
-  const int64_t f = J + 1401 + (((4 * J + 274277) / 146097) * 3) / 4 - 38;
+  const int64_t f = J + 1401 + FloorDivide(FloorDivide(4 * J + 274277, 146097) * 3, 4) - 38;
   const int64_t e = 4 * f + 3;
-  const int64_t g = (e % 1461) / 4;
+  const int64_t g = FloorRemainder(e, 1461) / 4;
   const int64_t h = 5 * g + 2;
   day = (h % 153) / 5 + 1;
   month = (h / 153 + 2) % 12 + 1;
-  year = e / 1461 - 4716 + (14 - month) / 12;
+  year = FloorDivide(e, 1461) - 4716 + (14 - month) / 12;
 }
 
 }  // namespace Calendar

@@ -14,8 +14,8 @@ namespace Calendar {
 constexpr int64_t kJan_1_1970_JulianDay = 2440588;
 constexpr int64_t kSeconds_Per_Day = 86400;
 /// By month, 1 to 12, of a common year.
-constexpr int64_t kDaysInMonth[] = {0, 31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
-constexpr int64_t kDaysBeforeMonth[] = {0, 0, 31, 59, 90, 120, 151, 181, 212, 243, 273, 304, 334};
+inline constexpr int64_t kDaysInMonth[13] = {0, 31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
+inline constexpr int64_t kDaysBeforeMonth[13] = {0, 0, 31, 59, 90, 120, 151, 181, 212, 243, 273, 304, 334};
 /// Years and days beyond this are cut to it, so that no calculation overflows.
 constexpr int64_t kFarthest = 1'000'000'000'000'000;
 
@@ -30,8 +30,9 @@ KESTREL_API int64_t NumberOfLeapYear(int64_t a, int64_t b);
 KESTREL_API int64_t DaysBetweenYear(int64_t a, int64_t b);
 
 /// The date of a number of days since 1970, by Richards' method for Julian day numbers (E. G. Richards, in
-/// Explanatory Supplement to the Astronomical Almanac, 3rd edition, 2013, chapter 15), all divisions
-/// integral.
+/// Explanatory Supplement to the Astronomical Almanac, 3rd edition, 2013, chapter 15). Its divisions are
+/// integral and round downwards, so that it holds before the year -4716 as well, where the dividends turn
+/// negative.
 KESTREL_API void DateOfDays(int64_t days, int64_t& year, int64_t& month, int64_t& day);
 
 }  // namespace Calendar

@@ -22,6 +22,7 @@ class KESTREL_API DateTimeValue : public ScoreValue {
   static constexpr int64_t fSeconds_Per_Day = Calendar::kSeconds_Per_Day;
   /// By month, 1 to 12, of a common year; index 0 holds 0.
   static constexpr const int64_t (&fDaysInMonth)[13] = Calendar::kDaysInMonth;
+  /// Days of a common year before the month.
   static constexpr const int64_t (&fDaysBeforeMonth)[13] = Calendar::kDaysBeforeMonth;
 
   /// An undefined date with a time.
@@ -54,7 +55,8 @@ class KESTREL_API DateTimeValue : public ScoreValue {
   int GetInt() const override;
   /// The seconds.
   double GetDouble() const override { return seconds_; }
-  /// ISO 8601 (1970-01-02, 01:02:03, or both joined by "T"); "Undefined" when undefined.
+  /// ISO 8601 (1970-01-02, 01:02:03, or both joined by "T"), which FromString reads back from the year 0 on;
+  /// fractions of a second are cut off downwards. "Undefined" when undefined, infinite or no number.
   std::string GetString() const override;
   ValueType GetType() const override { return ScoreValue::kDateTime; }
 
@@ -76,8 +78,9 @@ class KESTREL_API DateTimeValue : public ScoreValue {
   void FromNumeric(double number, DateTimeType type);
   void FromString(const std::string& text, DateTimeType type);
 
-  /// Components; system-missing when undefined. Days are cut toward zero, so the seconds before 1970 count as
-  /// that day, while the time of day always counts upwards.
+  /// Components; system-missing when undefined, infinite or no number. Days are cut toward zero, so the day
+  /// before 1970 counts as 1 January but for its first second, while the time of day always counts upwards.
+  /// Beyond 9e18 seconds all dates are one.
   double ExtractYear() const;
   double ExtractMonth() const;
   double ExtractDay() const;
@@ -85,8 +88,8 @@ class KESTREL_API DateTimeValue : public ScoreValue {
   double ExtractMinute() const;
   double ExtractSecond() const;
 
-  /// This value minus the other; system-missing when either is undefined. A month is 30.4375 days, a year
-  /// 365.25.
+  /// This value minus the other; system-missing when either is undefined, infinite or no number. A month
+  /// is 30.4375 days, a year 365.25.
   double ComputeDurationSeconds(const DateTimeValue& other) const;
   double ComputeDurationMinutes(const DateTimeValue& other) const;
   double ComputeDurationHours(const DateTimeValue& other) const;
@@ -106,7 +109,8 @@ class KESTREL_API DateTimeValue : public ScoreValue {
   static int64_t DaysBetweenYear(int64_t a, int64_t b) { return Calendar::DaysBetweenYear(a, b); }
   static bool IsValidDate(int64_t y, int64_t m, int64_t d);
   static bool IsValidTime(int64_t h, int64_t m, int64_t s);
-  /// Whether the text is a date/time of the type.
+  /// Whether the text parses as a date/time of the type. The empty text does for dates and times, although it
+  /// leaves a value undefined, and does not for numbers.
   static bool IsValidDateTime(const std::string& text, DateTimeType type);
   /// Date and time of day of seconds since 1970. Undefined seconds and no number count as 0.
   static void ExtractDate(double seconds, int64_t& y, int64_t& m, int64_t& d);
@@ -119,7 +123,7 @@ class KESTREL_API DateTimeValue : public ScoreValue {
   /// nothing.
   static bool ParseDate(const std::string& text, int64_t& y, int64_t& m, int64_t& d);
   static bool ParseTime(const std::string& text, int64_t& h, int64_t& m, int64_t& s);
-  /// Date and time split at the first "T". An empty text is accepted with all fields 0.
+  /// Date and time split at the first "T". An empty text is accepted; all fields are 0 then, and on failure.
   static bool ParseDateTime(const std::string& text, int64_t& y, int64_t& mon, int64_t& d, int64_t& h,
                             int64_t& min, int64_t& s);
   /// Reads a number as NumericValue does; false when the text holds none.

@@ -10,8 +10,10 @@ namespace {
 bool IsDigit(char c) {
   return c >= '0' && c <= '9';
 }
-bool IsSpace(char c) {
-  return c == ' ' || (c >= '\t' && c <= '\r');
+const char* SkipSpace(const char* at, const char* end) {
+  while (at != end && (*at == ' ' || (*at >= '\t' && *at <= '\r')))
+    ++at;
+  return at;
 }
 
 /// Whether a number that a double cannot hold is too large, rather than too small: its first digit that is
@@ -56,11 +58,9 @@ bool ParseDouble(const char* first, const char* last, double& out) {
   return true;
 }
 
-bool ReadDouble(std::string_view text, double& out, bool* tooLarge) {
-  const char* at = text.data();
-  const char* const end = at + text.size();
-  while (at != end && IsSpace(*at))
-    ++at;
+bool ReadDouble(std::string_view text, double& out) {
+  const char* const end = text.data() + text.size();
+  const char* at = SkipSpace(text.data(), end);
   // What a stream takes as belonging to the number, whether or not it turns out to be one.
   const char* const first = at;
   if (at != end && (*at == '-' || *at == '+')) ++at;
@@ -80,12 +80,24 @@ bool ReadDouble(std::string_view text, double& out, bool* tooLarge) {
     while (at != end && IsDigit(*at))
       ++at;
   }
-  double value = 0.0;
-  if (!ParseDouble(first, at, value)) return false;
-  out = value;
-  if (value - value == 0.0) return true;
-  if (tooLarge != nullptr) *tooLarge = true;
+  out = 0.0;
+  if (!ParseDouble(first, at, out)) return false;
+  constexpr double kLargest = std::numeric_limits<double>::max();
+  if (out >= -kLargest && out <= kLargest) return true;
+  out = out > 0.0 ? kLargest : -kLargest;
   return false;
+}
+
+bool StartsWithInfinity(std::string_view text) {
+  const char* const end = text.data() + text.size();
+  const char* at = SkipSpace(text.data(), end);
+  if (at != end && *at == '+') ++at;
+  // from_chars takes no plus sign, but a minus sign, and knows infinity by the names that atof knows.
+  if (at == end || *at == '-') return false;
+  double value = 0.0;
+  const std::from_chars_result read = std::from_chars(at, end, value);
+  if (read.ec == std::errc::result_out_of_range) return IsTooLarge(at, read.ptr);
+  return read.ec == std::errc() && value == std::numeric_limits<double>::infinity();
 }
 
 size_t FormatSixDigits(double value, char (&buffer)[kSixDigitsRoom]) {

@@ -16,10 +16,17 @@ namespace MCKestrel_800 {
 /// becomes an infinity or zero.
 KESTREL_API bool ParseDouble(const char* first, const char* last, double& out);
 
-/// Reads a number from the start of the text as a standard stream with the classic locale does: leading white
-/// space is skipped and what follows the number is ignored. False when there is no number (`out` is
-/// unchanged) or it is too large (`out` is an infinity of its sign, and `tooLarge`, when given, is set).
-KESTREL_API bool ReadDouble(std::string_view text, double& out, bool* tooLarge = nullptr);
+/// Reads a number from the start of the text as a standard input stream with the classic locale does, at a
+/// fraction of its cost: leading white space is skipped and what follows the number is ignored. Neither names
+/// ("inf", "nan") nor hexadecimal digits are read, and what is too small for a double is zero. False, with
+/// what a stream leaves in `out`, when there is no number (0.0) or it is too large (the largest finite number
+/// of its sign).
+KESTREL_API bool ReadDouble(std::string_view text, double& out);
+
+/// Whether the number at the start of the text, as the C library's atof reads it, is positive infinity: by
+/// its name ("inf", "Infinity", whatever follows) or because it is too large. Hexadecimal digits are not
+/// read.
+KESTREL_API bool StartsWithInfinity(std::string_view text);
 
 /// Room for every text that FormatSixDigits writes.
 constexpr size_t kSixDigitsRoom = 32;

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <string_view>
 
 #include "kestrel/foundation/NumberText.h"
 
@@ -12,29 +11,15 @@ namespace {
 
 constexpr double kOrderTolerance = 1e-14;
 
-/// The other's number, when it is one and neither side is missing.
+/// Whether both sides are numbers and neither is missing.
 bool Comparable(const NumericValue& value, const ScoreValue& other) {
   return other.GetType() == ScoreValue::kNumeric && !value.IsSystemMissingValue() &&
          !other.IsSystemMissingValue();
 }
 
-/// Whether the text, after white space and a plus sign, starts with a name of infinity.
-bool NamesInfinity(std::string_view text) {
-  size_t at = 0;
-  while (at < text.size() && (text[at] == ' ' || (text[at] >= '\t' && text[at] <= '\r')))
-    ++at;
-  if (at < text.size() && text[at] == '+') ++at;
-  constexpr std::string_view kName = "inf";
-  if (text.size() - at < kName.size()) return false;
-  for (size_t i = 0; i < kName.size(); ++i) {
-    const char c = text[at + i];
-    if ((c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c) != kName[i]) return false;
-  }
-  return true;
-}
-
 }  // namespace
 
+// The constructor is constexpr, so this stands before any initialiser of another source can read it.
 const NumericValue NumericValue::SYSMIS;
 
 NumericValue::NumericValue(const std::string& text) {
@@ -85,14 +70,7 @@ std::string NumericValue::GetString() const {
 }
 
 void NumericValue::FromString(const std::string& text) {
-  value_ = gSysmisValue;
-  double number = 0.0;
-  bool tooLarge = false;
-  if (ReadDouble(text, number, &tooLarge)) {
-    value_ = number;
-  } else if (NamesInfinity(text) || (tooLarge && number > 0.0)) {
-    value_ = gInfinity;
-  }
+  if (!ReadDouble(text, value_)) value_ = StartsWithInfinity(text) ? gInfinity : gSysmisValue;
 }
 
 bool NumericValue::IsEqual(double a, double b) {

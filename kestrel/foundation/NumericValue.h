@@ -24,8 +24,8 @@ class KESTREL_API NumericValue : public ScoreValue {
   static const NumericValue SYSMIS;
 
   /// System-missing.
-  NumericValue() = default;
-  explicit NumericValue(double value) : value_(value) {}
+  constexpr NumericValue() noexcept = default;
+  constexpr explicit NumericValue(double value) noexcept : value_(value) {}
   /// Reads the text through FromString.
   explicit NumericValue(const std::string& text);
   NumericValue(const NumericValue& other) = default;
@@ -56,15 +56,16 @@ class KESTREL_API NumericValue : public ScoreValue {
   ValueType GetType() const override { return kNumeric; }
 
   void SetDoubleValue(double value) { value_ = value; }
-  /// Reads a number from the start of the text. System-missing when there is none; infinite when it is too
-  /// large.
+  /// Reads a number from the start of the text as ReadDouble does. Positive infinity when it is too large or
+  /// named ("inf"); system-missing when there is no number or it is too large below zero.
   void FromString(const std::string& text);
 
-  static double GetSysmisValue() { return gSysmisValue; }
-  static double GetInfinity() { return gInfinity; }
-  static bool IsSystemMissingValue(double v) { return v == gSysmisValue; }
+  static constexpr double GetSysmisValue() { return gSysmisValue; }
+  static constexpr double GetInfinity() { return gInfinity; }
+  static constexpr bool IsSystemMissingValue(double v) { return v == gSysmisValue; }
   /// Whether two numbers count as equal: |a - b| < max(|a|, |b|) * fEpsilon, or both 0, or both
-  /// system-missing. An infinity equals nothing, itself included.
+  /// system-missing. An infinity equals nothing, itself included, and so do numbers below 1e-310 but 0, whose
+  /// tolerance is 0.
   static bool IsEqual(double a, double b);
 
  private:

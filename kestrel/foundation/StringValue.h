@@ -43,7 +43,8 @@ class KESTREL_API StringValue : public ScoreValue {
   bool IsSystemMissingValue() const override { return false; }
   /// The integer that the text starts with, 0 when there is none; what int cannot hold is clamped.
   int GetInt() const override;
-  /// The number that the text starts with, with a decimal point whatever the locale; 0.0 when there is none.
+  /// The number that the text starts with, as a stream with the classic locale leaves it: with a decimal
+  /// point whatever the locale, 0.0 when there is none, the largest finite number when it is too large.
   double GetDouble() const override;
   std::string GetString() const override { return text_; }
   ValueType GetType() const override { return kString; }

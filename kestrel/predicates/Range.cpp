@@ -14,7 +14,7 @@ bool IsNumber(const ScoreValue* value) {
   return value != nullptr && value->GetType() == ScoreValue::kNumeric;
 }
 
-/// A minimum for which no number is known has none: it reaches down to minus infinity.
+/// A minimum that is missing bounds nothing: the range reaches down to minus infinity.
 void UnboundBelow(ScoreValue* min) {
   if (IsNumber(min) && min->IsSystemMissingValue()) {
     const NumericValue lowest(-NumericValue::gInfinity);
@@ -81,6 +81,8 @@ Range::Range(ScoreValue* value)
   NoteMin();
   NoteMax();
   single_ = true;
+  // A single date is found by its seconds as well.
+  if (min_->GetType() == ScoreValue::kDateTime) min_number_ = max_number_ = min_->GetDouble();
 }
 
 Range::Range(const Range& other)
@@ -99,8 +101,7 @@ Range& Range::operator=(const Range& other) {
   if (this == &other) return *this;
   std::unique_ptr<ScoreValue> min(CloneOf(other.min_));
   std::unique_ptr<ScoreValue> max(CloneOf(other.max_));
-  delete min_;
-  delete max_;
+  DeleteEnds();
   min_ = min.release();
   max_ = max.release();
   high_included_ = other.high_included_;
@@ -112,8 +113,13 @@ Range& Range::operator=(const Range& other) {
 }
 
 Range::~Range() {
+  DeleteEnds();
+}
+
+void Range::DeleteEnds() {
+  // The setters may have been given one object for both ends.
+  if (max_ != min_) delete max_;
   delete min_;
-  delete max_;
 }
 
 void Range::NoteMin() {

@@ -14,7 +14,8 @@ namespace MCKestrel_800 {
 ///
 /// An end that is included holds whatever NumericValue::IsEqual calls equal to it; the inside is strict. A
 /// range whose ends are equal holds that value alone, whatever its flags, by the value's own equality; other
-/// ranges hold numbers only, and never the system-missing one.
+/// ranges hold numbers only, and never the system-missing one. Since an infinity equals nothing, a range that
+/// is open to it differs from every other, its own clone included.
 ///
 /// Threads: a finished range may be asked from several threads.
 class KESTREL_API Range : public ScoreValueRange {
@@ -33,9 +34,11 @@ class KESTREL_API Range : public ScoreValueRange {
   /// Both ends and both flags are equal.
   bool operator==(const ScoreValueRange& other) const override;
   ScoreValueRange* Clone() const override;
-  /// Null is ignored; a system-missing number becomes minus infinity.
+  /// Null is ignored; a system-missing number becomes minus infinity. A value that is no number leaves the
+  /// end that numbers are tested against as it was.
   void SetMin(ScoreValue* value) override;
-  /// Null takes the upper end away; then the range's numbers keep the end they had.
+  /// Null takes the upper end away; the end that numbers are tested against stays as it was then, and for a
+  /// value that is no number. Unlike a minimum, a system-missing maximum is kept.
   void SetMax(ScoreValue* value) override;
   bool IsInRange(double x) const override;
   bool IsInRange(const ScoreValue* value) const override;
@@ -50,6 +53,7 @@ class KESTREL_API Range : public ScoreValueRange {
   void NoteMin();
   void NoteMax();
   void NoteSingle();
+  void DeleteEnds();
 
   ScoreValue* min_ = nullptr;
   ScoreValue* max_ = nullptr;

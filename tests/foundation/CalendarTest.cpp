@@ -51,21 +51,50 @@ TEST(Calendar, CountsDaysBetweenYears) {
   EXPECT_EQ(DaysBetweenYear(5, 5), 0);
 }
 
+/// Walks the calendar a day at a time by rules of its own, so that nothing under test checks itself.
+class DayCounter {
+ public:
+  explicit DayCounter(int64_t year) : year_(year) {}
+
+  void Next() {
+    if (++day_ <= Length()) return;
+    day_ = 1;
+    if (++month_ <= 12) return;
+    month_ = 1;
+    ++year_;
+  }
+  int64_t Year() const { return year_; }
+  int64_t Month() const { return month_; }
+  int64_t Day() const { return day_; }
+
+ private:
+  int64_t Length() const {
+    if (month_ == 2) return year_ % 400 == 0 || (year_ % 4 == 0 && year_ % 100 != 0) ? 29 : 28;
+    return month_ == 4 || month_ == 6 || month_ == 9 || month_ == 11 ? 30 : 31;
+  }
+
+  int64_t year_, month_ = 1, day_ = 1;
+};
+
 TEST(Calendar, FindsTheDateOfEveryDay) {
-  // Counted day by day from 1 January of the year -400, which is as many days before 1970 as given.
-  int64_t year = -400, month = 1, day = 1;
-  for (int64_t days = -DaysBetweenYear(-400, 1970); year < 2400; ++days) {
+  // 25 cycles of 400 years (146,097 days each) reach from the year -8030 to 1970.
+  constexpr int64_t kFirst = -25 * 146097;
+  DayCounter counter(1970 - 25 * 400);
+  for (int64_t days = kFirst; counter.Year() < 10000; ++days, counter.Next()) {
     int64_t y = 0, m = 0, d = 0;
     DateOfDays(days, y, m, d);
-    ASSERT_TRUE(y == year && m == month && d == day) << days << " gives " << y << '-' << m << '-' << d;
-    if (++day > DaysInMonth(year, month)) {
-      day = 1;
-      if (++month > 12) {
-        month = 1;
-        ++year;
-      }
-    }
+    ASSERT_TRUE(y == counter.Year() && m == counter.Month() && d == counter.Day())
+        << days << " gives " << y << '-' << m << '-' << d;
+    if (d != 1) continue;
+    ASSERT_EQ(DaysBetweenYear(1970, y) + DaysBeforeMonth(y, m), days) << y << '-' << m;
   }
+}
+
+TEST(Calendar, StartsTheJulianDaysAtTheirEpoch) {
+  int64_t y = 0, m = 0, d = 0;
+  DateOfDays(-kJan_1_1970_JulianDay, y, m, d);
+  // Noon of 1 January 4713 BC in the Julian calendar.
+  EXPECT_TRUE(y == -4713 && m == 11 && d == 24) << y << '-' << m << '-' << d;
 }
 
 TEST(Calendar, StaysInsideItsNumbersForEveryArgument) {
@@ -79,6 +108,10 @@ TEST(Calendar, StaysInsideItsNumbersForEveryArgument) {
     NumberOfLeapYear(extreme, 0);
     NumberOfLeapYear(kLowest, kHighest);
     DateOfDays(extreme, y, m, d);
+  }
+  for (const int64_t days : {kLowest, -kFarthest, kFarthest, kHighest}) {
+    DateOfDays(days, y, m, d);
+    EXPECT_TRUE(m >= 1 && m <= 12 && d >= 1 && d <= DaysInMonth(y, m)) << y << '-' << m << '-' << d;
   }
   EXPECT_EQ(DaysBetweenYear(kLowest, kHighest), DaysBetweenYear(-kFarthest, kFarthest));
 }

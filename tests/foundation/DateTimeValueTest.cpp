@@ -5,8 +5,11 @@
 #include <cmath>
 #include <limits>
 #include <memory>
+#include <random>
+#include <string>
 
 #include "kestrel/foundation/StringValue.h"
+#include "tests/support/CommaLocale.h"
 
 namespace MCKestrel_800 {
 namespace {
@@ -67,7 +70,34 @@ constexpr TextRow kTexts[] = {
     {"10", kTimeSeconds, 10.0, "seconds since midnight"},
     {"abc", kDateDaysSince1970, kSysmis, "no number"},
     {"", kDateDaysSince1970, kSysmis, "an empty text"},
+    {"0", kDateDaysSince0, -719528.0 * 86400.0, "days since the year 0"},
+    {"1.5abc", kDateDaysSince1970, 129600.0, "a number at the start"},
+    {" 1e1", kDateDaysSince1980, 3662.0 * 86400.0, "a number with an exponent"},
+    {"0", kDateTimeSecondsSince0, -62167219200.0, "seconds since the year 0"},
+    {"0", kDateTimeSecondsSince1960, -315619200.0, "seconds since 1960"},
+    {"-2.5", kDateTimeSecondsSince1970, -2.5, "seconds since 1970"},
+    {"0", kDateTimeSecondsSince1980, 315532800.0, "seconds since 1980"},
+    {"1,5", kTimeSeconds, 1.0, "a comma ends the number"},
+    {"1e999", kTimeSeconds, NumericValue::gInfinity, "too large"},
+    {"12:30:00", kTimeSeconds, 12.0, "the number at the start of a time"},
     {"1970-01-01", kNoDateTime, kSysmis, "no type"},
+    {"1", kNoDateTime, kSysmis, "no type"},
+    {"1", static_cast<DateTimeType>(13), kSysmis, "no such type"},
+    {"1970-01-01\t", kDay, kSysmis, "a tab is no blank"},
+    {"19 70-0 1-01", kDay, 0.0, "blanks anywhere, even between digits"},
+    {"+1970-01-01", kDay, kSysmis, "a sign is no digit"},
+    {"10000-01-01", kDay, 253402300800.0, "a year of five digits"},
+    {" 0 1 : 0 2 : 0 3 ", kTime, 3723.0, "blanks anywhere"},
+    {"-1:00:00", kTime, kSysmis, "no sign"},
+    {"1::3", kTime, kSysmis, "an empty part"},
+    {"1:2:3:4", kTime, kSysmis, "four parts"},
+    {"99999999999999999999:00:00", kTime, kSysmis, "an hour beyond every integer"},
+    {"1970-01-01 T 01:00:00", kDateAndTime, 3600.0, "blanks around the T"},
+    {"1970-01-01t01:00:00", kDateAndTime, kSysmis, "a small t"},
+    {"1970-01-01T  ", kDateAndTime, kSysmis, "a blank half"},
+    {"T", kDateAndTime, kSysmis, "no half at all"},
+    {"1970-01-01T01:00", kDateAndTime, kSysmis, "seconds are required"},
+    {"1970-01-01T01:00:00Z", kDateAndTime, kSysmis, "no zones"},
 };
 
 TEST(DateTimeValue, ReadsTexts) {
@@ -169,16 +199,110 @@ TEST(DateTimeValue, ExtractsComponents) {
   }
 }
 
-TEST(DateTimeValue, AnswersForEveryNumberOfSeconds) {
-  for (const double seconds :
-       {1e300, -1e300, 1e19, -1e19, std::nan(""), NumericValue::gInfinity, -NumericValue::gInfinity}) {
-    const DateTimeValue value(seconds, kDateTimeVal);
-    EXPECT_TRUE(std::isfinite(value.ExtractYear()));
-    EXPECT_GE(value.ExtractHour(), 0.0);
-    EXPECT_LT(value.ExtractHour(), 24.0);
-    EXPECT_FALSE(value.GetString().empty());
-    value.GetInt();
+TEST(DateTimeValue, CutsDaysTowardZeroAndTheTimeOfDayDownwards) {
+  struct Row {
+    double seconds;
+    int64_t y, m, d, h, min, s;
+  };
+  constexpr Row kRows[] = {
+      {-0.5, 1970, 1, 1, 0, 0, 0},        {-86399.0, 1970, 1, 1, 0, 0, 1},
+      {-86400.0, 1969, 12, 31, 0, 0, 0},  {-86401.0, 1969, 12, 31, 23, 59, 59},
+      {-172800.0, 1969, 12, 30, 0, 0, 0}, {86399.999, 1970, 1, 1, 23, 59, 59},
+      {-62167219200.0, 0, 1, 1, 0, 0, 0}, {kSysmis, 1970, 1, 1, 0, 0, 0},
+      {NAN, 1970, 1, 1, 0, 0, 0},
+  };
+  for (const Row& row : kRows) {
+    int64_t y = 0, m = 0, d = 0, h = 0, min = 0, s = 0;
+    DateTimeValue::ExtractDate(row.seconds, y, m, d);
+    DateTimeValue::ExtractTime(row.seconds, h, min, s);
+    EXPECT_TRUE(y == row.y && m == row.m && d == row.d) << row.seconds << ": " << y << '-' << m << '-' << d;
+    EXPECT_TRUE(h == row.h && min == row.min && s == row.s)
+        << row.seconds << ": " << h << ':' << min << ':' << s;
   }
+}
+
+TEST(DateTimeValue, WritesEveryTimeAsATextThatReadsBack) {
+  std::mt19937_64 random(20000229);
+  // The years 0 to 9999.
+  std::uniform_int_distribution<int64_t> anySecond(-62167219200, 253402300799);
+  for (int i = 0; i < 20000; ++i) {
+    const double seconds = static_cast<double>(anySecond(random));
+    const std::string both = DateTimeValue(seconds, kDateTimeVal).GetString();
+    ASSERT_EQ(both.size(), 19u) << both;
+    ASSERT_EQ(DateTimeValue(both, kDateAndTime).GetDouble(), seconds) << both;
+    const std::string date = DateTimeValue(seconds, kDateVal).GetString();
+    const std::string time = DateTimeValue(seconds, kTimeVal).GetString();
+    ASSERT_EQ(date + "T" + time, both);
+    const double midnight = DateTimeValue(date, kDay).GetDouble();
+    ASSERT_EQ(midnight, std::floor(seconds / 86400.0) * 86400.0) << date;
+    ASSERT_EQ(DateTimeValue(time, kTime).GetDouble(), seconds - midnight) << time;
+  }
+}
+
+TEST(DateTimeValue, WritesPaddedTextsWhateverTheSecondsAndTheLocale) {
+  struct Row {
+    double seconds;
+    DateTimeValType kind;
+    const char* text;
+  };
+  const Row kRows[] = {
+      {-1.0, kDateTimeVal, "1969-12-31T23:59:59"},
+      {-0.25, kDateTimeVal, "1969-12-31T23:59:59"},
+      {1.75, kDateTimeVal, "1970-01-01T00:00:01"},
+      {-1.0, kDateVal, "1969-12-31"},
+      {-1.0, kTimeVal, "23:59:59"},
+      {90000.0, kTimeVal, "01:00:00"},
+      {253402300800.0, kDateVal, "10000-01-01"},
+      {-62167219201.0, kDateTimeVal, "-0001-12-31T23:59:59"},
+      {kSysmis, kDateVal, "Undefined"},
+      {kSysmis, kTimeVal, "Undefined"},
+      {NAN, kDateVal, "Undefined"},
+      {NumericValue::gInfinity, kDateTimeVal, "Undefined"},
+      {-NumericValue::gInfinity, kTimeVal, "Undefined"},
+  };
+  const kestrel_tests::CommaLocale comma;
+  for (const Row& row : kRows)
+    EXPECT_EQ(DateTimeValue(row.seconds, row.kind).GetString(), row.text) << row.seconds;
+  EXPECT_EQ(DateTimeValue(1234567.5, kDateTimeVal).GetNumericString(), "1.23457e+06");
+  EXPECT_EQ(DateTimeValue("2.5", kTimeSeconds).GetDouble(), 2.5);
+}
+
+TEST(DateTimeValue, AnswersForEveryNumberOfSeconds) {
+  for (const double seconds : {1e300, -1e300, 1e19, -1e19, 9.3e18, -9.3e18, 1e15, -1e15}) {
+    const DateTimeValue value(seconds, kDateTimeVal);
+    EXPECT_TRUE(seconds > 0 ? value.ExtractYear() > 30000000 : value.ExtractYear() < -30000000) << seconds;
+    EXPECT_TRUE(value.ExtractMonth() >= 1 && value.ExtractMonth() <= 12) << seconds;
+    EXPECT_TRUE(value.ExtractDay() >= 1 && value.ExtractDay() <= 31) << seconds;
+    EXPECT_TRUE(value.ExtractHour() >= 0 && value.ExtractHour() < 24) << seconds;
+    EXPECT_TRUE(value.ExtractMinute() >= 0 && value.ExtractMinute() < 60) << seconds;
+    EXPECT_TRUE(value.ExtractSecond() >= 0 && value.ExtractSecond() < 60) << seconds;
+    EXPECT_EQ(value.GetString().find("Undefined"), std::string::npos) << seconds;
+    EXPECT_EQ(value.GetInt(),
+              seconds > 0 ? std::numeric_limits<int>::max() : std::numeric_limits<int>::min());
+  }
+}
+
+TEST(DateTimeValue, HasNoPartsWhenItIsNoMoment) {
+  const DateTimeValue now(0.0, kDateTimeVal);
+  for (const double seconds : {kSysmis, std::nan(""), NumericValue::gInfinity, -NumericValue::gInfinity}) {
+    const DateTimeValue value(seconds, kDateTimeVal);
+    EXPECT_EQ(value.ExtractYear(), kSysmis);
+    EXPECT_EQ(value.ExtractMonth(), kSysmis);
+    EXPECT_EQ(value.ExtractDay(), kSysmis);
+    EXPECT_EQ(value.ExtractHour(), kSysmis);
+    EXPECT_EQ(value.ExtractMinute(), kSysmis);
+    EXPECT_EQ(value.ExtractSecond(), kSysmis);
+    EXPECT_EQ(value.ComputeDurationSeconds(now), kSysmis);
+    EXPECT_EQ(now.ComputeDurationYears(value), kSysmis);
+    EXPECT_EQ(value.ComputeDurationDays(value), kSysmis);
+  }
+  const DateTimeValue none(std::nan(""), kDateVal);
+  EXPECT_FALSE(none.IsSystemMissingValue());
+  EXPECT_EQ(none.GetInt(), 0);
+  EXPECT_FALSE(none == none);
+  EXPECT_FALSE(none < now);
+  EXPECT_FALSE(none >= now);
+  EXPECT_TRUE(std::isnan(DateTimeValue(std::nan(""), kDateDaysSince1960).GetDouble()));
 }
 
 TEST(DateTimeValue, ComputesDurations) {
@@ -256,29 +380,69 @@ TEST(DateTimeValue, ParsesPartsAndLeavesThemAloneForAnEmptyText) {
   EXPECT_TRUE(h == 4 && min == 5 && s == 6);
   EXPECT_TRUE(DateTimeValue::ParseDateTime("", y, m, d, h, min, s));
   EXPECT_TRUE(y == 0 && m == 0 && d == 0 && h == 0 && min == 0 && s == 0);
+  h = 9;
+  EXPECT_FALSE(DateTimeValue::ParseDateTime("1970-01-02T25:00:00", y, m, d, h, min, s));
+  EXPECT_TRUE(y == 0 && m == 0 && d == 0 && h == 0) << "nothing is left of half a text";
+  y = 7;
+  EXPECT_FALSE(DateTimeValue::ParseDate("1970-13-01", y, m, d));
+  EXPECT_EQ(y, 7);
   EXPECT_TRUE(DateTimeValue::ParseDate("99999999999999999999999-01-01", y, m, d));
+  EXPECT_EQ(y, Calendar::kFarthest) << "no year beyond that";
   double number = 0.0;
   EXPECT_TRUE(DateTimeValue::ParseDouble("2.5", number));
   EXPECT_EQ(number, 2.5);
+  EXPECT_TRUE(DateTimeValue::ParseDouble(" -1e2 apples", number));
+  EXPECT_EQ(number, -100.0);
   EXPECT_FALSE(DateTimeValue::ParseDouble("x", number));
+  EXPECT_FALSE(DateTimeValue::ParseDouble("", number));
+  EXPECT_EQ(number, -100.0);
 }
 
 TEST(DateTimeValue, TrimsACharacterAtBothEnds) {
   EXPECT_EQ(DateTimeValue::TrimString("xxabxcxx", 'x'), "abxc");
   EXPECT_EQ(DateTimeValue::TrimString("xxx", 'x'), "");
   EXPECT_EQ(DateTimeValue::TrimString("", 'x'), "");
+  EXPECT_EQ(DateTimeValue::TrimString("  a b ", ' '), "a b");
+  EXPECT_EQ(DateTimeValue::TrimString("ab", 'x'), "ab");
 }
 
 TEST(DateTimeValue, HasTheCalendarsConstants) {
   EXPECT_EQ(DateTimeValue::fJan_1_1970_JulianDay, 2440588);
   EXPECT_EQ(DateTimeValue::fSeconds_Per_Day, 86400);
-  EXPECT_EQ(DateTimeValue::fDaysInMonth[2], 28);
-  EXPECT_EQ(DateTimeValue::fDaysBeforeMonth[12], 334);
+  constexpr int64_t kLengths[] = {0, 31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
+  constexpr int64_t kBefore[] = {0, 0, 31, 59, 90, 120, 151, 181, 212, 243, 273, 304, 334};
+  for (int month = 0; month <= 12; ++month) {
+    EXPECT_EQ(DateTimeValue::fDaysInMonth[month], kLengths[month]) << month;
+    EXPECT_EQ(DateTimeValue::fDaysBeforeMonth[month], kBefore[month]) << month;
+    EXPECT_EQ(DateTimeValue::DaysInMonth(2023, month), kLengths[month]) << month;
+    EXPECT_EQ(DateTimeValue::DaysBeforeMonth(2024, month), kBefore[month] + (month > 2 ? 1 : 0)) << month;
+  }
+  EXPECT_TRUE(DateTimeValue::IsLeapYear(2000));
   EXPECT_EQ(DateTimeValue::DaysInYear(2024), 366);
   EXPECT_EQ(DateTimeValue::DaysInYear(2023), 365);
-  EXPECT_TRUE(DateTimeValue::IsValidTime(0, 0, 0));
-  EXPECT_FALSE(DateTimeValue::IsValidTime(-1, 0, 0));
-  EXPECT_FALSE(DateTimeValue::IsValidDate(2023, 2, 29));
+  EXPECT_EQ(DateTimeValue::NumberOfLeapYear(2024, 2020), 1);
+  EXPECT_EQ(DateTimeValue::DaysBetweenYear(1971, 1970), -365);
+}
+
+TEST(DateTimeValue, JudgesDatesAndTimes) {
+  struct Row {
+    int64_t a, b, c;
+    bool date, time;
+  };
+  constexpr Row kRows[] = {
+      {2023, 2, 28, true, false}, {2023, 2, 29, false, false}, {2024, 2, 29, true, false},
+      {-400, 2, 29, true, false}, {2023, 0, 1, false, false},  {2023, 13, 1, false, false},
+      {2023, 1, 0, false, false}, {2023, 1, 32, false, false}, {0, 0, 0, false, true},
+      {23, 59, 59, false, true},  {24, 0, 0, false, false},    {0, 60, 0, false, false},
+      {0, 0, 60, false, false},   {-1, 0, 0, false, false},    {0, -1, 0, false, false},
+      {0, 0, -1, false, false},   {1, 1, 1, true, true},
+  };
+  for (const Row& row : kRows) {
+    EXPECT_EQ(DateTimeValue::IsValidDate(row.a, row.b, row.c), row.date)
+        << row.a << ' ' << row.b << ' ' << row.c;
+    EXPECT_EQ(DateTimeValue::IsValidTime(row.a, row.b, row.c), row.time)
+        << row.a << ' ' << row.b << ' ' << row.c;
+  }
 }
 
 }  // namespace

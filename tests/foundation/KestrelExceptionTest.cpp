@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <exception>
+#include <string>
 #include <type_traits>
 
 namespace MCKestrel_800 {
@@ -28,6 +30,17 @@ TEST(KestrelException, CarriesCodeTextAndPlaceThroughThrowAndCopy) {
     EXPECT_EQ(copy.GetLine(), 12u);
     EXPECT_EQ(copy.GetColumn(), 7u);
   }
+}
+
+TEST(KestrelException, KeepsItsOwnCopyOfTheText) {
+  std::string text = "Value list is required!";
+  const KestrelException fault(KestrelException::kMissingElement, text);
+  const KestrelException copy(fault);
+  text.assign("something else");
+  EXPECT_EQ(fault.GetErrorMessage(), "Value list is required!");
+  EXPECT_EQ(copy.GetErrorMessage(), "Value list is required!");
+  EXPECT_EQ(copy.GetErrorCode(), 4);
+  EXPECT_NE(&copy.GetErrorMessage(), &fault.GetErrorMessage());
 }
 
 TEST(KestrelException, IsNoStandardException) {

@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <iterator>
 #include <limits>
-#include <string>
 
 namespace {
 
@@ -56,14 +56,38 @@ TEST(MCStatus, ComparesNumbersWithoutTolerance) {
   EXPECT_FALSE(one == other);
 }
 
+TEST(MCStatus, DiffersFromItselfWhenASlotHoldsNoNumber) {
+  MCStatus status;
+  status.SetScaleDatum(0, std::numeric_limits<double>::quiet_NaN());
+  EXPECT_FALSE(status == status);
+  EXPECT_TRUE(status.IsOK());
+}
+
+TEST(MCStatus, KeepsTheWholeRangeOf32Bits) {
+  for (const long code : {-2147483647L - 1, -1L, 0L, 2147483647L}) {
+    MCStatus status(code, true);
+    status.SetDiscreteDatum(1, code);
+    EXPECT_EQ(status.GetErrorCode(), code);
+    EXPECT_EQ(status.GetDiscreteDatum(1), code);
+  }
+}
+
 TEST(MCStatus, CopiesEverySlot) {
   MCStatus one(90027, false), copy;
   one.SetDiscreteDatum(0, 1);
   one.SetDiscreteDatum(2, 3);
   one.SetScaleDatum(1, 2.5);
   copy = one;
-  EXPECT_TRUE(copy == one);
-  EXPECT_EQ(copy.GetErrorCode(), 90027);
+  const MCStatus second(one);
+  for (const MCStatus& each : {copy, second}) {
+    EXPECT_TRUE(each == one);
+    EXPECT_TRUE(each.IsError());
+    EXPECT_EQ(each.GetErrorCode(), 90027);
+    EXPECT_EQ(each.GetDiscreteDatum(0), 1);
+    EXPECT_EQ(each.GetDiscreteDatum(1), 0);
+    EXPECT_EQ(each.GetDiscreteDatum(2), 3);
+    EXPECT_EQ(each.GetScaleDatum(1), 2.5);
+  }
 }
 
 TEST(StatusNames, StandInTheirOrder) {

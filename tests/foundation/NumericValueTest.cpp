@@ -7,6 +7,7 @@
 #include <cstring>
 #include <limits>
 #include <memory>
+#include <string>
 
 #include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/MCMV.h"
@@ -73,14 +74,17 @@ TEST(NumericValue, EqualityIsRelative) {
       {kInfinity, 1.0, false, "an infinity equals nothing"},
       {kNaN, kNaN, false, "no number equals nothing"},
       {kNaN, 1.0, false, "no number equals nothing"},
-      {5e-324, 5e-324, true, "the smallest number"},
+      {kSysmis, kNaN, false, "missing equals nothing else"},
+      {-kInfinity, kSysmis, false, "missing equals nothing else"},
+      {1.7e308, -1.7e308, false, "a difference that overflows"},
+      {1e-300, 1e-300, true, "a small number"},
+      {5e-324, 5e-324, false, "no difference is below the tolerance of zero of the smallest numbers"},
   };
   for (const Row& row : kRows) {
-    // The smallest numbers have a tolerance of zero, which no difference is below.
-    const bool equal = row.a == 5e-324 ? false : row.equal;
-    EXPECT_EQ(NumericValue::IsEqual(row.a, row.b), equal) << row.why;
-    EXPECT_EQ(NumericValue(row.a) == NumericValue(row.b), equal) << row.why;
-    EXPECT_EQ(NumericValue(row.b) == NumericValue(row.a), equal) << row.why;
+    EXPECT_EQ(NumericValue::IsEqual(row.a, row.b), row.equal) << row.why;
+    EXPECT_EQ(NumericValue::IsEqual(row.b, row.a), row.equal) << row.why;
+    EXPECT_EQ(NumericValue(row.a) == NumericValue(row.b), row.equal) << row.why;
+    EXPECT_EQ(NumericValue(row.b) == NumericValue(row.a), row.equal) << row.why;
   }
 }
 
@@ -101,6 +105,11 @@ TEST(NumericValue, OrderIsAbsolute) {
       {1.0, kSysmis, false, false, "nothing is less than missing"},
       {kSysmis, kSysmis, false, false, "nor than itself"},
       {-kInfinity, kInfinity, true, true, "infinities are ordered"},
+      {kInfinity, kInfinity, false, false, "an infinity has no order to itself"},
+      {kSysmis, kInfinity, false, false, "missing is not less than infinity"},
+      {-kInfinity, kSysmis, false, false, "nor minus infinity less than missing"},
+      {-2.0, -1.0, true, true, "negative numbers"},
+      {kNaN, kNaN, false, false, "no number has no order"},
       {kNaN, 1.0, false, false, "no number has no order"},
       {1.0, kNaN, false, false, "no number has no order"},
   };
@@ -110,6 +119,8 @@ TEST(NumericValue, OrderIsAbsolute) {
     EXPECT_EQ(b > a, row.less) << row.why;
     EXPECT_EQ(a <= b, row.lessOrEqual) << row.why;
     EXPECT_EQ(b >= a, row.lessOrEqual) << row.why;
+    EXPECT_EQ(NumberLess(row.a, row.b), row.less) << row.why;
+    EXPECT_EQ(NumberLessOrEqual(row.a, row.b), row.lessOrEqual) << row.why;
   }
 }
 
@@ -159,13 +170,24 @@ TEST(NumericValue, ReadsTextsWhateverTheLocale) {
       {"-", kSysmis},
       {" ", kSysmis},
       {"0x10", 0.0},
+      {"1e+", kSysmis},
+      {".5", 0.5},
+      {"5.", 5.0},
+      {"+3", 3.0},
+      {"- 3", kSysmis},
+      {"1_000", 1.0},
+      {"\xEF\xBC\x91", kSysmis},
+      {"Infix", kInfinity},
+      {"-1.7976931348623157e308", kSysmis},
   };
   for (const bool comma : {false, true}) {
     std::unique_ptr<kestrel_tests::CommaLocale> locale;
     if (comma) locale = std::make_unique<kestrel_tests::CommaLocale>();
     for (const Row& row : kRows)
       EXPECT_EQ(NumericValue(std::string(row.text)).GetDouble(), row.value) << row.text;
-    EXPECT_EQ(NumericValue(1234.5).GetString(), "1234.5");
+    NumericValue again(7.0);
+    again.FromString("none");
+    EXPECT_TRUE(again.IsSystemMissingValue());
   }
 }
 
@@ -174,11 +196,18 @@ TEST(NumericValue, WritesSixDigits) {
     double value;
     const char* text;
   };
-  const Row kRows[] = {{1.0, "1"},        {1.0 / 3, "0.333333"},  {1234567.0, "1.23457e+06"},
-                       {-2.5, "-2.5"},    {kSysmis, "Undefined"}, {-kInfinity, "Undefined"},
-                       {kInfinity, "inf"}};
-  for (const Row& row : kRows)
-    EXPECT_EQ(NumericValue(row.value).GetString(), row.text);
+  const Row kRows[] = {
+      {1.0, "1"},         {1.0 / 3, "0.333333"},  {1234567.0, "1.23457e+06"},
+      {-2.5, "-2.5"},     {kSysmis, "Undefined"}, {-kInfinity, "Undefined"},
+      {kInfinity, "inf"}, {kNaN, "nan"},          {std::nextafter(kSysmis, 0.0), "-1.79769e+308"},
+      {12345.0, "12345"}, {1234.5, "1234.5"},     {0.0, "0"},
+      {1e-5, "1e-05"}};
+  for (const bool comma : {false, true}) {
+    std::unique_ptr<kestrel_tests::CommaLocale> locale;
+    if (comma) locale = std::make_unique<kestrel_tests::CommaLocale>();
+    for (const Row& row : kRows)
+      EXPECT_EQ(NumericValue(row.value).GetString(), row.text);
+  }
 }
 
 TEST(NumericValue, GivesIntegersTruncatedAndClamped) {
@@ -190,11 +219,28 @@ TEST(NumericValue, GivesIntegersTruncatedAndClamped) {
                        {-2.9, -2},
                        {1e300, std::numeric_limits<int>::max()},
                        {-1e300, std::numeric_limits<int>::min()},
+                       {2147483647.9, std::numeric_limits<int>::max()},
+                       {2147483648.0, std::numeric_limits<int>::max()},
+                       {-2147483648.9, std::numeric_limits<int>::min()},
+                       {-2147483649.0, std::numeric_limits<int>::min()},
+                       {-0.9, 0},
+                       {-kInfinity, std::numeric_limits<int>::min()},
                        {kSysmis, std::numeric_limits<int>::min()},
                        {kInfinity, std::numeric_limits<int>::max()},
                        {kNaN, 0}};
   for (const Row& row : kRows)
     EXPECT_EQ(NumericValue(row.value).GetInt(), row.integer) << row.value;
+}
+
+TEST(NumericValue, AssignsTheNumberAlsoToItself) {
+  NumericValue value(1.5), other;
+  other = value;
+  EXPECT_EQ(other.GetDouble(), 1.5);
+  const NumericValue& same = other;
+  other = same;
+  EXPECT_EQ(other.GetDouble(), 1.5);
+  other.SetValue(&other);
+  EXPECT_EQ(other.GetDouble(), 1.5);
 }
 
 TEST(NumericValue, TakesOverNumbersOnly) {
@@ -204,6 +250,9 @@ TEST(NumericValue, TakesOverNumbersOnly) {
   value.SetValue(&two);
   EXPECT_EQ(value.GetDouble(), 2.0);
   value.SetValue(&text);
+  EXPECT_EQ(value.GetDouble(), 2.0);
+  const DateTimeValue date(5.0, kDateVal);
+  value.SetValue(&date);
   EXPECT_EQ(value.GetDouble(), 2.0);
   value.SetValue(nullptr);
   EXPECT_EQ(value.GetDouble(), 2.0);

@@ -83,6 +83,14 @@ TEST(StringValue, ReadsNumbersFromItsStart) {
       {"-2147483648", std::numeric_limits<int>::min(), -2147483648.0},
       {"-99999999999999999999", std::numeric_limits<int>::min(), -1e20},
       {"1,5", 1, 1.0},
+      {"\t\n 8", 8, 8.0},
+      {"- 3", 0, 0.0},
+      {"+-3", 0, 0.0},
+      {"1e3", 1, 1000.0},
+      {".5", 0, 0.5},
+      {"inf", 0, 0.0},
+      {"1e999", 1, std::numeric_limits<double>::max()},
+      {"-1e999", -1, -std::numeric_limits<double>::max()},
   };
   for (const bool comma : {false, true}) {
     std::unique_ptr<kestrel_tests::CommaLocale> locale;
@@ -117,6 +125,44 @@ TEST(StringValue, TakesOverTextsAndForgetsItsOwnForAnythingElse) {
   value.SetString("abc");
   value.SetValue(nullptr);
   EXPECT_EQ(value.GetString(), "");
+}
+
+/// A text of a host's own class: only what the interface says of it is known.
+class ShoutedText : public StringValue {
+ public:
+  using StringValue::StringValue;
+  std::string GetString() const override { return StringValue::GetString() + "!"; }
+};
+
+TEST(StringValue, AsksClassesOfOthersForTheirText) {
+  const ShoutedText shouted("ab");
+  StringValue value("ab!");
+  EXPECT_TRUE(value == shouted);
+  EXPECT_TRUE(value.Equal(&shouted, true, false));
+  EXPECT_TRUE(StringValue("ab") < shouted);
+  value.SetValue(&shouted);
+  EXPECT_EQ(value.GetString(), "ab!");
+}
+
+TEST(StringValue, KeepsNulsAndItselfIntact) {
+  const std::string text("a\0b  ", 5);
+  StringValue value(text);
+  EXPECT_EQ(value.GetLength(), 5);
+  EXPECT_TRUE(value == StringValue(std::string("a\0b", 3)));
+  EXPECT_FALSE(value == StringValue("a"));
+  value.SetValue(&value);
+  EXPECT_EQ(value.GetString(), text);
+}
+
+TEST(StringValue, AssignsTextAndLength) {
+  StringValue value("abc"), other;
+  value.SetLength(9);
+  other = value;
+  EXPECT_EQ(other.GetString(), "abc");
+  EXPECT_EQ(other.GetLength(), 9);
+  const StringValue& same = other;
+  other = same;
+  EXPECT_EQ(other.GetString(), "abc");
 }
 
 TEST(StringValue, CopiesBelongToTheCaller) {

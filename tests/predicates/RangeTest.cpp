@@ -9,6 +9,7 @@
 #include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
+#include "tests/support/CommaLocale.h"
 
 namespace MCKestrel_800 {
 namespace {
@@ -62,6 +63,23 @@ TEST(Range, HoldsNumbersByItsEndsAndFlags) {
   }
 }
 
+TEST(Range, TwoMissingNumbersAreASingleValue) {
+  const Range range(kSysmis, kSysmis, false, false);
+  EXPECT_TRUE(range.IsInRange(kSysmis)) << "the number that is tested against is kept as it was given";
+  EXPECT_EQ(range.GetMin()->GetDouble(), -kInfinity);
+  EXPECT_EQ(range.GetMax()->GetDouble(), kSysmis);
+  const NumericValue missing;
+  EXPECT_FALSE(range.IsInRange(&missing)) << "but not in the value object";
+}
+
+TEST(Range, NoNumberAtAnEndHoldsNothing) {
+  for (const Range& range :
+       {Range(NAN, 10.0, true, true), Range(0.0, NAN, true, true), Range(NAN, NAN, true, true)}) {
+    for (const double x : {5.0, 100.0, -100.0, kSysmis, kInfinity, std::nan("")})
+      EXPECT_FALSE(range.IsInRange(x)) << x;
+  }
+}
+
 TEST(Range, KeepsAMissingMinimumAsMinusInfinityInTheValueAlone) {
   const Range range(kSysmis, 1.0, true, true);
   EXPECT_EQ(range.GetMin()->GetDouble(), -kInfinity);
@@ -84,6 +102,17 @@ TEST(Range, TakesAMissingMinimumButNotMaximumForAnInfinity) {
   const Range range(Number(kSysmis), Number(kSysmis), true, true);
   EXPECT_EQ(range.GetMin()->GetDouble(), -kInfinity);
   EXPECT_EQ(range.GetMax()->GetDouble(), kSysmis);
+  EXPECT_FALSE(range.IsInRange(0.0));
+  EXPECT_FALSE(range.IsInRange(-1e307)) << "nothing lies below a missing maximum";
+}
+
+TEST(Range, OneMissingObjectForBothEndsHoldsNothing) {
+  // Both ends become minus infinity, which equals nothing.
+  NumericValue* const value = Number(kSysmis);
+  const Range range(value, value, true, true);
+  EXPECT_EQ(range.GetMax()->GetDouble(), -kInfinity);
+  EXPECT_FALSE(range.IsInRange(-kInfinity));
+  EXPECT_FALSE(range.IsInRange(kSysmis));
   EXPECT_FALSE(range.IsInRange(0.0));
 }
 
@@ -114,8 +143,25 @@ TEST(Range, SingleValuesCompareByTheValuesOwnRules) {
   const NumericValue number(5.0);
   EXPECT_TRUE(date.IsInRange(&same));
   EXPECT_FALSE(date.IsInRange(&number));
-  const Range missing(Number(kSysmis));
-  EXPECT_EQ(missing.GetMin()->GetDouble(), -kInfinity);
+  EXPECT_TRUE(date.IsInRange(5.0)) << "a single date is found by its seconds";
+  EXPECT_FALSE(date.IsInRange(6.0));
+  EXPECT_FALSE(text.IsInRange(0.0)) << "a text is no number";
+  const Range five(Number(5));
+  const StringValue word("5");
+  EXPECT_TRUE(five.IsInRange(5.0));
+  EXPECT_FALSE(five.IsInRange(&word));
+  EXPECT_FALSE(five.IsInRange(static_cast<const ScoreValue*>(nullptr)));
+}
+
+TEST(Range, ASingleMissingOrAbsentValueBecomesMinusInfinity) {
+  const Range missing(Number(kSysmis)), absent(static_cast<ScoreValue*>(nullptr));
+  for (const Range* range : {&missing, &absent}) {
+    EXPECT_EQ(range->GetMin()->GetDouble(), -kInfinity);
+    EXPECT_EQ(range->GetMax()->GetDouble(), -kInfinity);
+    EXPECT_NE(range->GetMin(), range->GetMax());
+    EXPECT_FALSE(range->IsInRange(kSysmis));
+    EXPECT_FALSE(range->IsInRange(0.0));
+  }
 }
 
 TEST(Range, HoldsNothingButNumbersBetweenItsEnds) {
@@ -159,6 +205,55 @@ TEST(Range, ReplacesEndsWithoutDeletingTheOldOnes) {
   EXPECT_EQ(range.GetMax(), nullptr);
 }
 
+TEST(Range, TextEndsLeaveTheNumbersThatAreTestedAgainst) {
+  Range range(0, 10, true, true);
+  const std::unique_ptr<const ScoreValue> oldMin(range.GetMin()), oldMax(range.GetMax());
+  range.SetMin(Text("a"));
+  range.SetMax(Text("b"));
+  EXPECT_TRUE(range.IsInRange(5));
+  EXPECT_FALSE(range.IsInRange(11));
+  const Range unset(Text("a"), Text("b"), true, true);
+  EXPECT_TRUE(unset.IsInRange(1e300)) << "ends that were never numbers are infinite";
+}
+
+TEST(Range, LosesItsUpperEndButNotTheNumberForIt) {
+  Range range(0, 10, true, true);
+  const std::unique_ptr<const ScoreValue> oldMax(range.GetMax());
+  range.SetMax(nullptr);
+  EXPECT_TRUE(range.IsInRange(10));
+  EXPECT_FALSE(range.IsInRange(11));
+  const Range copy(range);
+  EXPECT_EQ(copy.GetMax(), nullptr);
+  EXPECT_TRUE(copy == range);
+  EXPECT_FALSE(copy == Range(0, 10, true, true));
+  std::ostringstream out;
+  copy.Display(out);
+  EXPECT_EQ(out.str(),
+            "  Start Range Display   \nMinValue: 0;  MaxValue: NULL; High End included; lower End included\n "
+            "End of "
+            "Range Display\n\n");
+}
+
+TEST(Range, MayBeGivenOneObjectForBothEnds) {
+  Range range(0, 10, false, false);
+  const std::unique_ptr<const ScoreValue> oldMin(range.GetMin()), oldMax(range.GetMax());
+  NumericValue* const value = Number(3);
+  range.SetMin(value);
+  range.SetMax(value);
+  EXPECT_TRUE(range.IsInRange(3));
+  EXPECT_FALSE(range.IsInRange(4));
+  const Range copy(range);
+  EXPECT_NE(copy.GetMin(), copy.GetMax());
+  range = Range(1, 2, true, true);
+  EXPECT_TRUE(range.IsInRange(1.5));
+}
+
+TEST(Range, AnOpenRangeEqualsNothingSinceNoInfinityDoes) {
+  const Range open(-kInfinity, 10, true, true);
+  const std::unique_ptr<ScoreValueRange> clone(open.Clone());
+  EXPECT_FALSE(*clone == open);
+}
+
 TEST(Range, EqualsByEndsAndFlags) {
   const Range range(0, 10, true, false);
   EXPECT_TRUE(range == Range(0, 10, true, false));
@@ -199,13 +294,25 @@ TEST(Range, DisplaysItsEnds) {
        "  Start Range Display   \nMinValue: a;  MaxValue: b; High End included; lower End not included\n End "
        "of Range "
        "Display\n\n"},
+      {Range(1.0 / 3, kSysmis, true, true),
+       "  Start Range Display   \nMinValue: 0.333333;  MaxValue: -1.79769e+308; High End included; lower End "
+       "included\n "
+       "End of Range "
+       "Display\n\n"},
+      {Range(static_cast<ScoreValue*>(nullptr), nullptr, false, false),
+       "  Start Range Display   \nMinValue: -inf;  MaxValue: inf; High End not included; lower End not "
+       "included\n "
+       "End of Range "
+       "Display\n\n"},
       {Range(new DateTimeValue(86400.0, kDateVal)),
        "  Start Range Display   \nMinValue: 86400;  MaxValue: 86400; High End included; lower End included\n "
        "End of Range "
        "Display\n\n"},
   };
+  const kestrel_tests::CommaLocale comma;
   for (const Row& row : kRows) {
     std::ostringstream out;
+    out.precision(3);
     row.range.Display(out);
     EXPECT_EQ(out.str(), row.text);
   }
