@@ -18,32 +18,34 @@ class ScoreDictVar;
 /// The categories in the order of results, and the equations that are evaluated for them.
 ///
 /// The categories are those of the tables, in document order; of an ordinal target with a list of values they
-/// stand in the list's order. With y the values of the equations and F the method's function
-/// (LinkFunctions.h):
-///   softmax, simplemax           p_j = exp(y_j) / sum exp(y_i), p_j = y_j / sum y_i; one table a category. A
-///   single
-///                                table with softmax serves a target with two values: the other's y is 0.
-///                                These two do not depend on an order and so serve ordinal targets as well;
-///   other methods, two values    p = F(y) for one category, 1 - p for the other. The equation is the single
-///   table, or
-///                                the first of two; the second when the first is constantly zero, as
-///                                producers write it for a reference category that happens to come first;
-///   other methods, three or more, ordinal target
-///                                p_1 = F(y_1), p_j = F(y_j) - F(y_(j-1)), and the last category has 1 -
-///                                F(y_(k-1)). A table for the last category is not evaluated and may be
-///                                absent;
-///   "none", three or more, other target
-///                                p_j = y_j, and the last category has what is left of 1. A table for the
-///                                last category is not evaluated; one value of the target may be without
-///                                table.
+/// stand in the list's order. With y the values of the equations and F the method's function (see
+/// LinkFunctions.h):
+///
+///   softmax, simplemax
+///     p_j = exp(y_j) / sum exp(y_i), p_j = y_j / sum y_i; one table a category. A single table with softmax
+///     serves a target with two values: the other's y is 0. These two do not depend on an order and so serve
+///     ordinal targets as well.
+///   other methods, two values
+///     p = F(y) for one category, 1 - p for the other. The equation is the single table, or the first of two;
+///     the second when the first is constantly zero, as producers write it for a reference category that
+///     happens to come first.
+///   other methods, three or more values of an ordinal target
+///     p_1 = F(y_1), p_j = F(y_j) - F(y_(j-1)), and the last category has 1 - F(y_(k-1)). A table for the
+///     last category is not evaluated and may be absent.
+///   "none", three or more values of another target
+///     p_j = y_j, and the last category has what is left of 1. A table for the last category is not
+///     evaluated; one value of the target may be without table.
+///
 /// Everything else is refused: "exp", and the links with three or more categories that have no order.
 class CategoryPlan {
  public:
   /// Which table an equation comes from; kConstantZero is an equation without table.
   static constexpr int kConstantZero = -1;
 
-  /// Makes the plan of a model. tables  all of the model's, each with its category; must outlive the
-  /// construction only, but `GetEquations` speaks of its positions. target  null when the model has none.
+  /// Makes the plan of a model.
+  /// tables  all of the model's, each with its category; not kept, but `GetEquations` speaks of positions in
+  ///         it.
+  /// target  null when the model has none.
   /// Errors (KestrelException without place): code 1 for categories given twice or missing, code 5 for a
   /// method that does not fit.
   CategoryPlan(Normalization method, const std::vector<RegressionTable>& tables, const ScoreDictVar* target);

@@ -20,12 +20,12 @@ namespace MCKestrel_800 {
 ///
 /// Errors, all KestrelException with the place in the document:
 ///   code 1   an element that does not belong here, a predictor without name, a `PredictorTerm` without
-///   `FieldRef`; code 3   a number that is none; code 4   an attribute that is required (`name`, `field`,
-///   `coefficient`, `value`, a classification's
+///            `FieldRef`;
+///   code 3   a number that is none;
+///   code 4   an attribute that is required (`name`, `field`, `coefficient`, `value`, a classification's
 ///            `targetCategory`) and absent;
 ///   code 7   a `targetCategory` or a `CategoricalPredictor`'s value that is no value of its field, or not
-///   one of the
-///            categories that the field lists;
+///            one of the categories that the field lists;
 ///   code 8   a predictor that is not one of the active fields;
 ///   code 11  a text field where a number is needed.
 class RegressionTableReader {

@@ -20,8 +20,8 @@ namespace MCKestrel_800 {
 /// readers of dictionary, mining schema and tables and of CategoryPlan:
 ///   code 1   a regression with more than one table, several targets without a choice;
 ///   code 4   no `RegressionModel` as a child of the root, no `MiningSchema`, no `RegressionTable`, no
-///   `functionName`; code 5   another function than regression and classification, a model marked as not
-///   scorable, a
+///            `functionName`;
+///   code 5   another function than regression and classification, a model marked as not scorable, a
 ///            `normalizationMethod` that does not fit the function;
 ///   code 6   an unknown `normalizationMethod`;
 ///   code 8   `targetFieldName` is needed and not in the dictionary;

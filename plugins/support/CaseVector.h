@@ -21,20 +21,16 @@ namespace MCKestrel_800 {
 
 class ScoreCaseRecord;
 
-/// The inputs of a model as slots, one double each:
-///   a number slot    the number itself (of a date/time the number in its field's unit), or the
-///   system-missing
-///                    value;
-///   a category slot  the category's code (see ValueRules), kMissingCategory, or kOtherCategory for a value
-///   that has no
-///                    code: valid in a field that lists no categories, or invalid and used as it is.
-/// Values are treated as MiningSchema says. Two rules fill what it leaves open:
-///   - the empty text in a category slot is missing, rather than invalid, when the field lists categories and
-///   it is not
-///     one of them: it is what ScoreCaseRecord::SetMissingValue leaves behind;
-///   - an invalid value that a number slot uses as it is counts as the number that its text reads as, or as
-///   missing when
-///     it reads as none.
+/// The inputs of a model as slots, one double each.
+///   A number slot holds the number itself (of a date/time the number in its field's unit) or the
+///     system-missing value.
+///   A category slot holds the category's code (see ValueRules), kMissingCategory, or kOtherCategory for a
+///     value that has no code: valid in a field that lists no categories, or invalid and used as it is.
+/// Values are treated as MiningSchema says. Two rules fill what it leaves open.
+///   The empty text in a category slot is missing, rather than invalid, when the field lists categories and
+///     it is not one of them: it is what ScoreCaseRecord::SetMissingValue leaves behind.
+///   An invalid value that a number slot uses as it is counts as the number that its text reads as, or as
+///     missing when it reads as none.
 ///
 /// Building: AddNumber and AddCategory for each input that the model reads, in any order, repeated as it
 /// likes; then Seal. Fields and their variables must outlive the vector. Afterwards Fill is called for each
@@ -56,9 +52,10 @@ class CaseVector {
   CaseVector(const CaseVector&) = delete;
   CaseVector& operator=(const CaseVector&) = delete;
 
-  /// The slot that holds the field as a number; the field must not be a text. An input asked for twice is one
-  /// slot. map_missing_to  takes the place of a value that is still missing after the field's own treatment;
-  /// NaN for none.
+  /// The slot that holds the field as a number; the field must not be a text. An input asked for twice is
+  /// one slot.
+  /// map_missing_to  takes the place of a value that is still missing after the field's own treatment; NaN
+  ///                 for none.
   int AddNumber(const MiningField& field, double map_missing_to = std::numeric_limits<double>::quiet_NaN());
 
   /// The slot that holds the field as a category code. An input asked for twice is one slot.

@@ -24,16 +24,14 @@ class ScoreDictionary;
 /// The fields of a `MiningSchema` element in document order.
 ///
 /// Treatment of a value, in this order:
-///   missing  (absent, system-missing or user-missing, which includes numbers outside a field's `Interval`):
-///            `missingValueReplacement` takes its place where there is one; `missingValueTreatment` says how
-///            that was found and matters only as "returnInvalid", which refuses the case and goes before a
-///            replacement;
-///   invalid  (of the wrong kind, or a category that the field does not list): `invalidValueTreatment`; as
-///   missing it
-///            is replaced like a missing one; as it is, it is neither a listed category nor an outlier;
-///   outlier  (a valid number of a continuous field below `lowValue` or above `highValue`): the margin takes
-///   its place,
-///            or it counts as missing and is replaced like a missing one.
+///   missing (absent, system-missing or user-missing, which includes numbers outside a field's `Interval`)
+///     `missingValueReplacement` takes its place where there is one. `missingValueTreatment` says how that
+///     was found; it matters only as "returnInvalid", which refuses the case and goes before a replacement.
+///   invalid (of the wrong kind, or a category that the field does not list)
+///     `invalidValueTreatment`. As missing, it is replaced like a missing one; as it is, it is neither a
+///     listed category nor an outlier.
+///   outlier (a valid number of a continuous field below `lowValue` or above `highValue`)
+///     The margin takes its place, or it counts as missing and is replaced like a missing one.
 /// `importance` is not used. `optype` replaces the data field's measurement level in this model's dictionary.
 class MiningSchema {
  public:
@@ -44,10 +42,11 @@ class MiningSchema {
   /// Reads the element. `dictionary` must belong to this model alone, because `optype` changes its variables;
   /// it must outlive the schema. Errors, all KestrelException with the place in the document:
   ///   code 1   another element than `MiningField` or `Extension`, no field at all, an empty name, a field
-  ///   given twice; code 3   `lowValue` or `highValue` is not a number; code 4   a field without name; code 6
-  ///   an attribute outside its vocabulary, "asValue" without `invalidValueReplacement`, or a `lowValue`
-  ///   above
-  ///            the `highValue`;
+  ///            given twice;
+  ///   code 3   `lowValue` or `highValue` is not a number;
+  ///   code 4   a field without name;
+  ///   code 6   an attribute outside its vocabulary, "asValue" without `invalidValueReplacement`, or a
+  ///            `lowValue` above the `highValue`;
   ///   code 7   a replacement that is not a value of the field's type;
   ///   code 8   a field that is not in the dictionary;
   ///   code 11  a text field made continuous.

@@ -106,44 +106,47 @@ TEST(MiningSchema, OptypeReplacesTheLevelInThisDictionary) {
   EXPECT_EQ(dictionary->GetVar("g")->GetMLevel(), ScoreDictVar::kOrdinal);
 }
 
+struct RefusalRow {
+  const char* why;
+  const char* fields;
+  int code;
+  const char* message;
+};
+
+const RefusalRow kRefusalRows[] = {
+    {"no field", "", 1, "<MiningSchema> is EMPTY!!"},
+    {"extensions are no fields", "<Extension/>", 1, "<MiningSchema> is EMPTY!!"},
+    {"another element", "<DataField name=\"x\"/>", 1, "<MiningField> or <Extension> is required here!!"},
+    {"no name", "<MiningField/>", 4, "Attribute name is missing from Node \"MiningField\""},
+    {"empty name", "<MiningField name=\"\"/>", 1, "<MiningField>'s name can't be null string !!"},
+    {"unknown field", "<MiningField name=\"X\"/>", 8, "Variable X not in the dictionary!"},
+    {"given twice", "<MiningField name=\"x\"/><MiningField name=\"x\"/>", 1, "x: Duplicated MiningField!"},
+    {"usage", "<MiningField name=\"x\" usageType=\"Active\"/>", 6, "x: invalid usageType -- Active"},
+    {"empty usage", "<MiningField name=\"x\" usageType=\"\"/>", 6, "x: invalid usageType -- "},
+    {"optype", "<MiningField name=\"x\" optype=\"scale\"/>", 6, "x: invalid optype -- scale"},
+    {"outliers", "<MiningField name=\"x\" outliers=\"asMissing\"/>", 6, "x: invalid outliers -- asMissing"},
+    {"missing treatment", "<MiningField name=\"x\" missingValueTreatment=\"asMax\"/>", 6,
+     "x: invalid missingValueTreatment -- asMax"},
+    {"invalid treatment", "<MiningField name=\"x\" invalidValueTreatment=\"ignore\"/>", 6,
+     "x: invalid invalidValueTreatment -- ignore"},
+    {"low value", "<MiningField name=\"x\" lowValue=\"1,5\"/>", 3, "x: invalid lowValue -- 1,5"},
+    {"high value", "<MiningField name=\"x\" highValue=\"much\"/>", 3, "x: invalid highValue -- much"},
+    {"margins the wrong way", "<MiningField name=\"x\" lowValue=\"2\" highValue=\"1\"/>", 6,
+     "x: lowValue is above highValue"},
+    {"replacement of the wrong type", "<MiningField name=\"x\" missingValueReplacement=\"none\"/>", 7,
+     "x: invalid missingValueReplacement -- none"},
+    {"empty replacement of a number", "<MiningField name=\"n\" missingValueReplacement=\"\"/>", 7,
+     "n: invalid missingValueReplacement -- "},
+    {"invalid replacement", "<MiningField name=\"x\" invalidValueReplacement=\"none\"/>", 7,
+     "x: invalid invalidValueReplacement -- none"},
+    {"asValue without value", "<MiningField name=\"x\" invalidValueTreatment=\"asValue\"/>", 6,
+     "x: invalidValueReplacement is required"},
+    {"continuous text", "<MiningField name=\"g\" optype=\"continuous\"/>", 11,
+     "g: string variable can't be continuous!!"},
+};
+
 TEST(MiningSchema, Refusals) {
-  const struct {
-    const char* why;
-    const char* fields;
-    int code;
-    const char* message;
-  } kRows[] = {
-      {"no field", "", 1, "<MiningSchema> is EMPTY!!"},
-      {"extensions are no fields", "<Extension/>", 1, "<MiningSchema> is EMPTY!!"},
-      {"another element", "<DataField name=\"x\"/>", 1, "<MiningField> or <Extension> is required here!!"},
-      {"no name", "<MiningField/>", 4, "Attribute name is missing from Node \"MiningField\""},
-      {"empty name", "<MiningField name=\"\"/>", 1, "<MiningField>'s name can't be null string !!"},
-      {"unknown field", "<MiningField name=\"X\"/>", 8, "Variable X not in the dictionary!"},
-      {"given twice", "<MiningField name=\"x\"/><MiningField name=\"x\"/>", 1, "x: Duplicated MiningField!"},
-      {"usage", "<MiningField name=\"x\" usageType=\"Active\"/>", 6, "x: invalid usageType -- Active"},
-      {"empty usage", "<MiningField name=\"x\" usageType=\"\"/>", 6, "x: invalid usageType -- "},
-      {"optype", "<MiningField name=\"x\" optype=\"scale\"/>", 6, "x: invalid optype -- scale"},
-      {"outliers", "<MiningField name=\"x\" outliers=\"asMissing\"/>", 6, "x: invalid outliers -- asMissing"},
-      {"missing treatment", "<MiningField name=\"x\" missingValueTreatment=\"asMax\"/>", 6,
-       "x: invalid missingValueTreatment -- asMax"},
-      {"invalid treatment", "<MiningField name=\"x\" invalidValueTreatment=\"ignore\"/>", 6,
-       "x: invalid invalidValueTreatment -- ignore"},
-      {"low value", "<MiningField name=\"x\" lowValue=\"1,5\"/>", 3, "x: invalid lowValue -- 1,5"},
-      {"high value", "<MiningField name=\"x\" highValue=\"much\"/>", 3, "x: invalid highValue -- much"},
-      {"margins the wrong way", "<MiningField name=\"x\" lowValue=\"2\" highValue=\"1\"/>", 6,
-       "x: lowValue is above highValue"},
-      {"replacement of the wrong type", "<MiningField name=\"x\" missingValueReplacement=\"none\"/>", 7,
-       "x: invalid missingValueReplacement -- none"},
-      {"empty replacement of a number", "<MiningField name=\"n\" missingValueReplacement=\"\"/>", 7,
-       "n: invalid missingValueReplacement -- "},
-      {"invalid replacement", "<MiningField name=\"x\" invalidValueReplacement=\"none\"/>", 7,
-       "x: invalid invalidValueReplacement -- none"},
-      {"asValue without value", "<MiningField name=\"x\" invalidValueTreatment=\"asValue\"/>", 6,
-       "x: invalidValueReplacement is required"},
-      {"continuous text", "<MiningField name=\"g\" optype=\"continuous\"/>", 11,
-       "g: string variable can't be continuous!!"},
-  };
-  for (const auto& row : kRows) {
+  for (const auto& row : kRefusalRows) {
     const auto dictionary = TestDictionary();
     ExpectFault([&] { ReadSchema(row.fields, *dictionary); }, row.code, row.message, row.why);
   }

@@ -41,185 +41,190 @@ double Predict(ScoreModel& model, const Cells& cells) {
                                            : result.GetPrediction()->GetDouble();
 }
 
+/// No prediction.
+const double kNone = std::numeric_limits<double>::quiet_NaN();
+
+struct EquationRow {
+  const char* why;
+  const char* table;
+  Cells cells;
+  double expected;  // NaN: no prediction
+};
+
+const EquationRow kEquationRows[] = {
+    {"an intercept alone", "<RegressionTable intercept='2.5'/>", {}, 2.5},
+    {"nothing at all", "<RegressionTable/>", {}, 0.0},
+    {"the intercept is 0 when absent",
+     "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
+     {{"x", 3.0}},
+     6.0},
+    {"two numbers",
+     "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
+     "<NumericPredictor name='z' coefficient='-0.5'/></RegressionTable>",
+     {{"x", 3.0}, {"z", 8.0}},
+     3.0},
+    {"one number twice",
+     "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
+     "<NumericPredictor name='x' exponent='2' coefficient='3'/></RegressionTable>",
+     {{"x", -2.0}},
+     9.0},
+    {"six numbers in a row",
+     "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='1'/>"
+     "<NumericPredictor name='z' coefficient='10'/><NumericPredictor name='n' coefficient='100'/>"
+     "<NumericPredictor name='x' coefficient='1000'/><NumericPredictor name='z' coefficient='10000'/>"
+     "<NumericPredictor name='n' coefficient='100000'/></RegressionTable>",
+     {{"x", 1.0}, {"z", 2.0}, {"n", 3.0}},
+     1 + 1 + 20 + 300 + 1000 + 20000 + 300000},
+    {"cube of a negative base",
+     "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='2'/>"
+     "</RegressionTable>",
+     {{"x", -2.0}},
+     -16.0},
+    {"a large exponent",
+     "<RegressionTable><NumericPredictor name='x' exponent='2000' coefficient='1'/>"
+     "</RegressionTable>",
+     {{"x", -1.0}},
+     1.0},
+    {"exponent 0 is 1 for every base",
+     "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='2'/>"
+     "</RegressionTable>",
+     {{"x", 0.0}},
+     2.0},
+    {"a negative exponent",
+     "<RegressionTable><NumericPredictor name='x' exponent='-2' coefficient='2'/>"
+     "</RegressionTable>",
+     {{"x", 4.0}},
+     0.125},
+    {"zero to a negative power has no value",
+     "<RegressionTable><NumericPredictor name='x' exponent='-2' "
+     "coefficient='2'/></RegressionTable>",
+     {{"x", 0.0}},
+     kNone},
+    {"a broken exponent",
+     "<RegressionTable><NumericPredictor name='x' exponent='0.5' coefficient='2'/>"
+     "</RegressionTable>",
+     {{"x", 2.25}},
+     3.0},
+    {"a broken exponent of a negative base has no value",
+     "<RegressionTable><NumericPredictor name='x' "
+     "exponent='0.5' coefficient='2'/></RegressionTable>",
+     {{"x", -1.0}},
+     kNone},
+    {"overflow has no value",
+     "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='1'/>"
+     "</RegressionTable>",
+     {{"x", 1e200}},
+     kNone},
+    {"a number that is none has no value",
+     "<RegressionTable><NumericPredictor name='x' coefficient='1'/>"
+     "</RegressionTable>",
+     {{"x", std::nan("")}},
+     kNone},
+    {"a category",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' coefficient='2'/>"
+     "<CategoricalPredictor name='g' value='b' coefficient='4'/></RegressionTable>",
+     {{"g", "b  "}},
+     5.0},
+    {"a category without coefficient",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
+     "coefficient='2'/><CategoricalPredictor name='g' value='b' coefficient='4'/></RegressionTable>",
+     {{"g", "c"}},
+     1.0},
+    {"a missing category adds nothing",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
+     "coefficient='2'/></RegressionTable>",
+     {{"g", {}}},
+     1.0},
+    {"a category given twice counts twice",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='g' "
+     "value='a' coefficient='2'/><CategoricalPredictor name='g' value='a' "
+     "coefficient='3'/></RegressionTable>",
+     {{"g", "a"}},
+     6.0},
+    {"a coded category",
+     "<RegressionTable><CategoricalPredictor name='n' value='3' coefficient='7'/>"
+     "<CategoricalPredictor name='n' value='1' coefficient='5'/></RegressionTable>",
+     {{"n", 3.0}},
+     7.0},
+    {"a code and a number of one field",
+     "<RegressionTable><NumericPredictor name='n' coefficient='10'/>"
+     "<CategoricalPredictor name='n' value='2' coefficient='5'/></RegressionTable>",
+     {{"n", 2.0}},
+     25.0},
+    {"a value of a continuous field",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='0.5' "
+     "coefficient='5'/></RegressionTable>",
+     {{"x", 0.5}},
+     6.0},
+    {"a value that no case can have",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='1e999' "
+     "coefficient='5'/></RegressionTable>",
+     {{"x", 0.5}},
+     1.0},
+    {"a text without list",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
+     "coefficient='5'/></RegressionTable>",
+     {{"t", "p"}},
+     6.0},
+    {"another text without list",
+     "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
+     "coefficient='5'/></RegressionTable>",
+     {{"t", "q"}},
+     1.0},
+    {"fields by turns",
+     "<RegressionTable><CategoricalPredictor name='g' value='a' coefficient='1'/>"
+     "<CategoricalPredictor name='n' value='1' coefficient='2'/><CategoricalPredictor name='g' value='b' "
+     "coefficient='4'/><CategoricalPredictor name='n' value='2' coefficient='8'/></RegressionTable>",
+     {{"g", "b"}, {"n", 1.0}},
+     6.0},
+    {"a product",
+     "<RegressionTable intercept='1'><PredictorTerm coefficient='2'><FieldRef field='x'/>"
+     "<FieldRef field='z'/><FieldRef field='x'/></PredictorTerm></RegressionTable>",
+     {{"x", 3.0}, {"z", 5.0}},
+     91.0},
+    {"a product of one",
+     "<RegressionTable><PredictorTerm name='p' coefficient='2'><FieldRef field='n'/>"
+     "</PredictorTerm></RegressionTable>",
+     {{"n", 3.0}},
+     6.0},
+    {"a missing factor",
+     "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x'/></PredictorTerm>"
+     "</RegressionTable>",
+     {{"x", kSysmis}},
+     kNone},
+    {"a missing factor with a value for it",
+     "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x' "
+     "mapMissingTo='4'/></PredictorTerm></RegressionTable>",
+     {{"x", kSysmis}},
+     8.0},
+    {"a missing number",
+     "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
+     {{"x", kSysmis}},
+     kNone},
+    {"with coefficient 0, too",
+     "<RegressionTable><NumericPredictor name='x' coefficient='0'/></RegressionTable>",
+     {{"x", {}}},
+     kNone},
+    {"with exponent 0, too",
+     "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='1'/>"
+     "</RegressionTable>",
+     {{"x", {}}},
+     kNone},
+    {"what no term names may be missing",
+     "<RegressionTable><NumericPredictor name='x' coefficient='2'/>"
+     "</RegressionTable>",
+     {{"x", 1.0}, {"z", kSysmis}, {"g", "no category"}},
+     2.0},
+    {"extensions everywhere",
+     "<RegressionTable intercept='1'><Extension/><NumericPredictor name='x' "
+     "coefficient='2'><Extension/></NumericPredictor><PredictorTerm coefficient='3'><Extension/>"
+     "<FieldRef field='x'><Extension/></FieldRef></PredictorTerm></RegressionTable>",
+     {{"x", 1.0}},
+     6.0},
+};
+
 TEST(RegressionModel, SumsItsTerms) {
-  const double none = std::numeric_limits<double>::quiet_NaN();
-  const struct {
-    const char* why;
-    const char* table;
-    Cells cells;
-    double expected;  // NaN: no prediction
-  } kRows[] = {
-      {"an intercept alone", "<RegressionTable intercept='2.5'/>", {}, 2.5},
-      {"nothing at all", "<RegressionTable/>", {}, 0.0},
-      {"the intercept is 0 when absent",
-       "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
-       {{"x", 3.0}},
-       6.0},
-      {"two numbers",
-       "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
-       "<NumericPredictor name='z' coefficient='-0.5'/></RegressionTable>",
-       {{"x", 3.0}, {"z", 8.0}},
-       3.0},
-      {"one number twice",
-       "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='2'/>"
-       "<NumericPredictor name='x' exponent='2' coefficient='3'/></RegressionTable>",
-       {{"x", -2.0}},
-       9.0},
-      {"six numbers in a row",
-       "<RegressionTable intercept='1'><NumericPredictor name='x' coefficient='1'/>"
-       "<NumericPredictor name='z' coefficient='10'/><NumericPredictor name='n' coefficient='100'/>"
-       "<NumericPredictor name='x' coefficient='1000'/><NumericPredictor name='z' coefficient='10000'/>"
-       "<NumericPredictor name='n' coefficient='100000'/></RegressionTable>",
-       {{"x", 1.0}, {"z", 2.0}, {"n", 3.0}},
-       1 + 1 + 20 + 300 + 1000 + 20000 + 300000},
-      {"cube of a negative base",
-       "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='2'/>"
-       "</RegressionTable>",
-       {{"x", -2.0}},
-       -16.0},
-      {"a large exponent",
-       "<RegressionTable><NumericPredictor name='x' exponent='2000' coefficient='1'/>"
-       "</RegressionTable>",
-       {{"x", -1.0}},
-       1.0},
-      {"exponent 0 is 1 for every base",
-       "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='2'/>"
-       "</RegressionTable>",
-       {{"x", 0.0}},
-       2.0},
-      {"a negative exponent",
-       "<RegressionTable><NumericPredictor name='x' exponent='-2' coefficient='2'/>"
-       "</RegressionTable>",
-       {{"x", 4.0}},
-       0.125},
-      {"zero to a negative power has no value",
-       "<RegressionTable><NumericPredictor name='x' exponent='-2' "
-       "coefficient='2'/></RegressionTable>",
-       {{"x", 0.0}},
-       none},
-      {"a broken exponent",
-       "<RegressionTable><NumericPredictor name='x' exponent='0.5' coefficient='2'/>"
-       "</RegressionTable>",
-       {{"x", 2.25}},
-       3.0},
-      {"a broken exponent of a negative base has no value",
-       "<RegressionTable><NumericPredictor name='x' "
-       "exponent='0.5' coefficient='2'/></RegressionTable>",
-       {{"x", -1.0}},
-       none},
-      {"overflow has no value",
-       "<RegressionTable><NumericPredictor name='x' exponent='3' coefficient='1'/>"
-       "</RegressionTable>",
-       {{"x", 1e200}},
-       none},
-      {"a number that is none has no value",
-       "<RegressionTable><NumericPredictor name='x' coefficient='1'/>"
-       "</RegressionTable>",
-       {{"x", std::nan("")}},
-       none},
-      {"a category",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' coefficient='2'/>"
-       "<CategoricalPredictor name='g' value='b' coefficient='4'/></RegressionTable>",
-       {{"g", "b  "}},
-       5.0},
-      {"a category without coefficient",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
-       "coefficient='2'/><CategoricalPredictor name='g' value='b' coefficient='4'/></RegressionTable>",
-       {{"g", "c"}},
-       1.0},
-      {"a missing category adds nothing",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='g' value='a' "
-       "coefficient='2'/></RegressionTable>",
-       {{"g", {}}},
-       1.0},
-      {"a category given twice counts twice",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='g' "
-       "value='a' coefficient='2'/><CategoricalPredictor name='g' value='a' "
-       "coefficient='3'/></RegressionTable>",
-       {{"g", "a"}},
-       6.0},
-      {"a coded category",
-       "<RegressionTable><CategoricalPredictor name='n' value='3' coefficient='7'/>"
-       "<CategoricalPredictor name='n' value='1' coefficient='5'/></RegressionTable>",
-       {{"n", 3.0}},
-       7.0},
-      {"a code and a number of one field",
-       "<RegressionTable><NumericPredictor name='n' coefficient='10'/>"
-       "<CategoricalPredictor name='n' value='2' coefficient='5'/></RegressionTable>",
-       {{"n", 2.0}},
-       25.0},
-      {"a value of a continuous field",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='0.5' "
-       "coefficient='5'/></RegressionTable>",
-       {{"x", 0.5}},
-       6.0},
-      {"a value that no case can have",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='x' value='1e999' "
-       "coefficient='5'/></RegressionTable>",
-       {{"x", 0.5}},
-       1.0},
-      {"a text without list",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
-       "coefficient='5'/></RegressionTable>",
-       {{"t", "p"}},
-       6.0},
-      {"another text without list",
-       "<RegressionTable intercept='1'><CategoricalPredictor name='t' value='p' "
-       "coefficient='5'/></RegressionTable>",
-       {{"t", "q"}},
-       1.0},
-      {"fields by turns",
-       "<RegressionTable><CategoricalPredictor name='g' value='a' coefficient='1'/>"
-       "<CategoricalPredictor name='n' value='1' coefficient='2'/><CategoricalPredictor name='g' value='b' "
-       "coefficient='4'/><CategoricalPredictor name='n' value='2' coefficient='8'/></RegressionTable>",
-       {{"g", "b"}, {"n", 1.0}},
-       6.0},
-      {"a product",
-       "<RegressionTable intercept='1'><PredictorTerm coefficient='2'><FieldRef field='x'/>"
-       "<FieldRef field='z'/><FieldRef field='x'/></PredictorTerm></RegressionTable>",
-       {{"x", 3.0}, {"z", 5.0}},
-       91.0},
-      {"a product of one",
-       "<RegressionTable><PredictorTerm name='p' coefficient='2'><FieldRef field='n'/>"
-       "</PredictorTerm></RegressionTable>",
-       {{"n", 3.0}},
-       6.0},
-      {"a missing factor",
-       "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x'/></PredictorTerm>"
-       "</RegressionTable>",
-       {{"x", kSysmis}},
-       none},
-      {"a missing factor with a value for it",
-       "<RegressionTable><PredictorTerm coefficient='2'><FieldRef field='x' "
-       "mapMissingTo='4'/></PredictorTerm></RegressionTable>",
-       {{"x", kSysmis}},
-       8.0},
-      {"a missing number",
-       "<RegressionTable><NumericPredictor name='x' coefficient='2'/></RegressionTable>",
-       {{"x", kSysmis}},
-       none},
-      {"with coefficient 0, too",
-       "<RegressionTable><NumericPredictor name='x' coefficient='0'/></RegressionTable>",
-       {{"x", {}}},
-       none},
-      {"with exponent 0, too",
-       "<RegressionTable><NumericPredictor name='x' exponent='0' coefficient='1'/>"
-       "</RegressionTable>",
-       {{"x", {}}},
-       none},
-      {"what no term names may be missing",
-       "<RegressionTable><NumericPredictor name='x' coefficient='2'/>"
-       "</RegressionTable>",
-       {{"x", 1.0}, {"z", kSysmis}, {"g", "no category"}},
-       2.0},
-      {"extensions everywhere",
-       "<RegressionTable intercept='1'><Extension/><NumericPredictor name='x' "
-       "coefficient='2'><Extension/></NumericPredictor><PredictorTerm coefficient='3'><Extension/>"
-       "<FieldRef field='x'><Extension/></FieldRef></PredictorTerm></RegressionTable>",
-       {{"x", 1.0}},
-       6.0},
-  };
-  for (const auto& row : kRows) {
+  for (const auto& row : kEquationRows) {
     SCOPED_TRACE(row.why);
     const auto model = Regression("", row.table);
     const double prediction = Predict(*model, row.cells);
