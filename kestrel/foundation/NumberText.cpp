@@ -1,5 +1,6 @@
 #include "kestrel/foundation/NumberText.h"
 
+#include <algorithm>
 #include <charconv>
 #include <limits>
 
@@ -9,6 +10,9 @@ namespace {
 
 bool IsDigit(char c) {
   return c >= '0' && c <= '9';
+}
+bool IsExponentLetter(char c) {
+  return c == 'e' || c == 'E';
 }
 const char* SkipSpace(const char* at, const char* end) {
   while (at != end && (*at == ' ' || (*at >= '\t' && *at <= '\r')))
@@ -22,7 +26,7 @@ bool IsTooLarge(const char* first, const char* last) {
   long long place = 0;
   bool point = false, seen = false;
   const char* at = first;
-  for (; at != last && *at != 'e' && *at != 'E'; ++at) {
+  for (; at != last && !IsExponentLetter(*at); ++at) {
     if (*at == '.') {
       point = true;
     } else if (IsDigit(*at)) {
@@ -59,33 +63,23 @@ bool ParseDouble(const char* first, const char* last, double& out) {
 }
 
 bool ReadDouble(std::string_view text, double& out) {
+  out = 0.0;
   const char* const end = text.data() + text.size();
   const char* at = SkipSpace(text.data(), end);
-  // What a stream takes as belonging to the number, whether or not it turns out to be one.
-  const char* const first = at;
+  const bool negative = at != end && *at == '-';
   if (at != end && (*at == '-' || *at == '+')) ++at;
-  bool point = false, digits = false;
-  for (; at != end; ++at) {
-    if (IsDigit(*at)) {
-      digits = true;
-    } else if (*at == '.' && !point) {
-      point = true;
-    } else {
-      break;
-    }
-  }
-  if (digits && at != end && (*at == 'e' || *at == 'E')) {
-    ++at;
-    if (at != end && (*at == '-' || *at == '+')) ++at;
-    while (at != end && IsDigit(*at))
-      ++at;
-  }
-  out = 0.0;
-  if (!ParseDouble(first, at, out)) return false;
-  constexpr double kLargest = std::numeric_limits<double>::max();
-  if (out >= -kLargest && out <= kLargest) return true;
-  out = out > 0.0 ? kLargest : -kLargest;
-  return false;
+  // from_chars alone would take a second sign, and names for infinity.
+  if (at == end || !(IsDigit(*at) || *at == '.')) return false;
+  double value = 0.0;
+  const std::from_chars_result read = std::from_chars(at, end, value);
+  if (read.ec == std::errc::invalid_argument) return false;
+  // A stream takes the letter of an exponent before it knows whether digits follow, and cannot give it back.
+  if (read.ptr != end && IsExponentLetter(*read.ptr) && std::none_of(at, read.ptr, IsExponentLetter))
+    return false;
+  const bool tooLarge = read.ec == std::errc::result_out_of_range && IsTooLarge(at, read.ptr);
+  if (tooLarge) value = std::numeric_limits<double>::max();
+  out = negative ? -value : value;
+  return !tooLarge;
 }
 
 bool StartsWithInfinity(std::string_view text) {
