@@ -48,11 +48,9 @@ std::string ListNames(const std::vector<std::string>& names) {
 
 CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*>& inputs,
                        const std::vector<std::string>& missing_texts)
-    : header_size_(table.GetHeader().size()),
-      missing_texts_(missing_texts),
-      record_(static_cast<int>(inputs.size())) {
+    : missing_texts_(missing_texts), record_(static_cast<int>(inputs.size())) {
   std::unordered_map<std::string, std::size_t> positions;
-  for (std::size_t column = 0; column < header_size_; ++column)
+  for (std::size_t column = 0; column < table.GetHeader().size(); ++column)
     positions.emplace(table.GetHeader()[column], column);
   std::vector<std::string> absent;
   for (const ScoreDictVar* variable : inputs) {
@@ -66,9 +64,10 @@ CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*
     AddSlot(inputs_.back());
   }
   if (absent.empty()) return;
-  throw ProgramError(kData, table.DescribePlace(table.GetHeaderLine()) + "the model reads " +
-                                ListNames(absent) + ", for which there is no column; the columns are " +
-                                ListNames(table.GetHeader()));
+  std::string text = table.DescribePlace(table.GetHeaderLine()) + "the model reads " + ListNames(absent) +
+                     ", for which there is no column; the columns are " + ListNames(table.GetHeader());
+  if (table.GetHeader().size() == 1) text += "\n  hint: --delimiter tells what separates the cells";
+  throw ProgramError(kData, text);
 }
 
 CaseReader::~CaseReader() = default;
@@ -164,11 +163,9 @@ bool CaseReader::SetDateTime(const Input& input, int slot, std::string_view cell
 }
 
 bool CaseReader::Read(const TableRow& row, Fault& fault) {
-  if (row.GetCellCount() != header_size_) {
+  if (!row.HasAllCells()) {
     fault.column = Fault::kWholeRow;
-    fault.text = "the row has " + std::to_string(row.GetCellCount()) +
-                 (row.GetCellCount() == 1 ? " cell" : " cells") + " where the header has " +
-                 std::to_string(header_size_);
+    fault.text = row.DescribeCellCount();
     return false;
   }
   int slot = 0;

@@ -72,7 +72,6 @@ class CaseReader {
   bool SetNumber(const Input& input, int slot, std::string_view cell);
   bool SetDateTime(const Input& input, int slot, std::string_view cell);
 
-  std::size_t header_size_;
   std::vector<Input> inputs_;
   std::vector<std::size_t> columns_;
   std::vector<std::string> missing_texts_;

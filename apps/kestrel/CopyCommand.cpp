@@ -23,11 +23,8 @@ ExitCode CopyTable(const CopyOptions& options) {
   std::vector<std::size_t> columns(width);
   std::iota(columns.begin(), columns.end(), std::size_t{0});
   table.ReadRows(columns, [&](const TableRow& row) {
-    if (row.GetCellCount() != width) {
-      throw ProgramError(kData, table.DescribePlace(row.GetLine()) + "the row has " +
-                                    std::to_string(row.GetCellCount()) + " cells where the header has " +
-                                    std::to_string(width));
-    }
+    if (!row.HasAllCells())
+      throw ProgramError(kData, table.DescribePlace(row.GetLine()) + row.DescribeCellCount());
     for (std::size_t column = 0; column < width; ++column) {
       const std::string_view cell = row.GetCell(column);
       if (cell.empty()) {

@@ -50,7 +50,8 @@ std::size_t FindHeaderEnd(const std::string& text) {
 
 /// The candidate that stands most often outside of quotation marks; of equally frequent ones the first.
 char FindDelimiter(std::string_view header) {
-  constexpr char kCandidates[] = {',', '\t', ';', '|'};
+  // In the order of trust: a tab is hardly ever part of a name.
+  constexpr char kCandidates[] = {'\t', ',', ';', '|'};
   std::size_t counts[256] = {};
   bool quoted = false;
   for (const char c : header) {
@@ -60,10 +61,14 @@ char FindDelimiter(std::string_view header) {
       ++counts[static_cast<unsigned char>(c)];
     }
   }
-  char best = kCandidates[0];
+  char best = ',';
+  std::size_t most = 0;
   for (const char candidate : kCandidates) {
-    if (counts[static_cast<unsigned char>(candidate)] > counts[static_cast<unsigned char>(best)])
+    const std::size_t count = counts[static_cast<unsigned char>(candidate)];
+    if (count > most) {
+      most = count;
       best = candidate;
+    }
   }
   return best;
 }
@@ -106,6 +111,11 @@ struct TableReader::Parser {
   csv_parser csv;
   std::exception_ptr failure;
 };
+
+std::string TableRow::DescribeCellCount() const {
+  return "the row has " + std::to_string(count_) + (count_ == 1 ? " cell" : " cells") +
+         " where the header has " + std::to_string(spans_.size());
+}
 
 TableReader::TableReader(InputFile& input, char delimiter)
     : input_(input), delimiter_(delimiter), parser_(std::make_unique<Parser>()) {}

@@ -20,12 +20,16 @@ class TableRow {
  public:
   /// The number of cells that the line has, which need not be the header's.
   std::size_t GetCellCount() const { return count_; }
+  bool HasAllCells() const { return count_ == spans_.size(); }
 
   /// The cell of a column; empty for a column that was not asked for or that the line does not have.
   std::string_view GetCell(std::size_t column) const {
     const Span span = spans_[column];
     return std::string_view(text_.data() + span.begin, span.length);
   }
+
+  /// What is wrong when it is not: "the row has 2 cells where the header has 3".
+  std::string DescribeCellCount() const;
 
   /// The line of the file that the row begins on, from 1. A cell may hold line ends, so a row may be several
   /// lines long.

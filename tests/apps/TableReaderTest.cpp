@@ -53,6 +53,8 @@ const Row kTables[] = {
     {"semicolons, commas in the cells", "a;b\n1,5;2\n", "[a][b] @2[1,5][2]"},
     {"vertical bars", "a|b\n1|2\n", "[a][b] @2[1][2]"},
     {"the most frequent separator of the header counts", "a;b,c;d\n1;2;3\n", "[a][b,c][d] @2[1][2][3]"},
+    {"of equally frequent ones the tab counts", "a,b\tc\n1\t2\n", "[a,b][c] @2[1][2]"},
+    {"then the comma", "a;b,c\n1,2\n", "[a;b][c] @2[1][2]"},
     {"separators in quotation marks do not", "\"a;b;c\",d\n1,2\n", "[a;b;c][d] @2[1][2]"},
     {"one column", "a\n1\n2\n", "[a] @2[1] @3[2]"},
     {"CR LF", "a,b\r\n1,2\r\n3,4\r\n", "[a][b] @2[1][2] @3[3][4]"},

@@ -1,0 +1,91 @@
+// Help, versions and command lines that are not right.
+
+#include <gtest/gtest.h>
+
+#include "tests/apps/KestrelProgram.h"
+
+namespace kestrel_tests {
+namespace {
+
+using Arguments = std::vector<std::string>;
+
+TEST(KestrelCommandLine, HasHelpEverywhereWithTheExitCodes) {
+  const Arguments rows[] = {
+      {"--help"},          {"-h"},          {"score", "--help"},     {"describe", "--help"},
+      {"check", "--help"}, {"score", "-h"}, {"copy-table", "--help"}};
+  for (const Arguments& arguments : rows) {
+    const ProgramOutcome outcome = RunKestrel(arguments);
+    EXPECT_EQ(outcome.exit_code, 0) << arguments[0];
+    EXPECT_EQ(outcome.errors, "") << arguments[0];
+    EXPECT_NE(
+        outcome.output.find("Exit codes:\n"
+                            "  0  done\n"
+                            "  1  done, but some cases have no prediction because they could not be read or "
+                            "scored\n"
+                            "  2  the command line is not right\n"
+                            "  3  the model's document cannot be used\n"
+                            "  4  the table cannot be used\n"
+                            "  5  a file or stream could not be read or written, or the memory did not "
+                            "suffice\n"),
+        std::string::npos)
+        << outcome.output;
+    EXPECT_NE(outcome.output.find("Usage: kestrel"), std::string::npos) << outcome.output;
+  }
+}
+
+TEST(KestrelCommandLine, HelpOfScoreTellsOfEveryOption) {
+  const std::string help = RunKestrel({"score", "--help"}).output;
+  for (const char* word : {"MODEL", "DATA", "-o,--output", "--models", "--delimiter", "--format",
+                           "{csv,jsonl}", "--keep[=NAME,...]", "--missing", "--on-error", "{stop,null}",
+                           "--stats", "--version", "probability_<category>"}) {
+    EXPECT_NE(help.find(word), std::string::npos) << word;
+  }
+}
+
+TEST(KestrelCommandLine, HasTheVersionEverywhere) {
+  for (const Arguments& arguments :
+       {Arguments{"--version"}, Arguments{"score", "--version"}, Arguments{"describe", "--version"},
+        Arguments{"check", "--version"}, Arguments{"copy-table", "--version"}}) {
+    const ProgramOutcome outcome = RunKestrel(arguments);
+    EXPECT_EQ(outcome.exit_code, 0);
+    EXPECT_EQ(outcome.output, "kestrel 8.0.0\n");
+    EXPECT_EQ(outcome.errors, "");
+  }
+}
+
+struct UsageRow {
+  Arguments arguments;
+  const char* want;
+};
+
+const UsageRow kUsageRows[] = {
+    {{}, "A subcommand is required"},
+    {{"scare"}, "A subcommand is required"},
+    {{"score"}, "MODEL is required"},
+    {{"describe"}, "MODEL is required"},
+    {{"check"}, "MODEL is required"},
+    {{"score", "m", "d", "e"}, "The following argument was not expected: e"},
+    {{"score", "m", "--frobnicate"}, "The following argument was not expected: --frobnicate"},
+    {{"score", "m", "--format", "xml"}, "--format: xml not in {csv,jsonl}"},
+    {{"score", "m", "--on-error", "panic"}, "--on-error: panic not in {stop,null}"},
+    {{"score", "m", "-o"}, "--output: 1 required FILE missing"},
+    {{"check", "m", "--json"}, "The following argument was not expected: --json"},
+};
+
+TEST(KestrelCommandLine, SaysWhatIsNotRight) {
+  for (const UsageRow& row : kUsageRows) {
+    const ProgramOutcome outcome = RunKestrel(row.arguments);
+    EXPECT_EQ(outcome.exit_code, 2) << row.want;
+    EXPECT_EQ(outcome.output, "") << row.want;
+    EXPECT_EQ(outcome.errors,
+              "kestrel: " + std::string(row.want) +
+                  "\n  hint: kestrel --help lists the commands, kestrel COMMAND --help its options\n");
+  }
+  const ProgramOutcome outcome = RunKestrel({"score", "m", "--delimiter", "x"});
+  EXPECT_EQ(outcome.exit_code, 2);
+  EXPECT_EQ(outcome.errors,
+            "kestrel: --delimiter: \"x\" is none of comma, tab, semicolon, pipe or the character itself\n");
+}
+
+}  // namespace
+}  // namespace kestrel_tests
