@@ -22,10 +22,6 @@ constexpr char kNoRoot[] = "\nInvalid XML document or no dtd file avaible in cur
 constexpr char kEmptyRootTag[] = "\nInvalid XML document: root tag name is empty!!";
 constexpr char kUnreadable[] = "Could not read model file";
 
-size_t MemoryQuota(size_t inputBytes, const DocumentLimits& limits) {
-  return limits.baseMemoryBytes + limits.memoryPerInputByte * inputBytes;
-}
-
 }  // namespace
 
 // The order matters: the parser's memory is the arena's, and so is the tree's, which is never released node
@@ -33,9 +29,13 @@ size_t MemoryQuota(size_t inputBytes, const DocumentLimits& limits) {
 class ParsedDocument::Impl {
  public:
   Impl(size_t inputBytes, const DocumentLimits& limits)
-      : arena_(MemoryQuota(inputBytes, limits),
-               limits.baseAllocations + limits.allocationsPerInputByte * inputBytes) {}
-  ~Impl() { delete parser_; }
+      : arena_(limits.baseMemoryBytes + limits.memoryPerInputByte * inputBytes,
+               limits.baseAllocations + limits.allocationsPerInputByte * inputBytes, limits.reserveBytes,
+               limits.reserveAllocations) {}
+  ~Impl() {
+    arena_.LiftQuota();  // for what the parser's destructors ask for
+    delete parser_;
+  }
   Impl(const Impl&) = delete;
   Impl& operator=(const Impl&) = delete;
 

@@ -25,6 +25,8 @@ struct DocumentLimits {
   size_t memoryPerInputByte = 100;            ///< and this much for each of its bytes
   size_t baseAllocations = 1000000;           ///< requests for memory that every document may make
   size_t allocationsPerInputByte = 2;         ///< and so many for each of its bytes
+  size_t reserveBytes = size_t{16} << 20;     ///< granted beyond that until the parser can be stopped safely
+  size_t reserveAllocations = 100000;         ///< the same in requests
   size_t maxDepth = 512;                      ///< elements inside one another
   size_t maxAttributes = 256;                 ///< of one element
   size_t maxNames = 4096;                     ///< distinct element and attribute names

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <exception>
 #include <xercesc/util/OutOfMemoryException.hpp>
 #include <xercesc/util/PlatformUtils.hpp>
 
@@ -39,8 +40,13 @@ struct alignas(std::max_align_t) LoadArena::Block {
   Block*& NextFree() { return *reinterpret_cast<Block**>(this + 1); }
 };
 
-LoadArena::LoadArena(size_t maxBytes, size_t maxCalls)
-    : maxBytes_(maxBytes), maxCalls_(maxCalls), nextChunkBytes_(kFirstChunkBytes) {}
+LoadArena::LoadArena(size_t maxBytes, size_t maxCalls, size_t reserveBytes, size_t reserveCalls)
+    : maxBytes_(maxBytes),
+      maxCalls_(maxCalls),
+      reserveBytes_(reserveBytes),
+      reserveCalls_(reserveCalls),
+      exceptionsBefore_(std::uncaught_exceptions()),
+      nextChunkBytes_(kFirstChunkBytes) {}
 
 LoadArena::~LoadArena() {
   for (Chunk* chunk = chunks_; chunk != nullptr;) {
@@ -60,10 +66,11 @@ void LoadArena::LiftQuota() {
 }
 
 void* LoadArena::allocate(XMLSize_t requested) {
-  if (++calls_ > maxCalls_ || requested > SIZE_MAX / 2) {
+  if (++calls_ > maxCalls_) {
     refused_ = true;
-    throw xercesc::OutOfMemoryException();
+    if (calls_ - maxCalls_ > reserveCalls_ && MayRefuse()) throw xercesc::OutOfMemoryException();
   }
+  if (requested > SIZE_MAX / 2) throw xercesc::OutOfMemoryException();
   const size_t size = RoundUp(std::max<size_t>(requested, 1));
   if (size >= kLargeBytes) return NewLargeBlock(size);
   if (void* const reused = Reuse(size)) return reused;
@@ -90,6 +97,11 @@ void LoadArena::deallocate(void* p) {
   Block*& first = reusable_[SizeClass(block->size)];
   block->NextFree() = first;
   first = block;
+}
+
+// While the parser unwinds its destructors must get what they ask for.
+bool LoadArena::MayRefuse() const {
+  return std::uncaught_exceptions() <= exceptionsBefore_;
 }
 
 // The number of the highest bit that is set.
@@ -131,8 +143,13 @@ void LoadArena::NewChunk(size_t atLeast) {
 }
 
 LoadArena::Chunk* LoadArena::TakeChunk(size_t bytes) {
-  void* memory = nullptr;
-  if (bytes <= maxBytes_ && heldBytes_ <= maxBytes_ - bytes) memory = AllocatePages(bytes);
+  if (bytes > maxBytes_ || heldBytes_ > maxBytes_ - bytes) {
+    refused_ = true;
+    // Held bytes may be past the quota already, by part of the reserve.
+    const bool fitsReserve = bytes <= reserveBytes_ && heldBytes_ + bytes - maxBytes_ <= reserveBytes_;
+    if (!fitsReserve && MayRefuse()) throw xercesc::OutOfMemoryException();
+  }
+  void* const memory = AllocatePages(bytes);
   if (memory == nullptr) {
     refused_ = true;
     throw xercesc::OutOfMemoryException();

@@ -23,7 +23,8 @@ class KESTREL_API LoadArena final : public xercesc::MemoryManager {
  public:
   /// maxBytes  memory that may be held from the system at one time.
   /// maxCalls  requests that may be made, so that work which frees what it takes ends as well.
-  LoadArena(size_t maxBytes, size_t maxCalls);
+  /// reserveBytes, reserveCalls  what is granted beyond that.
+  LoadArena(size_t maxBytes, size_t maxCalls, size_t reserveBytes, size_t reserveCalls);
   ~LoadArena() override;
   LoadArena(const LoadArena&) = delete;
   LoadArena& operator=(const LoadArena&) = delete;
@@ -36,7 +37,7 @@ class KESTREL_API LoadArena final : public xercesc::MemoryManager {
   /// From now on everything is granted: the tree is complete, and reading it must not fail.
   void LiftQuota();
 
-  bool IsRefused() const { return refused_; }         ///< whether a request was turned down
+  bool IsRefused() const { return refused_; }         ///< whether the quota was exceeded
   size_t GetHeldBytes() const { return heldBytes_; }  ///< memory held from the system
   size_t GetPeakBytes() const { return peakBytes_; }  ///< the most that was held at one time
   size_t GetCalls() const { return calls_; }          ///< requests made
@@ -45,6 +46,7 @@ class KESTREL_API LoadArena final : public xercesc::MemoryManager {
   struct Chunk;
   struct Block;
 
+  bool MayRefuse() const;
   static size_t SizeClass(size_t size);
   void* Reuse(size_t size);
   void* NewLargeBlock(size_t size);
@@ -54,6 +56,9 @@ class KESTREL_API LoadArena final : public xercesc::MemoryManager {
 
   size_t maxBytes_;
   size_t maxCalls_;
+  size_t reserveBytes_;
+  size_t reserveCalls_;
+  int exceptionsBefore_;  // under way when the load began
   size_t heldBytes_ = 0;
   size_t peakBytes_ = 0;
   size_t calls_ = 0;

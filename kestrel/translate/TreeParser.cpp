@@ -80,7 +80,7 @@ void TreeParser::NameCounter::Grow() {
 }
 
 TreeParser::TreeParser(LoadArena* arena, const DocumentLimits& limits)
-    : XercesDOMParser(nullptr, arena), limits_(limits) {
+    : XercesDOMParser(nullptr, arena), arena_(arena), limits_(limits) {
   setLoadExternalDTD(false);
   setValidationScheme(Val_Never);
   setDisableDefaultEntityResolution(true);
@@ -119,6 +119,7 @@ void TreeParser::startElement(const xercesc::XMLElementDecl& declaration, const 
   getScanner()->getReaderMgr()->getLastExtEntityInfo(place);
   elementLine_ = place.lineNumber;
   elementColumn_ = place.colNumber;
+  CheckQuota();
   if (open_.size() >= limits_.maxDepth || attributeCount > limits_.maxAttributes) throw LimitReached();
   pendingWhitespace_.clear();
   // Not through createElement, which checks the name again. The node is larger than its kind, so it must not
@@ -170,6 +171,7 @@ void TreeParser::Link(OpenElement& parent, xercesc::DOMNode* node, xercesc::DOMN
 }
 
 void TreeParser::docCharacters(const XMLCh* const text, const XMLSize_t length, const bool isCData) {
+  CheckQuota();
   if (open_.empty() || length == 0) return;
   if (open_.back().openText == nullptr && !isCData && IsWhitespace(text, length)) {
     pendingWhitespace_.append(ToUtf16(text), length);
@@ -211,6 +213,28 @@ void TreeParser::CloseElement() {
     pendingWhitespace_.clear();
   }
   open_.pop_back();
+}
+
+void TreeParser::elementDecl(const xercesc::DTDElementDecl& declaration, const bool isIgnored) {
+  CheckQuota();
+  XercesDOMParser::elementDecl(declaration, isIgnored);
+}
+
+void TreeParser::attDef(const xercesc::DTDElementDecl& element, const xercesc::DTDAttDef& attribute,
+                        const bool isIgnored) {
+  CheckQuota();
+  XercesDOMParser::attDef(element, attribute, isIgnored);
+}
+
+void TreeParser::entityDecl(const xercesc::DTDEntityDecl& declaration, const bool isParameter,
+                            const bool isIgnored) {
+  CheckQuota();
+  XercesDOMParser::entityDecl(declaration, isParameter, isIgnored);
+}
+
+void TreeParser::notationDecl(const xercesc::XMLNotationDecl& declaration, const bool isIgnored) {
+  CheckQuota();
+  XercesDOMParser::notationDecl(declaration, isIgnored);
 }
 
 void TreeParser::error(const unsigned int code, const XMLCh* const domain,

@@ -77,10 +77,18 @@ class TreeParser final : public xercesc::XercesDOMParser {
                   const XMLCh* const prefix) override;
   void docCharacters(const XMLCh* const text, const XMLSize_t length, const bool isCData) override;
   void ignorableWhitespace(const XMLCh* const text, const XMLSize_t length, const bool isCData) override;
-  void docComment(const XMLCh* const) override {}
-  void docPI(const XMLCh* const, const XMLCh* const) override {}
-  void startEntityReference(const xercesc::XMLEntityDecl&) override {}
+  void docComment(const XMLCh* const) override { CheckQuota(); }
+  void docPI(const XMLCh* const, const XMLCh* const) override { CheckQuota(); }
+  void startEntityReference(const xercesc::XMLEntityDecl&) override { CheckQuota(); }
   void endEntityReference(const xercesc::XMLEntityDecl&) override {}
+
+  // Declarations are kept as the base class keeps them; each is a point where the parser can be stopped.
+  void elementDecl(const xercesc::DTDElementDecl& declaration, const bool isIgnored) override;
+  void attDef(const xercesc::DTDElementDecl& element, const xercesc::DTDAttDef& attribute,
+              const bool isIgnored) override;
+  void entityDecl(const xercesc::DTDEntityDecl& declaration, const bool isParameter,
+                  const bool isIgnored) override;
+  void notationDecl(const xercesc::XMLNotationDecl& declaration, const bool isIgnored) override;
 
   void error(const unsigned int code, const XMLCh* const domain,
              const xercesc::XMLErrorReporter::ErrTypes type, const XMLCh* const text,
@@ -112,6 +120,9 @@ class TreeParser final : public xercesc::XercesDOMParser {
     size_t count_ = 0;
   };
 
+  void CheckQuota() const {
+    if (arena_->IsRefused()) throw LimitReached();
+  }
   void CountName(const XMLCh* pooledName);
   void AddAttributes(TreeElement* element, const xercesc::RefVectorOf<xercesc::XMLAttr>& attributes,
                      XMLSize_t count);
@@ -120,6 +131,7 @@ class TreeParser final : public xercesc::XercesDOMParser {
   void AddText(const XMLCh* text, XMLSize_t length);
   void CloseElement();
 
+  const LoadArena* arena_;
   DocumentLimits limits_;
   std::vector<OpenElement> open_;
   // Whitespace that is only worth a node if text follows, or if the element turns out to hold nothing else.

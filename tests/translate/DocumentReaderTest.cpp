@@ -12,6 +12,7 @@
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
 #include "tests/support/ExpectFault.h"
+#include "tests/support/HostileDocuments.h"
 #include "tests/support/ReadText.h"
 
 namespace {
@@ -128,6 +129,7 @@ TEST(DocumentReader, RefusesMoreThanTheQuota) {
   DocumentLimits limits;
   limits.baseMemoryBytes = 1000;  // not even the parser fits
   limits.memoryPerInputByte = 0;
+  limits.reserveBytes = 0;
   std::istringstream in("<a/>");
   ExpectFault([&] { ReadDocument(in, limits); }, 6, kInvalid);
 }
@@ -143,6 +145,8 @@ size_t CountRefusals(Tighten tighten) {
       std::string(50000, 'x') + "</a>";
   for (size_t step = 0;; ++step) {
     DocumentLimits limits;
+    limits.reserveBytes = 0;
+    limits.reserveAllocations = 0;
     tighten(limits, step);
     std::istringstream in(text);
     try {
@@ -167,6 +171,28 @@ TEST(DocumentReader, RefusesAtAnyPoint) {
               limits.memoryPerInputByte = 0;
             }),
             5u);
+}
+
+// The parser asks for memory in destructors while it reads declarations; wherever the quota ends among them,
+// the load is refused and the process lives.
+TEST(DocumentReader, RefusesInTheMiddleOfDeclarations) {
+  const std::string text = "<!DOCTYPE a [" +
+                           kestrel_tests::Repeat("<!ELEMENT a (b,(c|d)*,e?)><!ATTLIST a b CDATA 'c'>", 300) +
+                           "]><a/>";
+  size_t step = 0;
+  for (;; step += 7) {
+    DocumentLimits limits;
+    limits.baseAllocations = step;
+    limits.allocationsPerInputByte = 0;
+    std::istringstream in(text);
+    try {
+      ReadDocument(in, limits);
+      break;
+    } catch (const KestrelException& fault) {
+      EXPECT_EQ(fault.GetErrorCode(), 6);
+    }
+  }
+  EXPECT_GT(step, 1000u);
 }
 
 struct TextRow {

@@ -108,6 +108,18 @@ TEST(HostileDocuments, RefusalTellsThePlace) {
   }
 }
 
+// The parser takes such a model apart in a destructor that asks for memory, with the quota used up or not.
+TEST(HostileDocuments, HugeContentModelsAreSurvived) {
+  for (size_t parts = 100000; parts <= 400000; parts += 60000) {
+    const std::string text = WithSubset("<!ELEMENT a (b" + Repeat(",b", parts) + ")>", "<PMML/>");
+    try {
+      Read(text);
+    } catch (const MCKestrel_800::KestrelException& fault) {
+      EXPECT_EQ(fault.GetErrorCode(), 6);
+    }
+  }
+}
+
 // What large but honest documents hold stays within the limits.
 TEST(HostileDocuments, HonestDocumentsAreRead) {
   const HostileDocument honest[] = {
@@ -117,6 +129,7 @@ TEST(HostileDocuments, HonestDocumentsAreRead) {
       {"200,000 character references", "<PMML>" + Repeat("&amp;&#65;", 100000) + "</PMML>"},
       {"2,000 uses of a small entity",
        WithSubset("<!ENTITY x \"text\">", "<PMML>" + Repeat("<a>&x;</a>", 2000) + "</PMML>")},
+      {"an element declared 100,000 times", WithSubset(Repeat("<!ELEMENT a (b,(c|d)*)>", 100000), "<PMML/>")},
       {"300,000 empty elements", "<PMML>" + Repeat("<a/>", 300000) + "</PMML>"},
       {"an attribute of 20,000,000 letters", "<PMML a=\"" + std::string(20000000, 'x') + "\"/>"},
       {"a text of 20,000,000 letters", "<PMML>" + std::string(20000000, 'x') + "</PMML>"},

@@ -16,7 +16,7 @@ using MCKestrel_800::LoadArena;
 constexpr size_t kMega = size_t{1} << 20;
 
 TEST(LoadArena, GivesAlignedPiecesThatDoNotOverlap) {
-  LoadArena arena(100 * kMega, 1000000);
+  LoadArena arena(100 * kMega, 1000000, 0, 0);
   std::vector<std::pair<unsigned char*, size_t>> pieces;
   for (size_t i = 0; i < 3000; ++i) {
     const size_t size = i * i % 5000;
@@ -38,7 +38,7 @@ TEST(LoadArena, GivesAlignedPiecesThatDoNotOverlap) {
 }
 
 TEST(LoadArena, UsesFreedPiecesAgain) {
-  LoadArena arena(kMega, 1000000);
+  LoadArena arena(kMega, 1000000, 0, 0);
   for (int i = 0; i < 10000; ++i) {
     void* const first = arena.allocate(150000);
     void* const second = arena.allocate(100);
@@ -49,7 +49,7 @@ TEST(LoadArena, UsesFreedPiecesAgain) {
 }
 
 TEST(LoadArena, GivesLargePiecesBack) {
-  LoadArena arena(100 * kMega, 1000000);
+  LoadArena arena(100 * kMega, 1000000, 0, 0);
   const size_t before = arena.GetHeldBytes();
   void* const first = arena.allocate(10 * kMega);
   void* const second = arena.allocate(20 * kMega);
@@ -63,7 +63,7 @@ TEST(LoadArena, GivesLargePiecesBack) {
 }
 
 TEST(LoadArena, RefusesPastTheBytes) {
-  LoadArena arena(2 * kMega, 1000000);
+  LoadArena arena(2 * kMega, 1000000, 0, 0);
   EXPECT_NO_THROW(arena.allocate(kMega));
   EXPECT_FALSE(arena.IsRefused());
   EXPECT_THROW(arena.allocate(kMega + 1000), xercesc::OutOfMemoryException);
@@ -72,7 +72,7 @@ TEST(LoadArena, RefusesPastTheBytes) {
 }
 
 TEST(LoadArena, RefusesPastTheCalls) {
-  LoadArena arena(kMega, 3);
+  LoadArena arena(kMega, 3, 0, 0);
   for (int i = 0; i < 3; ++i)
     arena.deallocate(arena.allocate(10));
   EXPECT_THROW(arena.allocate(10), xercesc::OutOfMemoryException);
@@ -80,29 +80,65 @@ TEST(LoadArena, RefusesPastTheCalls) {
   EXPECT_EQ(arena.GetCalls(), 4u);
 }
 
+TEST(LoadArena, GrantsTheReserveAndSaysSo) {
+  LoadArena arena(2 * kMega, 100, 4 * kMega, 10);
+  arena.allocate(kMega);
+  EXPECT_FALSE(arena.IsRefused());
+  EXPECT_NO_THROW(arena.allocate(2 * kMega));
+  EXPECT_TRUE(arena.IsRefused());
+  EXPECT_THROW(arena.allocate(3 * kMega), xercesc::OutOfMemoryException);
+  LoadArena counting(kMega, 5, 0, 3);
+  for (int i = 0; i < 8; ++i)
+    EXPECT_NO_THROW(counting.allocate(1));
+  EXPECT_TRUE(counting.IsRefused());
+  EXPECT_THROW(counting.allocate(1), xercesc::OutOfMemoryException);
+}
+
+// Asks for memory when it goes, as the parser's own objects do.
+class AskingAtItsEnd {
+ public:
+  explicit AskingAtItsEnd(LoadArena& arena) : arena_(arena) {}
+  ~AskingAtItsEnd() { arena_.deallocate(arena_.allocate(2 * kMega)); }
+
+ private:
+  LoadArena& arena_;
+};
+
+TEST(LoadArena, GrantsWhatDestructorsAskForDuringAnException) {
+  LoadArena arena(kMega, 1, 0, 0);
+  try {
+    const AskingAtItsEnd asking(arena);
+    arena.allocate(1);
+    arena.allocate(1);
+    FAIL() << "nothing was thrown";
+  } catch (const xercesc::OutOfMemoryException&) {
+  }
+  EXPECT_THROW(arena.allocate(1), xercesc::OutOfMemoryException) << "but nothing afterwards";
+}
+
 TEST(LoadArena, RefusesSizesThatNobodyHas) {
-  LoadArena arena(SIZE_MAX, SIZE_MAX);
+  LoadArena arena(SIZE_MAX, SIZE_MAX, 0, 0);
   for (size_t size : {SIZE_MAX, SIZE_MAX - 15, SIZE_MAX / 2 + 1, SIZE_MAX / 4}) {
     EXPECT_THROW(arena.allocate(size), xercesc::OutOfMemoryException) << size;
   }
 }
 
 TEST(LoadArena, GrantsEverythingOnceTheQuotaIsLifted) {
-  LoadArena arena(1000, 1);
+  LoadArena arena(1000, 1, 0, 0);
   arena.LiftQuota();
   for (int i = 0; i < 10; ++i)
     EXPECT_NO_THROW(arena.allocate(kMega));
 }
 
 TEST(LoadArena, FreesNothingForNull) {
-  LoadArena arena(1000, 10);
+  LoadArena arena(1000, 10, 0, 0);
   EXPECT_NO_THROW(arena.deallocate(nullptr));
 }
 
 // An exception may be looked at after the load's memory is gone.
 TEST(LoadArena, LeavesExceptionsToTheProcess) {
   MCKestrel_800::RequireParser();
-  LoadArena arena(1000, 10);
+  LoadArena arena(1000, 10, 0, 0);
   EXPECT_EQ(arena.getExceptionMemoryManager(), xercesc::XMLPlatformUtils::fgMemoryManager);
 }
 
