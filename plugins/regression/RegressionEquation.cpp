@@ -106,6 +106,20 @@ void RegressionEquation::AddCategories(std::size_t begin, std::size_t end, std::
   }
 }
 
+// The sum is a chain in the order of the terms; four a turn only spares counting.
+inline double RegressionEquation::AddLinear(double y, const Linear* term, const Linear* end,
+                                            const double* values) {
+  for (; end - term >= 4; term += 4) {
+    y += term[0].coefficient * values[term[0].slot];
+    y += term[1].coefficient * values[term[1].slot];
+    y += term[2].coefficient * values[term[2].slot];
+    y += term[3].coefficient * values[term[3].slot];
+  }
+  for (; term != end; ++term)
+    y += term->coefficient * values[term->slot];
+  return y;
+}
+
 double RegressionEquation::Evaluate(const double* values) const {
   double y = intercept_;
   for (const Step& step : steps_) {
@@ -135,19 +149,6 @@ double RegressionEquation::Evaluate(const double* values) const {
         break;
     }
   }
-  return y;
-}
-
-// The sum is a chain in the order of the terms; four a turn only spares counting.
-double RegressionEquation::AddLinear(double y, const Linear* term, const Linear* end, const double* values) {
-  for (; end - term >= 4; term += 4) {
-    y += term[0].coefficient * values[term[0].slot];
-    y += term[1].coefficient * values[term[1].slot];
-    y += term[2].coefficient * values[term[2].slot];
-    y += term[3].coefficient * values[term[3].slot];
-  }
-  for (; term != end; ++term)
-    y += term->coefficient * values[term->slot];
   return y;
 }
 

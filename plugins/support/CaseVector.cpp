@@ -154,34 +154,48 @@ void CaseVector::LookUpPositions(const ScoreCaseRecord& record) {
   }
 }
 
+// Which values of a case are missing is as good as random, so nothing here branches on a single one of them:
+// numbers are copied as they are, an empty place as a system-missing number, and only whether there was any
+// is noted. Values of other classes than the library's own number (addresses of type descriptions are
+// compared, which at worst sends a number there, too) take the general way.
 template <typename Source>
 unsigned CaseVector::FillFrom(const Source& source) {
   invalid_slot_ = GetSlotCount();
-  std::uint64_t outcome = absent_outcome_;
+  unsigned outcome = absent_outcome_;
+  bool has_missing = false;
   double* const values = values_.data();
   const PlainSlot* const end = plain_slots_.data() + plain_slots_.size();
   for (const PlainSlot* slot = plain_slots_.data(); slot != end; ++slot) {
-    outcome |= FillPlain(*slot, source.At(slot->position), values);
+    const ScoreValue* value = source.At(slot->position);
+    if (value == nullptr) value = &NumericValue::SYSMIS;
+    if (&typeid(*value) != &typeid(NumericValue)) {
+      outcome |= FillTreated(static_cast<int>(slot->number), value);
+      continue;
+    }
+    const double number = static_cast<const NumericValue*>(value)->NumericValue::GetDouble();
+    has_missing |= BitsOf(number) == kSysmisBits;
+    values[slot->number] = number;
   }
+  if (has_missing) outcome |= FillMissingPlain();
   for (const int number : other_slots_) {
     const int position = slots_[number].position;
     outcome |= FillTreated(number, position < 0 ? nullptr : source.At(static_cast<std::size_t>(position)));
   }
-  return static_cast<unsigned>(outcome);
+  return outcome;
 }
 
-// Which values of a case are missing is as good as random, so nothing here branches on it: an empty slot
-// reads like a system-missing number, and the replacement is picked by a mask. Values of other classes than
-// the library's own number (addresses of type descriptions are compared, which at worst sends a number there,
-// too) take the general way.
-inline std::uint64_t CaseVector::FillPlain(const PlainSlot& slot, const ScoreValue* value, double* values) {
-  if (value == nullptr) value = &NumericValue::SYSMIS;
-  if (&typeid(*value) != &typeid(NumericValue)) return FillTreated(static_cast<int>(slot.number), value);
-  const std::uint64_t bits = BitsOf(static_cast<const NumericValue*>(value)->NumericValue::GetDouble());
-  const std::uint64_t mask = 0u - static_cast<std::uint64_t>(bits == kSysmisBits);
-  const std::uint64_t chosen = bits ^ ((bits ^ slot.missing_bits) & mask);
-  std::memcpy(&values[slot.number], &chosen, sizeof chosen);
-  return slot.missing_outcome & mask;
+// Puts what stands for a missing value where a number is missing, picked by a mask for the reason above.
+unsigned CaseVector::FillMissingPlain() {
+  std::uint64_t outcome = kComplete;
+  double* const values = values_.data();
+  for (const PlainSlot& slot : plain_slots_) {
+    const std::uint64_t bits = BitsOf(values[slot.number]);
+    const std::uint64_t mask = 0u - static_cast<std::uint64_t>(bits == kSysmisBits);
+    const std::uint64_t chosen = bits ^ ((bits ^ slot.missing_bits) & mask);
+    std::memcpy(&values[slot.number], &chosen, sizeof chosen);
+    outcome |= slot.missing_outcome & mask;
+  }
+  return static_cast<unsigned>(outcome);
 }
 
 unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {

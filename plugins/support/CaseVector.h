@@ -115,7 +115,7 @@ class CaseVector {
   void LookUpPositions(const ScoreCaseRecord& record);
   template <typename Source>
   unsigned FillFrom(const Source& source);
-  std::uint64_t FillPlain(const PlainSlot& slot, const ScoreValue* value, double* values);
+  unsigned FillMissingPlain();
   unsigned FillTreated(int number, const ScoreValue* value);
   unsigned FillNumber(int number, double value);
   unsigned FillMissing(int number);
