@@ -48,7 +48,9 @@ std::string ListNames(const std::vector<std::string>& names) {
 
 CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*>& inputs,
                        const std::vector<std::string>& missing_texts)
-    : missing_texts_(missing_texts), record_(static_cast<int>(inputs.size())) {
+    : is_number_(table.GetHeader().size(), false),
+      missing_texts_(missing_texts),
+      record_(static_cast<int>(inputs.size())) {
   std::unordered_map<std::string, std::size_t> positions;
   for (std::size_t column = 0; column < table.GetHeader().size(); ++column)
     positions.emplace(table.GetHeader()[column], column);
@@ -61,6 +63,8 @@ CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*
     }
     inputs_.push_back(MakeInput(*variable, found->second));
     columns_.push_back(found->second);
+    const Kind kind = inputs_.back().kind;
+    is_number_[found->second] = kind == Kind::kNumber || kind == Kind::kDateTimeNumber;
     AddSlot(inputs_.back());
   }
   if (absent.empty()) return;
@@ -114,13 +118,6 @@ std::string CaseReader::WhatIsAccepted(const Input& input) {
     default:
       return "a number of seconds such as 47159";
   }
-}
-
-bool CaseReader::IsNumber(std::size_t column) const {
-  for (const Input& input : inputs_) {
-    if (input.column == column) return input.kind == Kind::kNumber || input.kind == Kind::kDateTimeNumber;
-  }
-  return false;
 }
 
 bool CaseReader::IsMissing(std::string_view cell) const {

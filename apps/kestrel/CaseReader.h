@@ -50,7 +50,7 @@ class CaseReader {
   /// The columns that feed inputs, in the inputs' order.
   const std::vector<std::size_t>& GetColumns() const { return columns_; }
   /// Whether a column feeds an input that is a number.
-  bool IsNumber(std::size_t column) const;
+  bool IsNumber(std::size_t column) const { return is_number_[column]; }
 
  private:
   enum class Kind { kNumber, kText, kDateTimeText, kDateTimeNumber };
@@ -74,6 +74,7 @@ class CaseReader {
 
   std::vector<Input> inputs_;
   std::vector<std::size_t> columns_;
+  std::vector<bool> is_number_;  ///< by column of the table
   std::vector<std::string> missing_texts_;
   MCKestrel_800::CaseRecord record_;
   std::string scratch_;

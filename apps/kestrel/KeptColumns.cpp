@@ -1,6 +1,7 @@
 #include "apps/kestrel/KeptColumns.h"
 
 #include <algorithm>
+#include <unordered_map>
 #include <unordered_set>
 
 #include "apps/kestrel/ProgramError.h"
@@ -9,13 +10,6 @@
 
 namespace kestrel_program {
 namespace {
-
-constexpr std::size_t kNone = static_cast<std::size_t>(-1);
-
-std::size_t FindColumn(const std::vector<std::string>& header, const std::string& name) {
-  const auto found = std::find(header.begin(), header.end(), name);
-  return found == header.end() ? kNone : static_cast<std::size_t>(found - header.begin());
-}
 
 std::vector<std::string> SplitAtCommas(const std::string& text) {
   std::vector<std::string> parts;
@@ -31,19 +25,22 @@ std::vector<std::string> SplitAtCommas(const std::string& text) {
 }  // namespace
 
 std::vector<std::size_t> FindKeptColumns(TableReader& table, const std::vector<std::string>& asked) {
-  const std::vector<std::string>& header = table.GetHeader();
+  std::unordered_map<std::string, std::size_t> positions;
+  for (std::size_t column = 0; column < table.GetHeader().size(); ++column)
+    positions.emplace(table.GetHeader()[column], column);
   std::vector<std::size_t> columns;
+  std::unordered_set<std::size_t> taken;
   for (const std::string& text : asked) {
-    const bool is_one = FindColumn(header, text) != kNone;
+    const bool is_one = positions.count(text) != 0;
     for (const std::string& name : is_one ? std::vector<std::string>{text} : SplitAtCommas(text)) {
-      const std::size_t column = FindColumn(header, name);
-      if (column == kNone) {
+      const auto found = positions.find(name);
+      if (found == positions.end()) {
         throw ProgramError(kUsage, "--keep: the table has no column \"" + ShownText(name) + "\"");
       }
-      if (std::find(columns.begin(), columns.end(), column) != columns.end()) {
+      if (!taken.insert(found->second).second) {
         throw ProgramError(kUsage, "--keep: the column \"" + ShownText(name) + "\" is asked for twice");
       }
-      columns.push_back(column);
+      columns.push_back(found->second);
     }
   }
   return columns;

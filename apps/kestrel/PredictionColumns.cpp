@@ -44,6 +44,7 @@ std::string TextOf(const ScoreValue& value) {
 PredictionColumns::PredictionColumns(ScoreModel& model)
     : result_(model.MakeResult()),
       classification_(dynamic_cast<ScoreClsResult*>(result_.get())),
+      by_position_(dynamic_cast<const ClsResult*>(result_.get())),
       names_{"prediction"} {
   if (classification_ == nullptr) return;
   names_.push_back("probability");
@@ -51,6 +52,8 @@ PredictionColumns::PredictionColumns(ScoreModel& model)
   FindCategories(model);
   for (const std::unique_ptr<ScoreValue>& category : categories_)
     names_.push_back("probability_" + TextOf(*category));
+  for (std::size_t i = 0; i < categories_.size(); ++i)
+    positions_.push_back(i);
 }
 
 PredictionColumns::~PredictionColumns() = default;
@@ -68,19 +71,18 @@ void PredictionColumns::FindCategories(ScoreModel& model) {
 
 // The header comes before the first case, so what the categories are cannot wait for it.
 void PredictionColumns::FindCategoriesByScoring(ScoreModel& model) {
-  const auto* result = dynamic_cast<const ClsResult*>(result_.get());
-  if (result == nullptr) return;
+  if (by_position_ == nullptr) return;
   CaseRecord record;
   for (const ScoreDictVar* variable : model.GetPredictors())
     record.Add(variable->GetName(), AnyValueOf(*variable));
   if (!model.Score(&record, result_.get()).IsError()) {
-    for (std::size_t i = 0; i < result->GetCategoryCount(); ++i)
-      categories_.emplace_back(result->GetCategory(i)->Clone());
+    for (std::size_t i = 0; i < by_position_->GetCategoryCount(); ++i)
+      categories_.emplace_back(by_position_->GetCategory(i)->Clone());
   }
   result_->Reset();
 }
 
-void PredictionColumns::Write(TableWriter& writer) const {
+void PredictionColumns::Write(TableWriter& writer) {
   const ScoreValue* prediction = result_->GetPrediction();
   if (prediction == nullptr || prediction->IsSystemMissingValue()) return WriteMissing(writer);
   if (prediction->GetType() == ScoreValue::kNumeric) {
@@ -95,20 +97,30 @@ void PredictionColumns::Write(TableWriter& writer) const {
   WriteCategories(writer);
 }
 
-void PredictionColumns::WriteCategories(TableWriter& writer) const {
-  if (classification_->GetCategoryCount() == 0) {
-    for (std::size_t i = 0; i < categories_.size(); ++i)
-      writer.AddMissing();
-    return;
-  }
-  const auto* by_position = dynamic_cast<const ClsResult*>(classification_);
+void PredictionColumns::WriteCategories(TableWriter& writer) {
+  const bool has_none = classification_->GetCategoryCount() == 0;
   for (std::size_t i = 0; i < categories_.size(); ++i) {
-    // Results mostly hold the categories in the target's order; then none has to be searched for.
-    const ScoreValue* at_position = by_position == nullptr ? nullptr : by_position->GetCategory(i);
-    writer.AddNumber(at_position != nullptr && *at_position == *categories_[i]
-                         ? by_position->GetProbability(i)
-                         : classification_->GetCategoryProbability(categories_[i].get()));
+    if (has_none) {
+      writer.AddMissing();
+    } else {
+      writer.AddNumber(FindProbability(i));
+    }
   }
+}
+
+// A model gives its categories in the same order case after case, which need not be the target's.
+double PredictionColumns::FindProbability(std::size_t category) {
+  const ScoreValue& wanted = *categories_[category];
+  if (by_position_ == nullptr) return classification_->GetCategoryProbability(&wanted);
+  const ScoreValue* found = by_position_->GetCategory(positions_[category]);
+  if (found != nullptr && *found == wanted) return by_position_->GetProbability(positions_[category]);
+  for (std::size_t position = 0; position < by_position_->GetCategoryCount(); ++position) {
+    if (*by_position_->GetCategory(position) == wanted) {
+      positions_[category] = position;
+      return by_position_->GetProbability(position);
+    }
+  }
+  return 0.0;
 }
 
 void PredictionColumns::WriteMissing(TableWriter& writer) const {

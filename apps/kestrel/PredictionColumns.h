@@ -9,6 +9,7 @@
 #include <vector>
 
 namespace MCKestrel_800 {
+class ClsResult;
 class ScoreClsResult;
 class ScoreModel;
 class ScoreResult;
@@ -40,18 +41,21 @@ class PredictionColumns {
   MCKestrel_800::ScoreResult* GetResult() { return result_.get(); }
 
   /// Writes the result as it is after Score; cells that it has nothing for are missing.
-  void Write(TableWriter& writer) const;
+  void Write(TableWriter& writer);
   /// Writes missing cells.
   void WriteMissing(TableWriter& writer) const;
 
  private:
   void FindCategories(MCKestrel_800::ScoreModel& model);
   void FindCategoriesByScoring(MCKestrel_800::ScoreModel& model);
-  void WriteCategories(TableWriter& writer) const;
+  void WriteCategories(TableWriter& writer);
+  double FindProbability(std::size_t category);
 
   std::unique_ptr<MCKestrel_800::ScoreResult> result_;
   MCKestrel_800::ScoreClsResult* classification_;  ///< the result, or null when it is no classification
+  const MCKestrel_800::ClsResult* by_position_;  ///< the same, or null when its categories have no positions
   std::vector<std::unique_ptr<MCKestrel_800::ScoreValue>> categories_;
+  std::vector<std::size_t> positions_;  ///< where the result of the last case had each category
   std::vector<std::string> names_;
 };
 

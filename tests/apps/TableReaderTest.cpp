@@ -156,11 +156,12 @@ TEST(TableReader, RefusesCellsAndHeadersWithoutEnd) {
 }
 
 TEST(TableReader, CutsBlocksAnywhere) {
-  // Rows of 7 to 13 bytes, with quotation marks and CR LF, so that all of it meets the ends of blocks.
+  // Rows of 9 to 15 bytes, with quotation marks, line ends in them and CR LF, so that all of it meets the
+  // ends of blocks.
   std::string content = "a,b\r\n";
   std::uint64_t rows = 0;
   while (content.size() < 2'000'000)
-    content += "\"" + std::to_string(rows++) + "\",\"\"\"\"\r\n";
+    content += "\"" + std::to_string(rows++) + "\",\"\"\"\n\"\r\n";
   const TempFolder folder;
   InputFile input(folder.Write("t.csv", content));
   TableReader reader(input, 0);
@@ -168,8 +169,8 @@ TEST(TableReader, CutsBlocksAnywhere) {
   std::uint64_t seen = 0;
   reader.ReadRows({0, 1}, [&](const TableRow& row) {
     EXPECT_EQ(row.GetCell(0), std::to_string(seen));
-    EXPECT_EQ(row.GetCell(1), "\"");
-    EXPECT_EQ(row.GetLine(), seen + 2);
+    EXPECT_EQ(row.GetCell(1), "\"\n");
+    EXPECT_EQ(row.GetLine(), 2 * seen + 2);
     ++seen;
     return !testing::Test::HasFailure();
   });
