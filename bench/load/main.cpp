@@ -33,9 +33,11 @@ void ParseWithStockParser(const std::string& document) {
   xercesc::XercesDOMParser parser;
   parser.setLoadExternalDTD(false);
   parser.setValidationScheme(xercesc::XercesDOMParser::Val_Never);
-  xercesc::MemBufInputSource source(reinterpret_cast<const XMLByte*>(document.data()), document.size(), "memory");
+  xercesc::MemBufInputSource source(reinterpret_cast<const XMLByte*>(document.data()), document.size(),
+                                    "memory");
   parser.parse(source);
-  if (parser.getErrorCount() != 0 || parser.getDocument() == nullptr) Fail("the stock parser refused a document");
+  if (parser.getErrorCount() != 0 || parser.getDocument() == nullptr)
+    Fail("the stock parser refused a document");
 }
 
 std::unique_ptr<ScoreModel> Load(const std::string& document) {
@@ -45,7 +47,9 @@ std::unique_ptr<ScoreModel> Load(const std::string& document) {
   return model;
 }
 
-double Megabytes(size_t bytes) { return static_cast<double>(bytes) / 1e6; }
+double Megabytes(size_t bytes) {
+  return static_cast<double>(bytes) / 1e6;
+}
 
 void CompareLoads(const char* title, const std::string& document, int repeat) {
   std::unique_ptr<ScoreModel> model;
@@ -54,7 +58,11 @@ void CompareLoads(const char* title, const std::string& document, int repeat) {
   const size_t kept = mallinfo2().uordblks - before;
   model.reset();
   const std::vector<Contestant> contestants = {
-      {"stock parser: parse and release", [&] { for (int i = 0; i < repeat; ++i) ParseWithStockParser(document); }},
+      {"stock parser: parse and release",
+       [&] {
+         for (int i = 0; i < repeat; ++i)
+           ParseWithStockParser(document);
+       }},
       {"our reader: parse and release",
        [&] {
          for (int i = 0; i < repeat; ++i) {
@@ -62,7 +70,11 @@ void CompareLoads(const char* title, const std::string& document, int repeat) {
            if (MCKestrel_800::ReadDocument(in) == nullptr) Fail("our reader refused a document");
          }
        }},
-      {"whole load: bytes to model", [&] { for (int i = 0; i < repeat; ++i) model = Load(document); },
+      {"whole load: bytes to model",
+       [&] {
+         for (int i = 0; i < repeat; ++i)
+           model = Load(document);
+       },
        [&] { model.reset(); }},
   };
   std::printf("%s, %.3f MB%s\n", title, Megabytes(document.size()),
@@ -106,4 +118,6 @@ int Run(bool smoke) {
 }  // namespace
 }  // namespace kestrel_bench
 
-int main(int argc, char** argv) { return kestrel_bench::Run(argc > 1 && std::strcmp(argv[1], "--smoke") == 0); }
+int main(int argc, char** argv) {
+  return kestrel_bench::Run(argc > 1 && std::strcmp(argv[1], "--smoke") == 0);
+}

@@ -30,8 +30,12 @@ size_t allocations = 0;
   if (void* memory = std::malloc(size)) return memory;
   throw std::bad_alloc();
 }
-[[gnu::noinline]] void operator delete(void* memory) noexcept { std::free(memory); }
-[[gnu::noinline]] void operator delete(void* memory, size_t) noexcept { std::free(memory); }
+[[gnu::noinline]] void operator delete(void* memory) noexcept {
+  std::free(memory);
+}
+[[gnu::noinline]] void operator delete(void* memory, size_t) noexcept {
+  std::free(memory);
+}
 
 namespace kestrel_bench {
 namespace {
@@ -91,7 +95,8 @@ void ScoreCases(benchmark::State& state) {
   Scorer scorer(static_cast<int>(state.range(0)));
   size_t number = 0;
   const size_t before = allocations;
-  for (auto _ : state) benchmark::DoNotOptimize(scorer.Score(number++));
+  for (auto _ : state)
+    benchmark::DoNotOptimize(scorer.Score(number++));
   // The benchmark library allocates a few times of its own between its rounds, whatever the number of cases.
   state.counters["allocations_per_case"] =
       std::floor(1000.0 * static_cast<double>(allocations - before) / static_cast<double>(number)) / 1000.0;
@@ -106,7 +111,8 @@ int main(int argc, char** argv) {
   if (argc == 5 && std::strcmp(argv[1], "--cases") == 0) {
     kestrel_bench::Scorer scorer(std::atoi(argv[4]));
     double sum = 0.0;
-    for (long i = 0; i < std::atol(argv[2]); ++i) sum += scorer.Score(static_cast<size_t>(i));
+    for (long i = 0; i < std::atol(argv[2]); ++i)
+      sum += scorer.Score(static_cast<size_t>(i));
     std::printf("%.17g\n", sum);
     return 0;
   }

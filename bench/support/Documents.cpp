@@ -5,7 +5,8 @@ namespace kestrel_bench {
 namespace {
 
 std::string Begin(size_t fields) {
-  return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<PMML xmlns=\"http://www.dmg.org/PMML-4_4\" version=\"4.4\">\n"
+  return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<PMML xmlns=\"http://www.dmg.org/PMML-4_4\" "
+         "version=\"4.4\">\n"
          "  <Header description=\"benchmark\"/>\n  <DataDictionary numberOfFields=\"" +
          std::to_string(fields) + "\">\n";
 }
@@ -17,15 +18,18 @@ std::string Field(const std::string& name, const char* optype, const char* type,
 }
 
 std::string Value(const std::string& text, const char* property) {
-  return "      <Value value=\"" + text + "\"" + (property[0] == '\0' ? "" : " property=\"" + std::string(property) + "\"") +
-         "/>\n";
+  return "      <Value value=\"" + text + "\"" +
+         (property[0] == '\0' ? "" : " property=\"" + std::string(property) + "\"") + "/>\n";
 }
 
-std::string Coefficient(size_t i) { return std::to_string(0.5 + static_cast<double>(i) / 8); }
+std::string Coefficient(size_t i) {
+  return std::to_string(0.5 + static_cast<double>(i) / 8);
+}
 
 std::string NumericInputs(size_t inputs) {
   std::string text;
-  for (size_t i = 0; i < inputs; ++i) text += Field("x" + std::to_string(i), "continuous", "double", "");
+  for (size_t i = 0; i < inputs; ++i)
+    text += Field("x" + std::to_string(i), "continuous", "double", "");
   return text;
 }
 
@@ -73,11 +77,12 @@ std::string ClassificationModel(size_t inputs, size_t categories) {
   for (size_t k = 0; k < categories; ++k) {
     const std::string label = "class" + std::to_string(k);
     labels += Value(label, "");
-    tables += "    <RegressionTable intercept=\"0.25\" targetCategory=\"" + label + "\">\n" + Predictors(inputs, k) +
-              "    </RegressionTable>\n";
+    tables += "    <RegressionTable intercept=\"0.25\" targetCategory=\"" + label + "\">\n" +
+              Predictors(inputs, k) + "    </RegressionTable>\n";
   }
   return Begin(inputs + 1) + NumericInputs(inputs) + Field("y", "categorical", "string", labels) +
-         "  </DataDictionary>\n  <RegressionModel functionName=\"classification\" normalizationMethod=\"softmax\">\n" +
+         "  </DataDictionary>\n  <RegressionModel functionName=\"classification\" "
+         "normalizationMethod=\"softmax\">\n" +
          Schema(InputFields(inputs, false)) + tables + "  </RegressionModel>\n</PMML>\n";
 }
 
@@ -87,26 +92,31 @@ std::string DictionaryModel(size_t fields) {
     const std::string name = "x" + std::to_string(i);
     switch (i % 3) {
       case 0:
-        text += Field(name, "continuous", "double",
-                      "      <Interval closure=\"closedClosed\" leftMargin=\"-100.5\" rightMargin=\"1000.25\"/>\n");
+        text += Field(
+            name, "continuous", "double",
+            "      <Interval closure=\"closedClosed\" leftMargin=\"-100.5\" rightMargin=\"1000.25\"/>\n");
         break;
       case 1:
-        text += Field(name, "categorical", "string", Value("low", "") + Value("medium", "") + Value("high", ""));
+        text +=
+            Field(name, "categorical", "string", Value("low", "") + Value("medium", "") + Value("high", ""));
         break;
       default:
         text += Field(name, "ordinal", "integer",
-                      Value("1", "") + Value("2", "") + Value("3", "") + Value("98", "missing") + Value("99", "invalid"));
+                      Value("1", "") + Value("2", "") + Value("3", "") + Value("98", "missing") +
+                          Value("99", "invalid"));
     }
   }
-  return text + Field("y", "continuous", "double", "") + RegressionModel(InputFields(1, false), Table(Predictors(1, 0)));
+  return text + Field("y", "continuous", "double", "") +
+         RegressionModel(InputFields(1, false), Table(Predictors(1, 0)));
 }
 
 std::string CategoriesModel(size_t categories) {
   std::string values;
-  for (size_t i = 0; i < categories; ++i) values += Value("category number " + std::to_string(i), "");
+  for (size_t i = 0; i < categories; ++i)
+    values += Value("category number " + std::to_string(i), "");
   return Begin(2) + Field("x0", "categorical", "string", values) + Field("y", "continuous", "double", "") +
-         RegressionModel(InputFields(1, false),
-                         Table("      <CategoricalPredictor name=\"x0\" value=\"category number 1\" coefficient=\"2\"/>\n"));
+         RegressionModel(InputFields(1, false), Table("      <CategoricalPredictor name=\"x0\" "
+                                                      "value=\"category number 1\" coefficient=\"2\"/>\n"));
 }
 
 }  // namespace kestrel_bench

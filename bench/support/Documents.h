@@ -8,15 +8,15 @@
 
 namespace kestrel_bench {
 
-/// A linear regression on `inputs` numeric fields named x0, x1, ..., with the coefficient 0.5 + i / 8 for input i.
-/// With `replace` every input has a replacement (1.0) for missing values.
+/// A linear regression on `inputs` numeric fields named x0, x1, ..., with the coefficient 0.5 + i / 8 for
+/// input i. With `replace` every input has a replacement (1.0) for missing values.
 std::string LinearModel(size_t inputs, bool replace);
 
 /// A classification with `categories` tables on `inputs` numeric fields.
 std::string ClassificationModel(size_t inputs, size_t categories);
 
-/// A dictionary of `fields` fields by turns continuous with an interval, categorical with three values and numeric
-/// ordinal with missing values, and a small model on the first.
+/// A dictionary of `fields` fields by turns continuous with an interval, categorical with three values and
+/// numeric ordinal with missing values, and a small model on the first.
 std::string DictionaryModel(size_t fields);
 
 /// One categorical input with that many categories, and a small model on it.

@@ -1,4 +1,5 @@
-// Compares contestants in one run: rounds of one turn each, so that a slow moment of the machine hits all alike.
+// Compares contestants in one run: rounds of one turn each, so that a slow moment of the machine hits all
+// alike.
 
 #ifndef KESTREL_BENCH_SUPPORT_INTERLEAVED_H
 #define KESTREL_BENCH_SUPPORT_INTERLEAVED_H
@@ -49,14 +50,16 @@ inline std::vector<double> Compare(const std::vector<Contestant>& contestants, i
     }
   }
   std::vector<double> medians;
-  for (const auto& one : seconds) medians.push_back(Median(one));
+  for (const auto& one : seconds)
+    medians.push_back(Median(one));
   return medians;
 }
 
 /// Prints each contestant's time and its ratio to the first, the baseline.
 inline void PrintRatios(const std::vector<Contestant>& contestants, const std::vector<double>& seconds) {
   for (size_t i = 0; i < contestants.size(); ++i) {
-    std::printf("  %-46s %10.6f s  %6.2f x\n", contestants[i].name.c_str(), seconds[i], seconds[i] / seconds[0]);
+    std::printf("  %-46s %10.6f s  %6.2f x\n", contestants[i].name.c_str(), seconds[i],
+                seconds[i] / seconds[0]);
   }
 }
 

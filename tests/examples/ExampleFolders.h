@@ -17,8 +17,10 @@ inline std::string ExamplePath(const std::string& example, const std::string& fi
 
 inline std::vector<std::string> ExampleFolders() {
   std::vector<std::string> names;
-  for (const auto& entry : std::filesystem::directory_iterator(std::string(KESTREL_SOURCE_DIR) + "/examples")) {
-    if (std::filesystem::exists(entry.path() / "expected.csv")) names.push_back(entry.path().filename().string());
+  for (const auto& entry :
+       std::filesystem::directory_iterator(std::string(KESTREL_SOURCE_DIR) + "/examples")) {
+    if (std::filesystem::exists(entry.path() / "expected.csv"))
+      names.push_back(entry.path().filename().string());
   }
   std::sort(names.begin(), names.end());
   return names;
@@ -33,7 +35,8 @@ inline std::string TestNameOf(const std::string& folder) {
   return name;
 }
 
-/// The training programs and we add the same terms in different orders; over all examples that costs less than this.
+/// The training programs and we add the same terms in different orders; over all examples that costs less
+/// than this.
 constexpr double kTolerance = 1e-12;
 
 inline bool AgreesWith(double expected, double actual) {

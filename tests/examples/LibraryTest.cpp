@@ -1,4 +1,5 @@
-// Scores every example through the library and compares with the answers of the program that trained the model.
+// Scores every example through the library and compares with the answers of the program that trained the
+// model.
 
 #include <gtest/gtest.h>
 

@@ -11,16 +11,19 @@
 namespace kestrel_tests {
 namespace {
 
-std::string Program() { return std::string(KESTREL_BINARY_DIR) + "/bin/kestrel"; }
+std::string Program() {
+  return std::string(KESTREL_BINARY_DIR) + "/bin/kestrel";
+}
 
 class EveryExampleByProgram : public testing::TestWithParam<std::string> {};
 
 TEST_P(EveryExampleByProgram, AgreesWithItsTrainingProgram) {
-  const ProgramOutcome outcome =
-      RunProgram(Program(), {"score", ExamplePath(GetParam(), "model.xml"), ExamplePath(GetParam(), "data.csv")});
+  const ProgramOutcome outcome = RunProgram(
+      Program(), {"score", ExamplePath(GetParam(), "model.xml"), ExamplePath(GetParam(), "data.csv")});
   ASSERT_EQ(outcome.exit_code, 0) << outcome.errors;
   std::istringstream in(outcome.output);
-  const PlainTable scored = ParsePlainTable(in), expected = ReadPlainTable(ExamplePath(GetParam(), "expected.csv"));
+  const PlainTable scored = ParsePlainTable(in),
+                   expected = ReadPlainTable(ExamplePath(GetParam(), "expected.csv"));
   ASSERT_EQ(scored.header, expected.header);
   ASSERT_EQ(scored.rows.size(), expected.rows.size());
   const bool regression = expected.header.size() == 1;
