@@ -1,5 +1,5 @@
-// Every public header of the library. Hosts that only score need few of them and compile faster with those alone;
-// the headers of translate/ also need the XML parser's.
+// Every public header of the library. Hosts that only score need few of them and compile faster with those
+// alone; the headers of translate/ also need the XML parser's.
 
 #ifndef KESTREL_KESTREL_H
 #define KESTREL_KESTREL_H
@@ -7,7 +7,6 @@
 #include "kestrel/dictionary/BaseDictionary.h"
 #include "kestrel/dictionary/CaseRecord.h"
 #include "kestrel/dictionary/DictVar.h"
-#include "kestrel/dictionary/EncoderLabels.h"
 #include "kestrel/dictionary/IndexedElements.h"
 #include "kestrel/dictionary/MissingValueSet.h"
 #include "kestrel/dictionary/ScoreBinningEncoder.h"
@@ -30,18 +29,24 @@
 #include "kestrel/dictionary/ValueProbabilitySet.h"
 #include "kestrel/dictionary/VarStats.h"
 #include "kestrel/foundation/Calendar.h"
+#include "kestrel/foundation/CodePages.h"
 #include "kestrel/foundation/DateTimeType.h"
 #include "kestrel/foundation/DateTimeValue.h"
+#include "kestrel/foundation/ExtNameStr.h"
 #include "kestrel/foundation/KestrelException.h"
+#include "kestrel/foundation/Locale.h"
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/foundation/MCStatus.h"
+#include "kestrel/foundation/MultibyteConversions.h"
+#include "kestrel/foundation/MultibyteText.h"
 #include "kestrel/foundation/NarrowText.h"
 #include "kestrel/foundation/NumberText.h"
 #include "kestrel/foundation/NumericValue.h"
+#include "kestrel/foundation/PliantString.h"
+#include "kestrel/foundation/PliantTranscoder.h"
 #include "kestrel/foundation/ScoreValue.h"
 #include "kestrel/foundation/StringValue.h"
 #include "kestrel/model/BaseModel.h"
-#include "kestrel/model/InputFile.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ModelFinder.h"
 #include "kestrel/model/ModelLibrary.h"
@@ -55,7 +60,6 @@
 #include "kestrel/model/VersionInfo.h"
 #include "kestrel/platform/Environment.h"
 #include "kestrel/platform/Export.h"
-#include "kestrel/platform/PageMemory.h"
 #include "kestrel/platform/SharedLibrary.h"
 #include "kestrel/platform/Terminal.h"
 #include "kestrel/predicates/Range.h"
@@ -72,9 +76,6 @@
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/ScoreSAX2Handlers.h"
 #include "kestrel/translate/ScoreTranslator.h"
-#include "kestrel/translate/StreamBlocks.h"
-#include "kestrel/translate/TreeParser.h"
-#include "kestrel/translate/VerifiedText.h"
 #include "kestrel/translate/XmlText.h"
 
 #endif  // KESTREL_KESTREL_H

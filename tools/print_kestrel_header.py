@@ -9,8 +9,8 @@ import os
 import re
 import sys
 
-HEAD = """// Every public header of the library. Hosts that only score need few of them and compile faster with those alone;
-// the headers of translate/ also need the XML parser's.
+HEAD = """// Every public header of the library. Hosts that only score need few of them and compile faster with those
+// alone; the headers of translate/ also need the XML parser's.
 
 #ifndef KESTREL_KESTREL_H
 #define KESTREL_KESTREL_H
