@@ -161,7 +161,8 @@ bool PliantTranscoder::DecodeWithTranscoder(const char* text, size_t length, std
 
 std::u16string PliantTranscoder::Decode(const char* text, size_t length) const {
   std::u16string out;
-  if (DecodeWithTranscoder(text, length, out)) return out;
+  // U+001A is what some transcoders replace a malformed byte by; rarely it is in the text.
+  if (DecodeWithTranscoder(text, length, out) && out.find(u'\x1A') == std::u16string::npos) return out;
   UErrorCode status = U_ZERO_ERROR;
   UConverter* const converter = ucnv_open(encoding_.c_str(), &status);
   if (converter == nullptr) return out + u'\xFFFD';

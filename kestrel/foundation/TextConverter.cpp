@@ -1,6 +1,7 @@
 #include "kestrel/foundation/TextConverter.h"
 
 #include <unicode/ucnv.h>
+#include <unicode/ucnv_cb.h>
 
 #include <atomic>
 #include <memory>
@@ -122,10 +123,13 @@ constexpr size_t kBlock = 1024;
 
 // Substitution is the library's way; what these add is that it does not go unnoticed.
 
-void U_CALLCONV NoteAndDecode(const void* context, UConverterToUnicodeArgs* args, const char* bytes,
-                              int32_t length, UConverterCallbackReason reason, UErrorCode* status) {
-  if (reason <= UCNV_IRREGULAR) *static_cast<bool*>(const_cast<void*>(context)) = true;
-  UCNV_TO_U_CALLBACK_SUBSTITUTE(nullptr, args, bytes, length, reason, status);
+void U_CALLCONV NoteAndDecode(const void* context, UConverterToUnicodeArgs* args, const char*, int32_t,
+                              UConverterCallbackReason reason, UErrorCode* status) {
+  if (reason > UCNV_IRREGULAR) return;
+  *static_cast<bool*>(const_cast<void*>(context)) = true;
+  *status = U_ZERO_ERROR;
+  // ICU's own way writes U+001A for some single bytes, which XML does not even allow.
+  ucnv_cbToUWriteUChars(args, u"\xFFFD", 1, 0, status);
 }
 
 void U_CALLCONV NoteAndEncode(const void* context, UConverterFromUnicodeArgs* args, const char16_t* units,
