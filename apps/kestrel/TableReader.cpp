@@ -161,13 +161,26 @@ const std::vector<std::string>& TableReader::GetHeader() {
   ReadHead();
   if (delimiter_ == 0) delimiter_ = FindDelimiter(std::string_view(head_).substr(0, head_used_));
   csv_set_delim(&parser_->csv, static_cast<unsigned char>(delimiter_));
-  Feed(head_.data(), head_used_);
-  if (!header_done_ && input_ended_) FinishFeeding();
+  FeedHeader();
   if (!header_done_) {
     throw ProgramError(
         kData, input_.GetName() + ": the table is empty; a line with the names of the columns is expected");
   }
   return header_;
+}
+
+// Line by line, because a line of tabs alone is blank or a header of columns without names, as the delimiter
+// has it; what follows the header must wait for ReadRows.
+void TableReader::FeedHeader() {
+  std::size_t begin = 0;
+  while (begin < head_.size() && !header_done_) {
+    const std::size_t line_end = head_.find_first_of("\r\n", begin);
+    const std::size_t end = line_end == std::string::npos ? head_.size() : line_end + 1;
+    Feed(head_.data() + begin, end - begin);
+    begin = end;
+  }
+  head_used_ = begin;
+  if (!header_done_ && input_ended_) FinishFeeding();
 }
 
 void TableReader::TakeHeader() {

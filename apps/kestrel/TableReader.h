@@ -88,6 +88,7 @@ class TableReader {
   struct Parser;
 
   void ReadHead();
+  void FeedHeader();
   void TakeHeader();
   void Feed(const char* bytes, std::size_t size);
   void FinishFeeding();
@@ -100,7 +101,7 @@ class TableReader {
   char delimiter_;
   std::unique_ptr<Parser> parser_;
   std::string head_;           ///< what was read before the rows
-  std::size_t head_used_ = 0;  ///< how much of it is the header
+  std::size_t head_used_ = 0;  ///< first as far as the header may reach, then as far as it does
   bool input_ended_ = false;
   std::vector<std::string> header_;
   bool header_done_ = false;

@@ -89,6 +89,8 @@ const Row kTables[] = {
      "2][\0]"s},
     {"other bytes pass unchanged", "\xC3\xA4,b\n\xFF\xFE,\x01\n", "[\xC3\xA4][b] @2[\xFF\xFE][\x01]"},
     {"columns without name, more than one", ",a,\n1,2,3\n", "[][a][] @2[1][2][3]"},
+    {"a line of tabs is a header when tabs separate", "\t\na\tb\n", "[][] @2[a][b]"},
+    {"and blank when they do not", "\t\na,b,c\n1,2,3\n", "[a][b][c] @3[1][2][3]"},
     {"a header in quotation marks", "\"a,1\",\"b\"\n1,2\n", "[a,1][b] @2[1][2]"},
 };
 
