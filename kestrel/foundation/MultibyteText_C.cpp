@@ -1,12 +1,14 @@
 #include <unicode/ucnv.h>
+#include <unicode/utf16.h>
+#include <unicode/utf8.h>
 
 #include <climits>
 #include <cstdlib>
 #include <cwchar>
 
 #include "kestrel/foundation/MultibyteText.h"
+#include "kestrel/foundation/MultibyteWalk.h"
 #include "kestrel/foundation/TextConverter.h"
-#include "kestrel/foundation/Utf8Scheme.h"
 
 namespace MCXML_800 {
 
@@ -24,7 +26,10 @@ class LocaleScheme {
     std::mbstate_t state{};
     const size_t bytes = std::mbrtowc(&wide, at, static_cast<size_t>(end - at), &state);
     if (bytes == kMalformed || bytes == kIncomplete) return Step::Without(at, 1, true);
-    return Step::Of(bytes == 0 ? 1 : bytes, static_cast<char32_t>(wide));
+    const auto codePoint = static_cast<char32_t>(wide);
+    // Some C libraries read UTF-8 beyond Unicode's end.
+    if (codePoint > 0x10FFFF || U_IS_SURROGATE(codePoint)) return Step::Without(at, bytes, false);
+    return Step::Of(bytes == 0 ? 1 : bytes, codePoint);
   }
 
   bool IsLead(unsigned char byte) const {
@@ -32,9 +37,9 @@ class LocaleScheme {
     return Length(&text, 1) == kIncomplete;
   }
 
-  size_t SafePoint(const char* text, size_t length, size_t index) const {
+  size_t SafePoint(const char* text, size_t, size_t index) const {
     if (MB_CUR_MAX == 1) return index;
-    if (IsUtf8Locale()) return Utf8Scheme().SafePoint(text, length, index);
+    if (IsUtf8Locale()) return SafePointInUtf8(text, index);
     if (MB_CUR_MAX == 2) {
       // What is no lead byte can only end a character.
       while (index > 0 && IsLead(static_cast<unsigned char>(text[index - 1])))
@@ -51,6 +56,16 @@ class LocaleScheme {
   static size_t Length(const char* text, size_t length) {
     std::mbstate_t state{};
     return std::mbrlen(text, length, &state);
+  }
+
+  /// Not ICU's way back, since C libraries differ from it, and from each other, in what is malformed: a byte
+  /// that is no trail byte begins a character for all of them.
+  static size_t SafePointInUtf8(const char* text, size_t index) {
+    const size_t nearest = index - std::min<size_t>(index, MB_CUR_MAX - 1);
+    for (size_t at = index;; --at) {
+      if (!U8_IS_TRAIL(text[at])) return at;
+      if (at == nearest) return index;  // what begins further back ends before
+    }
   }
 
   /// No other encoding takes both texts, of two and of three bytes, for one character each.

@@ -68,7 +68,7 @@ void RenewDefaultConverter(bool utf8) {
     made->previous = last;
     made->id = last == nullptr ? 1 : last->id + 1;
   } while (!current.compare_exchange_weak(last, made.get(), std::memory_order_acq_rel));
-  made.release();
+  static_cast<void>(made.release());  // the list keeps it
 }
 
 int DefaultConverterCount() {

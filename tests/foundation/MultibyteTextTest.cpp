@@ -3,7 +3,9 @@
 #include <gtest/gtest.h>
 
 #include <clocale>
+#include <cstdlib>
 #include <cstring>
+#include <iterator>
 #include <string>
 #include <vector>
 
@@ -417,6 +419,55 @@ TEST(MultibyteText, LongRunsOfLeadBytesKeepTheirParity) {
       EXPECT_EQ(kind->FindStart(whole.c_str(), whole.size(), whole.size() - 1), whole.size() - 2);
       EXPECT_EQ(kind->FindStart(whole.c_str(), whole.size(), whole.size() - 2), whole.size() - 2);
       EXPECT_EQ(kind->FindStarts(whole.c_str(), whole.size()).size(), std::strlen(before) + 5000);
+    }
+  }
+}
+
+/// Whatever the bytes: walking forwards, backwards and finding starts agree.
+TEST(MultibyteText, AgreesWithItselfOnArbitraryBytes) {
+  const unsigned char alphabet[] = {0x00, 0x20, 0x30, 0x39, 0x41, 0x5C, 0x7F, 0x80, 0x81, 0x83,
+                                    0x8E, 0x8F, 0x90, 0xA0, 0xA1, 0xB1, 0xBF, 0xC0, 0xC3, 0xD6,
+                                    0xE2, 0xED, 0xF0, 0xF4, 0xFC, 0xFD, 0xFE, 0xFF};
+  const struct {
+    const char* text_kind;
+    const char* locale;
+  } kinds[] = {{"_8", nullptr},
+               {"windows-31j", nullptr},
+               {"GBK", nullptr},
+               {"KS_C_5601-1987", nullptr},
+               {"Big5", nullptr},
+               {"GB18030", nullptr},
+               {"EUC-JP", nullptr},
+               {"cp1252", nullptr},
+               {"_C", "C.UTF-8"},
+               {"_C", "C"},
+               {"_C", "ja_JP.WINDOWS-31J"},
+               {"_C", "zh_CN.GBK"},
+               {"_C", "ja_JP.EUC-JP"},
+               {"_C", ".932"}};
+  unsigned random = 1;
+  for (const auto& row : kinds) {
+    const CharacterLocale locale(row.locale);
+    if (!locale.known) continue;
+    const std::string name = row.text_kind + std::string(row.locale == nullptr ? "" : row.locale);
+    const auto kind = MakeKind(row.text_kind);
+    for (int round = 0; round < 4000; ++round) {
+      std::string text;
+      for (int i = 0; i < 12; ++i) {
+        random = random * 1664525u + 1013904223u;
+        text += static_cast<char>(alphabet[(random >> 16) % std::size(alphabet)]);
+      }
+      const std::vector<size_t> starts = kind->FindStarts(text.data(), text.size());
+      for (size_t i = 0; i < starts.size(); ++i) {
+        const size_t end = i + 1 < starts.size() ? starts[i + 1] : text.size();
+        bool agrees = kind->PreviousIndex(text.data(), end) == starts[i];
+        for (size_t at = starts[i]; at < end; ++at)
+          agrees = agrees && kind->FindStart(text.data(), text.size(), at) == starts[i];
+        // A terminated text ends where a zero comes first.
+        const char* const here = text.c_str() + starts[i];
+        agrees = agrees && (*here == 0 || kind->Mbclen(here) == end - starts[i]);
+        ASSERT_TRUE(agrees) << name << " " << testing::PrintToString(text) << " at " << starts[i];
+      }
     }
   }
 }
