@@ -145,8 +145,8 @@ void CaseVector::LookUpPositions(const ScoreCaseRecord& record) {
     positions_end_ = std::max(positions_end_, slot.position + 1);
     if (!slot.is_plain) continue;
     if (slot.position >= 0) {
-      plain_slots_.push_back({static_cast<std::size_t>(slot.position), static_cast<std::size_t>(i),
-                              BitsOf(slot.missing_value), slot.missing_outcome});
+      plain_slots_.push_back(
+          {static_cast<std::size_t>(slot.position), static_cast<std::size_t>(i), BitsOf(slot.missing_value)});
     } else {
       values_[i] = slot.missing_value;
       absent_outcome_ |= slot.missing_outcome;
@@ -186,16 +186,15 @@ unsigned CaseVector::FillFrom(const Source& source) {
 
 // Puts what stands for a missing value where a number is missing, picked by a mask for the reason above.
 unsigned CaseVector::FillMissingPlain() {
-  std::uint64_t outcome = kComplete;
+  bool still_missing = false;
   double* const values = values_.data();
   for (const PlainSlot& slot : plain_slots_) {
     const std::uint64_t bits = BitsOf(values[slot.number]);
-    const std::uint64_t mask = 0u - static_cast<std::uint64_t>(bits == kSysmisBits);
-    const std::uint64_t chosen = bits ^ ((bits ^ slot.missing_bits) & mask);
+    const std::uint64_t chosen = bits == kSysmisBits ? slot.missing_bits : bits;
     std::memcpy(&values[slot.number], &chosen, sizeof chosen);
-    outcome |= slot.missing_outcome & mask;
+    still_missing |= chosen == kSysmisBits;
   }
-  return static_cast<unsigned>(outcome);
+  return still_missing ? kMissingNumber : kComplete;
 }
 
 unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {

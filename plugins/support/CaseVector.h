@@ -93,7 +93,6 @@ class CaseVector {
     std::size_t position;  ///< in the record
     std::size_t number;
     std::uint64_t missing_bits;  ///< of the value that takes the place of a missing one
-    std::uint64_t missing_outcome;
   };
   struct Slot {
     const MiningField* field;
