@@ -29,8 +29,8 @@ inline UConverter* OrDefault(UConverter* converter) {
 
 bool IsUtf8(const UConverter* converter);
 
-/// A new converter in the state of the given one, or null. Threads may clone one converter at once, as long as
-/// none uses it.
+/// A new converter in the state of the given one, or null. Threads may clone one converter at once, as long
+/// as none uses it.
 UConverter* CloneConverter(const UConverter* converter);
 
 /// Add the converted text to the end of `out`; 0, or kVEXAMBSubstituted when something had to be replaced.
