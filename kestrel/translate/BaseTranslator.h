@@ -55,7 +55,7 @@ class KESTREL_API BaseTranslator : public ScoreTranslator {
   virtual ScoreModel* ParseFromTree(std::istream& in, const std::string& arg, const std::string& secondArg);
 
   /// Gives the translator a transcoder for `encoding`, or for "CP1252" when it is empty. Replaces the one
-  /// before.
+  /// before. Code 5 for an encoding that PliantTranscoder does not know; the one before then stays.
   void CreateTranscoder(const std::string& encoding);
   /// The transcoder, or null before CreateTranscoder. It belongs to the translator.
   MCXML_800::PliantTranscoder* GetTranscoder() const;

@@ -291,6 +291,18 @@ TEST(BaseTranslator, SharesItsTranscoder) {
   EXPECT_TRUE(BaseTranslator::IsEqual(second.GetTranscoder(), ToXMLCh(u"\u00E4"), "\xE4"));
 }
 
+TEST(BaseTranslator, RefusesEncodingsThatItCannotConvert) {
+  PlainTranslator translator;
+  for (const std::string encoding : {"none-such", " ", "ISO-2022-JP", "UTF-8;x"}) {
+    ExpectFault([&] { translator.CreateTranscoder(encoding); }, 5, encoding + ": Not supported!");
+    EXPECT_EQ(translator.GetTranscoder(), nullptr) << encoding;
+  }
+  translator.CreateTranscoder("ISO-8859-1");
+  MCXML_800::PliantTranscoder* const transcoder = translator.GetTranscoder();
+  EXPECT_THROW(translator.CreateTranscoder("none-such"), KestrelException);
+  EXPECT_EQ(translator.GetTranscoder(), transcoder) << "the one before stays";
+}
+
 TEST(BaseTranslator, OffersNoFormByItself) {
   PlainTranslator translator;
   std::istringstream in("<a/>");
