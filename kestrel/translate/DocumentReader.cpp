@@ -46,19 +46,26 @@ class ParsedDocument::Impl {
  private:
   enum class Ended { kNormally, kAtLimit, kByException };
   Ended Run(const StreamBlocks& text, std::string& message);
+  void FindErrorPlace(const StreamBlocks& text);
   [[noreturn]] void Refuse(KestrelException::ExceptionCode code, const std::string& message) const;
 
   LoadArena arena_;
   TreeParser* parser_ = nullptr;
   xercesc::DOMDocument* document_ = nullptr;
+  StreamBlocks::Place errorPlace_;
 };
+
+void ParsedDocument::Impl::FindErrorPlace(const StreamBlocks& text) {
+  if (parser_ == nullptr) return;
+  if (parser_->IsUtf8Malformed()) errorPlace_ = text.FindMalformedUtf8();
+  if (errorPlace_.line != 0) return;
+  errorPlace_.line = static_cast<size_t>(parser_->GetErrorLine());
+  errorPlace_.column = static_cast<size_t>(parser_->GetErrorColumn());
+}
 
 void ParsedDocument::Impl::Refuse(KestrelException::ExceptionCode code, const std::string& message) const {
   KestrelException fault(code, message);
-  if (parser_ != nullptr) {
-    fault.SetPlace(static_cast<unsigned>(parser_->GetErrorLine()),
-                   static_cast<unsigned>(parser_->GetErrorColumn()));
-  }
+  fault.SetPlace(static_cast<unsigned>(errorPlace_.line), static_cast<unsigned>(errorPlace_.column));
   throw fault;
 }
 
@@ -91,6 +98,7 @@ void ParsedDocument::Impl::Parse(const StreamBlocks& text, const DocumentLimits&
     ended = Run(text, message);
   } catch (const xercesc::OutOfMemoryException&) {  // the parser itself did not fit the quota
   }
+  FindErrorPlace(text);
   if (ended == Ended::kByException) {
     Refuse(KestrelException::kInvalidDocument, message.empty() ? kInvalid : message);
   }

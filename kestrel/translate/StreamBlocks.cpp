@@ -15,6 +15,49 @@ constexpr size_t kMaxBlockBytes = size_t{4} << 20;
 // The stream is asked for this much at a time.
 constexpr size_t kReadBytes = size_t{64} << 10;
 
+// Walks UTF-8 byte by byte, because a character may lie across blocks, and counts lines and columns.
+class Utf8Walk {
+ public:
+  // False at a byte that cannot stand here.
+  bool Take(unsigned char byte) {
+    if (missing_ == 0) return Start(byte);
+    if (byte < lowest_ || byte > highest_) return false;
+    lowest_ = 0x80;
+    highest_ = 0xBF;
+    --missing_;
+    return true;
+  }
+  // Where the last character began.
+  StreamBlocks::Place GetPlace() const { return {line_, column_}; }
+  bool IsInside() const { return missing_ != 0; }
+
+ private:
+  bool Start(unsigned char byte) {
+    const bool isNewLine = last_ == '\r' ? byte != '\n' : last_ == '\n';
+    // The byte order mark has no column.
+    if (isNewLine) {
+      ++line_;
+      column_ = 1;
+    } else if (last_ != 0xEF || line_ != 1 || column_ != 1) {
+      ++column_;
+    }
+    last_ = byte;
+    if (byte < 0x80) return true;
+    if (byte < 0xC2 || byte > 0xF4) return false;
+    missing_ = byte < 0xE0 ? 1 : byte < 0xF0 ? 2 : 3;
+    lowest_ = byte == 0xE0 ? 0xA0 : byte == 0xF0 ? 0x90 : 0x80;
+    highest_ = byte == 0xED ? 0x9F : byte == 0xF4 ? 0x8F : 0xBF;
+    return true;
+  }
+
+  size_t line_ = 1;
+  size_t column_ = 0;
+  unsigned char last_ = 0;  // the first byte of the last character
+  unsigned missing_ = 0;
+  unsigned char lowest_ = 0x80;
+  unsigned char highest_ = 0xBF;
+};
+
 // Turns a stream's exceptions off for as long as it lives.
 class QuietStream {
  public:
@@ -74,6 +117,16 @@ StreamBlocks::Outcome StreamBlocks::ReadBlocks(std::istream& in, size_t maxBytes
     blockBytes = std::min(blockBytes * 2, kMaxBlockBytes);
   }
   return in.bad() ? Outcome::kFailed : Outcome::kComplete;
+}
+
+StreamBlocks::Place StreamBlocks::FindMalformedUtf8() const {
+  Utf8Walk walk;
+  for (const Block& block : blocks_) {
+    for (size_t i = 0; i < block.size; ++i) {
+      if (!walk.Take(static_cast<unsigned char>(block.bytes[i]))) return walk.GetPlace();
+    }
+  }
+  return walk.IsInside() ? walk.GetPlace() : Place();
 }
 
 size_t StreamBlocks::CopyFrom(size_t position, unsigned char* to, size_t max) const {

@@ -27,6 +27,14 @@ class StreamBlocks {
   /// Whether the text holds the character NUL, which the parser takes for the end when it comes after the
   /// root element.
   bool HasNulCharacter() const;
+  /// A place in the text, both counted from 1 in characters; 0 when there is none.
+  struct Place {
+    size_t line = 0;
+    size_t column = 0;
+  };
+  /// The first character that is no UTF-8: not a whole sequence, longer than need be, half a surrogate pair
+  /// or past U+10FFFF. The parser decodes far ahead of where it reads and tells only the latter place.
+  Place FindMalformedUtf8() const;
   /// Copies up to `max` bytes from `position` on and returns their number.
   size_t CopyFrom(size_t position, unsigned char* to, size_t max) const;
 

@@ -7,6 +7,7 @@
 #include <xercesc/framework/XMLErrorCodes.hpp>
 #include <xercesc/internal/ReaderMgr.hpp>
 #include <xercesc/internal/XMLScanner.hpp>
+#include <xercesc/util/XMLExceptMsgs.hpp>
 
 #include "kestrel/translate/XmlText.h"
 
@@ -37,6 +38,12 @@ bool IsEntityMisuse(unsigned int code) {
     default:
       return false;
   }
+}
+
+bool IsMalformedUtf8(unsigned int code, const XMLCh* domain) {
+  return code >= xercesc::XMLExcepts::UTF8_FormatError &&
+         code <= xercesc::XMLExcepts::UTF8_Exceeds_BytesLimit &&
+         xercesc::XMLString::equals(domain, xercesc::XMLUni::fgExceptDomain);
 }
 
 }  // namespace
@@ -247,6 +254,7 @@ void TreeParser::error(const unsigned int code, const XMLCh* const domain,
   if (errorLine_ != 0) return;
   errorLine_ = line;
   errorColumn_ = column;
+  utf8Malformed_ = IsMalformedUtf8(code, domain);
 }
 
 // Default resolution is off, so no answer means that the parser reports an error and opens nothing.

@@ -66,6 +66,9 @@ class TreeParser final : public xercesc::XercesDOMParser {
   /// The place of the first error; 0 when there was none, or it has no place.
   XMLFileLoc GetErrorLine() const { return errorLine_; }
   XMLFileLoc GetErrorColumn() const { return errorColumn_; }
+  /// Whether the first error is that the text is no UTF-8. Its place is then only near: the parser decodes a
+  /// large part at a time, and stands at the start of that part or wherever it asked for more.
+  bool IsUtf8Malformed() const { return utf8Malformed_; }
   /// Takes the place of the last element for the first error's, unless that is known: for faults that come
   /// without one.
   void NoteLastElement();
@@ -140,6 +143,7 @@ class TreeParser final : public xercesc::XercesDOMParser {
   static constexpr size_t kNameBuckets = 257;  // of the document's own table of names
   unsigned namesInBucket_[kNameBuckets] = {};
   bool entityRefused_ = false;
+  bool utf8Malformed_ = false;
   XMLFileLoc elementLine_ = 0;
   XMLFileLoc elementColumn_ = 0;
   XMLFileLoc errorLine_ = 0;

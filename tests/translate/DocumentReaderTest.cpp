@@ -116,6 +116,58 @@ TEST(DocumentReader, TellsThePlaceOfTheFirstError) {
   }
 }
 
+struct PlaceRow {
+  const char* why;
+  std::string text;
+  unsigned line;
+  unsigned column;
+};
+
+// Documents in another encoding than they declare are the ones that users meet most.
+TEST(DocumentReader, TellsWhereTheTextIsNoUtf8) {
+  const std::string blanks(200000, ' ');
+  const PlaceRow rows[] = {
+      {"first of all", "\xFF<a/>", 1, 1},
+      {"in the root", "<a>\n<b x='K\xF6ln'/></a>", 2, 8},
+      {"in the root, with a declaration", "<?xml version='1.0' encoding='UTF-8'?>\n<a x='\xE4'/>", 2, 7},
+      {"behind a byte order mark", "\xEF\xBB\xBF<a>\xE4</a>", 1, 4},
+      {"behind good characters", "<a>\xC3\xB6\xE2\x82\xAC\xF0\x9D\x84\x9E\xE4.</a>", 1, 7},
+      {"line ends of Windows", "<a>\r\n\r\n\xE4</a>", 3, 1},
+      {"line ends of old", "<a>\r\r\xE4</a>", 3, 1},
+      {"longer than need be", "<a>\n\xC0\xAF</a>", 2, 1},
+      {"longer than need be, three bytes", "<a>\n\xE0\x9F\xBF</a>", 2, 1},
+      {"half a surrogate pair", "<a>\nx\xED\xA0\x80</a>", 2, 2},
+      {"past the last character", "<a>\n\xF4\x90\x80\x80</a>", 2, 1},
+      {"five bytes", "<a>\n\xF8\x88\x80\x80\x80</a>", 2, 1},
+      {"the end of a sequence alone", "<a>\n\x80</a>", 2, 1},
+      {"a sequence that is cut", "<a>\n\xC3(</a>", 2, 1},
+      {"in a large document", "<a>\n" + blanks + "\n" + blanks + "\n<b x='K\xF6ln'/></a>", 4, 8},
+  };
+  for (const PlaceRow& row : rows) {
+    try {
+      ReadText(row.text);
+      ADD_FAILURE() << "nothing was thrown: " << row.why;
+    } catch (const KestrelException& fault) {
+      EXPECT_EQ(fault.GetLine(), row.line) << row.why;
+      EXPECT_EQ(fault.GetColumn(), row.column) << row.why;
+    }
+  }
+}
+
+// A character may lie across the blocks that the text is kept in.
+TEST(DocumentReader, FindsWhatIsNoUtf8AcrossBlocks) {
+  for (size_t shift = 0; shift < 4; ++shift) {
+    std::string text = "<a>" + std::string(65536 - 3 - shift, 'x') + "\xF0\x9D\x84\x9E\n\xE4</a>";
+    try {
+      ReadText(text);
+      ADD_FAILURE() << "nothing was thrown: " << shift;
+    } catch (const KestrelException& fault) {
+      EXPECT_EQ(fault.GetLine(), 2u) << shift;
+      EXPECT_EQ(fault.GetColumn(), 1u) << shift;
+    }
+  }
+}
+
 TEST(DocumentReader, RefusesMoreThanTheCap) {
   DocumentLimits limits;
   limits.maxInputBytes = 100;
