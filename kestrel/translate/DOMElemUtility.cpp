@@ -6,6 +6,7 @@
 #include "kestrel/foundation/PliantTranscoder.h"
 #include "kestrel/translate/BaseTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
+#include "kestrel/translate/VerifiedText.h"
 #include "kestrel/translate/XmlText.h"
 
 namespace MCKestrel_800 {
@@ -56,7 +57,7 @@ size_t DOMElemUtility::GetNodeListLength(xercesc::DOMElement* element, const std
 
 int DOMElemUtility::GetAttributeToInt(xercesc::DOMElement* element, const std::string& name, bool forced) {
   if (translator_ == nullptr || element == nullptr || name.empty()) return -1;
-  return BaseTranslator::VerifyInt(GetValue(element, name, forced));
+  return VerifyIntAt(element, GetValue(element, name, forced));
 }
 
 std::string DOMElemUtility::GetAttributeToString(xercesc::DOMElement* element, const std::string& name,
@@ -72,7 +73,7 @@ std::string DOMElemUtility::GetAttributeToString(xercesc::DOMElement* element, c
 double DOMElemUtility::GetAttributeToDouble(xercesc::DOMElement* element, const std::string& name,
                                             bool forced) {
   if (translator_ == nullptr || element == nullptr || name.empty()) return 0.0;
-  return BaseTranslator::VerifyDouble(GetValue(element, name, forced));
+  return VerifyDoubleAt(element, GetValue(element, name, forced));
 }
 
 xercesc::DOMElement* DOMElemUtility::GetChildElemByName(xercesc::DOMElement* element, const std::string& tag,

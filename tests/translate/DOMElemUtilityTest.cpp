@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <functional>
+#include <iterator>
 #include <memory>
 #include <string>
 #include <xercesc/dom/DOM.hpp>
@@ -27,8 +29,8 @@ class PlainTranslator : public PMMLTranslator {
 class DOMElemUtilityTest : public testing::Test {
  protected:
   DOMElemUtilityTest()
-      : document_(
-            ReadText("<a int='12' real='1.5' text='\xC3\xA4' bad='x'><b n='0'/>\n<c><b n='1'/></c></a>")),
+      : document_(ReadText(
+            "<a int='12' real='1.5' text='\xC3\xA4' bad='x'><b n='0'/>\n<c bad='x'><b n='1'/></c></a>")),
         root_(document_->GetRoot()),
         utility_(&translator_, nullptr),
         unbound_(nullptr, nullptr) {}
@@ -111,12 +113,27 @@ TEST_F(DOMElemUtilityTest, FindsAChild) {
   ExpectFault([&] { utility_.GetChildElemByName(root_, "z", true); }, 4, "Node is missing --- z ---");
 }
 
-TEST_F(DOMElemUtilityTest, PlacePassesThrough) {
-  try {
-    utility_.GetChildElemByName(static_cast<xercesc::DOMElement*>(FirstChild(root_, u"c")), "z", true);
-    FAIL() << "nothing was thrown";
-  } catch (const KestrelException& fault) {
-    EXPECT_EQ(fault.GetLine(), 2u);
+TEST_F(DOMElemUtilityTest, FaultsHaveTheElementsPlace) {
+  xercesc::DOMElement* const c = FirstChild(root_, u"c");
+  const std::function<void()> actions[] = {
+      [&] { utility_.GetChildElemByName(c, "z", true); },
+      [&] { utility_.GetDOMNodeList(c, "z", true); },
+      [&] { utility_.GetElemFromNodeList(c, "b", 7, true); },
+      [&] { utility_.GetNodeListLength(c, "z", true); },
+      [&] { utility_.GetAttributeToString(c, "z", true); },
+      [&] { utility_.GetAttributeToInt(c, "z", true); },
+      [&] { utility_.GetAttributeToInt(c, "z", false); },
+      [&] { utility_.GetAttributeToInt(c, "bad", false); },
+      [&] { utility_.GetAttributeToDouble(c, "bad", false); },
+  };
+  for (size_t i = 0; i < std::size(actions); ++i) {
+    try {
+      actions[i]();
+      ADD_FAILURE() << "nothing was thrown by " << i;
+    } catch (const KestrelException& fault) {
+      EXPECT_EQ(fault.GetLine(), 2u) << i;
+      EXPECT_GT(fault.GetColumn(), 0u) << i;
+    }
   }
 }
 
