@@ -152,6 +152,7 @@ void FieldValues::AddMissing(const DOMElement* element, const XMLCh* text) {
     FailAt(element, KestrelException::kConversion,
            ownText ? Narrow(text) + ": Invalid Numeric Categorical Value!" : fault.GetErrorMessage());
   }
+  if (value == nullptr) return;
   auto range = std::make_unique<Range>(value.get());
   value.release();
   // The same value given twice is refused by the set and stays ours.
@@ -167,6 +168,7 @@ void FieldValues::AddLabel(const DOMElement* element, const XMLCh* text) {
     if (ownText) FailAt(element, KestrelException::kInvalidValue, Narrow(text) + ": invalid value!");
     FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
   }
+  if (value == nullptr) return;
   if (duplicate_ == nullptr && IsListed(*value)) {
     duplicateElement_ = element;
     duplicate_ = value.get();

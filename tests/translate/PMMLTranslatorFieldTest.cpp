@@ -372,6 +372,23 @@ TEST(PMMLTranslatorFields, SetupCatEncoderServesCategoriesAlone) {
   EXPECT_EQ(encoder->EncodeConst(std::string("later")), 0);
 }
 
+// No document makes such a variable; a plug-in may.
+TEST(PMMLTranslatorFields, OfAnUnknownTypeHoldNoValues) {
+  const auto tree = kestrel_test::ReadTree(
+      "<DataField><Value value='1'/><Value value='2' property='missing'/></DataField>");
+  for (const ScoreDictVar::MeasureLevel level : {ScoreDictVar::kNominal, ScoreDictVar::kContinuous}) {
+    DictVar variable("x", static_cast<ScoreDictVar::VariableType>(2));
+    variable.SetMLevel(level);
+    if (level == ScoreDictVar::kNominal) {
+      PMMLTranslator::ParseCategoricalValues(tree->GetRoot(), &variable);
+    } else {
+      PMMLTranslator::ParseContinuousValues(tree->GetRoot(), &variable);
+    }
+    EXPECT_EQ(variable.GetValueLabels()->Size(), 0u);
+    EXPECT_EQ(variable.GetMissingValues()->Size(), 0u);
+  }
+}
+
 TEST(PMMLTranslatorFields, KeepTheOrderOfTheDocument) {
   const auto dictionary = ReadDictionary(
       DictionaryOf(3,
