@@ -78,8 +78,12 @@ std::vector<RegressionTable> ReadTables(const DOMElement* element, const Regress
 }  // namespace
 
 ScoreModel* RegressionTranslator::ParseFromTree(DOMElement* root, const std::string&) {
-  std::unique_ptr<ScoreDictionary> dictionary(
-      ParseDictionary(GetChildByTag(root, PMMLModelTags::XML_ELE_DATADICTIONARY), false));
+  DOMElement* const dictionaryElement = FirstChild(root, Tags::XML_ELE_DATADICTIONARY);
+  // Said here and not by ParseDictionary, which cannot know where the element should stand.
+  if (dictionaryElement == nullptr) {
+    FailAt(root, KestrelException::kStructure, "<DataDictionary is required !!");
+  }
+  std::unique_ptr<ScoreDictionary> dictionary(ParseDictionary(dictionaryElement, false));
   std::unique_ptr<RegressionModel> model =
       BuildModel(RequiredChild(root, PMMLModelTags::XML_ELE_REGMODEL), std::move(dictionary));
   const std::string version = AttributeText(root, Tags::XML_ATT_VERSION);

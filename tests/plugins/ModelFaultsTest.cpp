@@ -187,13 +187,13 @@ struct CutRow {
 };
 
 constexpr CutRow kCuts[] = {
-    // Nothing in the document stands where the dictionary should: the fault has no place.
-    {"no dictionary", "  <DataDictionary", "  <RegressionModel", "", 1, "<DataDictionary is required !!", 0},
+    // Nothing in the document stands where the dictionary should: the fault is the root's.
+    {"no dictionary", "  <DataDictionary", "  <RegressionModel", "", 1, "<DataDictionary is required !!", 2},
     {"an empty dictionary", "    <DataField", "  </DataDictionary", "", 1, "<DataDictionary is EMPTY!!", 4},
     {"the dictionary inside another element", "  <DataDictionary", "  <RegressionModel",
      "<Box><DataDictionary numberOfFields=\"1\"><DataField name=\"x\" "
      "optype=\"continuous\"/></DataDictionary></Box>",
-     1, "<DataDictionary is required !!", 0},
+     1, "<DataDictionary is required !!", 2},
     {"no mining schema", "    <MiningSchema>", "    <RegressionTable", "", 4,
      "Node is missing --- MiningSchema ---", 37},
     {"an empty mining schema", "      <MiningField", "    </MiningSchema>", "", 1,
