@@ -1,13 +1,13 @@
 #include "kestrel/model/ModelFactory.h"
 
-#include <istream>
+#include <fstream>
 #include <memory>
 #include <mutex>
 #include <utility>
 #include <xercesc/dom/DOMElement.hpp>
 
+#include "kestrel/foundation/ExtNameStr.h"
 #include "kestrel/foundation/KestrelException.h"
-#include "kestrel/model/InputFile.h"
 #include "kestrel/model/ModelFinder.h"
 #include "kestrel/model/ModelLibrary.h"
 #include "kestrel/model/ModelNames.h"
@@ -59,15 +59,34 @@ std::unique_ptr<ScoreTranslator> MakeTranslator(const FoundModel& model, std::ve
   return translator;
 }
 
+/// Where the stream stands; -1 when it cannot be set back. Asked of its buffer, because a stream that a host
+/// has set to throw throws something of its own when it is at its end or cannot be set.
+std::istream::pos_type PositionOf(std::istream& in) {
+  if (in.rdbuf() == nullptr || !in.good()) return std::istream::pos_type(-1);
+  try {
+    return in.rdbuf()->pubseekoff(0, std::ios_base::cur, std::ios_base::in);
+  } catch (...) {
+    return std::istream::pos_type(-1);
+  }
+}
+
+bool SetBack(std::istream& in, std::istream::pos_type start) {
+  if (start == std::istream::pos_type(-1)) return false;
+  try {
+    if (in.rdbuf()->pubseekpos(start, std::ios_base::in) != start) return false;
+    in.clear();
+    return true;
+  } catch (...) {
+    return false;
+  }
+}
+
 /// Offers the whole stream to a translator that takes two arguments. Null when it is none or the stream
 /// cannot be set back to `start`.
 ScoreModel* ParseWithTwoArguments(ScoreTranslator& translator, std::istream& in, std::istream::pos_type start,
                                   const std::string& arg, const std::string& secondArg) {
   auto* base = dynamic_cast<BaseTranslator*>(&translator);
-  if (base == nullptr || start == std::istream::pos_type(-1)) return nullptr;
-  in.clear();
-  in.seekg(start);
-  return in.good() ? base->ParseFromTree(in, arg, secondArg) : nullptr;
+  return base != nullptr && SetBack(in, start) ? base->ParseFromTree(in, arg, secondArg) : nullptr;
 }
 
 // Every document is read into a tree, a "NearestNeighborModel" too. Scanning the stream for that one element
@@ -76,7 +95,7 @@ ScoreModel* ParseWithTwoArguments(ScoreTranslator& translator, std::istream& in,
 ScoreModel* MakeModel(std::istream& in, std::vector<std::string> names, const std::string& arg,
                       const std::string* secondArg) {
   LoadError().clear();
-  const std::istream::pos_type start = secondArg != nullptr ? in.tellg() : std::istream::pos_type(-1);
+  const std::istream::pos_type start = secondArg != nullptr ? PositionOf(in) : std::istream::pos_type(-1);
   const std::unique_ptr<ParsedDocument> document = ReadDocument(in);
   const FoundModel found = FindModel(document->GetRoot(), names);
   const std::unique_ptr<ScoreTranslator> translator = MakeTranslator(found, names);
@@ -91,8 +110,8 @@ ScoreModel* MakeModelFromFile(const std::string& fileName, const std::string& na
                               const std::string& arg, const std::string* secondArg) {
   LoadError().clear();
   std::vector<std::string> names = ReadNamesFile(namesFileName);
-  std::ifstream in = OpenInputFile(fileName);
-  if (!in.is_open()) Fail(KestrelException::kFile, "Could not open model file");
+  std::ifstream in;
+  if (!MCXML_800::ExtNameStr(fileName).Open(in)) Fail(KestrelException::kFile, "Could not open model file");
   return MakeModel(in, std::move(names), arg, secondArg);
 }
 

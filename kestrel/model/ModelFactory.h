@@ -21,6 +21,14 @@ class ScoreModel;
 /// exception says that a model is not supported because its library could not be used, GetLastLoadError tells
 /// what the system said about it.
 ///
+/// Model libraries: the library of the element `TreeModel` is the file `TreeModel800r.so` (`.dll` on
+/// Windows). It is looked for by that name alone, beside the core library, in the folder `kestrel/plugins`
+/// beside the core (Linux) and where the system looks for libraries; LD_LIBRARY_PATH comes first on Linux. No
+/// document can name another file.
+///
+/// Names: the element tags that a host wants recognised, most wanted first. A host passes them as a list,
+/// `fModelNames` among others, or as a names file: tags between blanks, commas, tabs and line ends.
+///
 /// Ownership: the caller owns the model and deletes it. The model is what the translator returned, so it is
 /// null when the translator returned null. The library that the model came from stays loaded for the rest of
 /// the process, because the model's code is in it.
@@ -57,7 +65,8 @@ class KESTREL_API ModelFactory {
   /// the tree stays the host's. The element's tag must be on the names list; the older tags "DecisionTree"
   /// and "Regression" stand for "TreeModel" and "RegressionModel". The dictionaries go to the translator as
   /// they are: whether the model keeps them is the model library's contract, and the factory deletes neither.
-  /// Null when the translator has no such operation.
+  /// Null when the translator has no such operation. A null dictionary is passed as a ScoreDictionary*, since
+  /// a bare `nullptr` fits both this operation and the next.
   static ScoreModel* MakeModelFromXML(void* modelElement, const std::vector<std::string>& modelNames,
                                       ScoreDictionary* dictionary, const std::string& arg = std::string(),
                                       ScoreDictionary* resultDictionary = nullptr);

@@ -4,8 +4,8 @@
 #include <cstring>
 #include <fstream>
 
+#include "kestrel/foundation/ExtNameStr.h"
 #include "kestrel/foundation/KestrelException.h"
-#include "kestrel/model/InputFile.h"
 #include "kestrel/translate/ReaderFault.h"
 
 namespace MCKestrel_800 {
@@ -44,7 +44,8 @@ class Tokenizer {
 
 void ReadModelNames(const std::string& path, std::vector<std::string>& names) {
   names.clear();
-  std::ifstream in = OpenInputFile(path.empty() ? "modeldll.txt" : path);
+  std::ifstream in;
+  MCXML_800::ExtNameStr(path.empty() ? "modeldll.txt" : path).Open(in);
   Tokenizer tokenizer(names);
   char block[4096];
   in.read(block, 3);

@@ -256,6 +256,51 @@ TEST(ModelFactory, OffersBothArgumentsToATranslatorThatTakesTwo) {
       << "a stream that cannot be set back";
 }
 
+/// Tells where it stands but cannot be set to another place.
+class CountingBuffer : public OneWayBuffer {
+ public:
+  using OneWayBuffer::OneWayBuffer;
+
+ protected:
+  pos_type seekoff(off_type offset, std::ios_base::seekdir direction, std::ios_base::openmode) override {
+    return offset == 0 && direction == std::ios_base::cur ? pos_type(gptr() - eback()) : pos_type(-1);
+  }
+};
+
+/// Throws when it is asked where it stands.
+class ThrowingBuffer : public OneWayBuffer {
+ public:
+  using OneWayBuffer::OneWayBuffer;
+
+ protected:
+  pos_type seekoff(off_type, std::ios_base::seekdir, std::ios_base::openmode) override { throw 7; }
+};
+
+TEST(ModelFactory, LetsNothingOfAThrowingStreamOut) {
+  const std::string text = "<PMML><WideModel/></PMML>";
+  const std::string from_root = "WideModel: root=PMML arg=x";
+  const auto all = std::ios_base::failbit | std::ios_base::badbit | std::ios_base::eofbit;
+  CountingBuffer counting(text);
+  ThrowingBuffer throwing(text);
+  OneWayBuffer one_way(text);
+  for (std::streambuf* buffer :
+       {static_cast<std::streambuf*>(&counting), static_cast<std::streambuf*>(&throwing),
+        static_cast<std::streambuf*>(&one_way)}) {
+    std::istream in(buffer);
+    in.exceptions(all);
+    EXPECT_EQ(StoryOf(ModelFactory::MakeModelFromXML(in, {"WideModel"}, "x", "y")), from_root);
+  }
+  std::istringstream at_its_end("x");
+  at_its_end.get();
+  at_its_end.peek();
+  at_its_end.exceptions(std::ios_base::failbit);
+  ExpectFault([&] { ModelFactory::MakeModelFromXML(at_its_end, {"WideModel"}, "x", "y"); }, 4,
+              "\nInvalid XML document or no dtd file avaible in current directory");
+  std::istream none(nullptr);
+  ExpectFault([&] { ModelFactory::MakeModelFromXML(none, {"WideModel"}, "x", "y"); }, 2,
+              "Could not read model file");
+}
+
 TEST(ModelFactory, ReadsAFileAndItsNames) {
   const TempFolder folder;
   const std::string model = folder.Write("model.xml", "<PMML><TreeModel/><WideModel/></PMML>");
