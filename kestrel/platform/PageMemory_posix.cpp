@@ -13,8 +13,11 @@ namespace {
 // used before.
 constexpr size_t kLargePageBytes = size_t{2} << 20;
 
+// The largest page that systems use for ordinary memory: what is given back must be whole pages.
+constexpr size_t kMostPageBytes = size_t{64} << 10;
+
 size_t WholePages(size_t bytes) {
-  return (bytes + 4095) / 4096 * 4096;
+  return (bytes + kMostPageBytes - 1) / kMostPageBytes * kMostPageBytes;
 }
 
 // A large page begins on its own boundary, so more is taken than needed and the ends are given back.
