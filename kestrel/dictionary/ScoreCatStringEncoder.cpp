@@ -63,9 +63,8 @@ int ScoreCatStringEncoder::Find(std::string_view key) const {
 
 std::string_view ScoreCatStringEncoder::KeyOf(std::string_view text) const {
   if (noSpaceTrim_ || text.empty()) return text;
-  const std::size_t last = text.find_last_not_of(' ');
-  if (last == std::string_view::npos) return emptyStringOK_ ? text.substr(0, 1) : std::string_view();
-  return text.substr(0, last + 1);
+  const std::string_view key = WithoutTrailingBlanks(text);
+  return key.empty() && emptyStringOK_ ? text.substr(0, 1) : key;
 }
 
 int ScoreCatStringEncoder::Encode(const std::string& text) {

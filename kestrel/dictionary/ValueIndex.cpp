@@ -137,11 +137,6 @@ ValueKey KeyOfNumber(double number, ValueKey::Kind kind) {
   return key;
 }
 
-std::string_view WithoutTrailingBlanks(std::string_view text) {
-  const std::size_t last = text.find_last_not_of(' ');
-  return last == std::string_view::npos ? std::string_view() : text.substr(0, last + 1);
-}
-
 }  // namespace
 
 ValueKey MakeValueKey(const ScoreValue* value) {

@@ -1,7 +1,6 @@
 #include "kestrel/foundation/StringValue.h"
 
 #include <limits>
-#include <string_view>
 #include <typeinfo>
 
 #include "kestrel/foundation/NumberText.h"
@@ -9,12 +8,6 @@
 namespace MCKestrel_800 {
 
 namespace {
-
-std::string_view WithoutTrailingBlanks(std::string_view text) {
-  while (!text.empty() && text.back() == ' ')
-    text.remove_suffix(1);
-  return text;
-}
 
 /// Asks the test about the other's text; false when the other is no text. The text of our own class is not
 /// copied; any other class, one derived from ours included, is asked for its string. To ask for the exact

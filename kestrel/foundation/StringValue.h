@@ -5,11 +5,19 @@
 
 #include <cstdint>
 #include <string>
+#include <string_view>
 
 #include "kestrel/foundation/ScoreValue.h"
 #include "kestrel/platform/Export.h"
 
 namespace MCKestrel_800 {
+
+/// The part of a text that counts when texts are compared: all but its trailing blanks.
+inline std::string_view WithoutTrailingBlanks(std::string_view text) {
+  while (!text.empty() && text.back() == ' ')
+    text.remove_suffix(1);
+  return text;
+}
 
 /// A text. Comparison ignores trailing blanks (the space character alone) on both sides; leading blanks
 /// count. Order is that of unsigned bytes.
