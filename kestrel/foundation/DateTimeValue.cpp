@@ -129,7 +129,9 @@ DateTimeValue::DateTimeValue(const std::string& text, DateTimeType type) : kind_
 DateTimeValue::~DateTimeValue() = default;
 
 void DateTimeValue::SetValue(const ScoreValue* other) {
-  if (const auto* date = dynamic_cast<const DateTimeValue*>(other)) *this = *date;
+  if (other == nullptr || other->GetType() != ScoreValue::kDateTime) return;
+  seconds_ = other->GetDouble();
+  if (const auto* date = dynamic_cast<const DateTimeValue*>(other)) kind_ = date->kind_;
 }
 
 ScoreValue* DateTimeValue::GetValue() const {
@@ -170,7 +172,7 @@ std::string DateTimeValue::GetString() const {
   const int64_t t = SecondsOfDay(seconds);
   SplitTime(t, h, min, s);
   Calendar::DateOfDays((seconds - t) / fSeconds_Per_Day, y, mon, d);
-  char date[48], time[16];
+  char date[48], time[40];
   std::snprintf(date, sizeof date, "%s%04lld-%02d-%02d", y < 0 ? "-" : "",
                 static_cast<long long>(y < 0 ? -y : y), static_cast<int>(mon), static_cast<int>(d));
   std::snprintf(time, sizeof time, "%02d:%02d:%02d", static_cast<int>(h), static_cast<int>(min),

@@ -37,7 +37,8 @@ class KESTREL_API DateTimeValue : public ScoreValue {
   DateTimeValue(const std::string& text, DateTimeType type);
   ~DateTimeValue() override;
 
-  /// Copies another date/time value; does nothing with any other.
+  /// Takes over the seconds of another date/time value, and the kind where the other's class has one; does
+  /// nothing with a value that is no date/time.
   void SetValue(const ScoreValue* other) override;
   ScoreValue* GetValue() const override;
   ScoreValue* Clone() const override;

@@ -372,6 +372,34 @@ TEST(DateTimeValue, TakesOverDatesOnly) {
   EXPECT_TRUE(*copy == value);
 }
 
+/// A date of a host's own class: only its seconds are known.
+class ForeignDate : public NumericValue {
+ public:
+  using NumericValue::NumericValue;
+  ValueType GetType() const override { return ScoreValue::kDateTime; }
+};
+
+TEST(DateTimeValue, AsksClassesOfOthersForTheirSeconds) {
+  DateTimeValue value(1.0, kTimeVal);
+  const ForeignDate foreign(5.0), missing;
+  EXPECT_TRUE(value < foreign);
+  value.SetValue(&foreign);
+  EXPECT_TRUE(value == foreign);
+  EXPECT_EQ(value.GetDateTimeType(), kTimeVal) << "it has no kind to take over";
+  value.SetValue(&missing);
+  EXPECT_TRUE(value.IsSystemMissingValue());
+}
+
+TEST(DateTimeValue, AssignsAlsoToItself) {
+  DateTimeValue value(5.0, kTimeVal), other;
+  other = value;
+  const DateTimeValue& same = other;
+  other = same;
+  other.SetValue(&other);
+  EXPECT_EQ(other.GetDouble(), 5.0);
+  EXPECT_EQ(other.GetDateTimeType(), kTimeVal);
+}
+
 TEST(DateTimeValue, ParsesPartsAndLeavesThemAloneForAnEmptyText) {
   int64_t y = 1, m = 2, d = 3, h = 4, min = 5, s = 6;
   EXPECT_TRUE(DateTimeValue::ParseDate("", y, m, d));
