@@ -68,6 +68,7 @@ Range::Range(ScoreValue* min, ScoreValue* max, bool lowIncluded, bool highInclud
   }
   NoteMax();
   NoteSingle();
+  NoteSingleDate();
 }
 
 Range::Range(ScoreValue* value)
@@ -81,8 +82,7 @@ Range::Range(ScoreValue* value)
   NoteMin();
   NoteMax();
   single_ = true;
-  // A single date is found by its seconds as well.
-  if (min_->GetType() == ScoreValue::kDateTime) min_number_ = max_number_ = min_->GetDouble();
+  NoteSingleDate();
 }
 
 Range::Range(const Range& other)
@@ -132,6 +132,10 @@ void Range::NoteMax() {
 
 void Range::NoteSingle() {
   single_ = min_ != nullptr && max_ != nullptr && *min_ == *max_;
+}
+
+void Range::NoteSingleDate() {
+  if (single_ && min_->GetType() == ScoreValue::kDateTime) min_number_ = max_number_ = min_->GetDouble();
 }
 
 bool Range::operator==(const ScoreValueRange& other) const {

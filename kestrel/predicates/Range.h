@@ -53,6 +53,8 @@ class KESTREL_API Range : public ScoreValueRange {
   void NoteMin();
   void NoteMax();
   void NoteSingle();
+  /// A date that is the one value of a new range is found by its seconds as well.
+  void NoteSingleDate();
   void DeleteEnds();
 
   ScoreValue* min_ = nullptr;

@@ -145,6 +145,10 @@ TEST(Range, SingleValuesCompareByTheValuesOwnRules) {
   EXPECT_FALSE(date.IsInRange(&number));
   EXPECT_TRUE(date.IsInRange(5.0)) << "a single date is found by its seconds";
   EXPECT_FALSE(date.IsInRange(6.0));
+  const Range equalEnds(new DateTimeValue(5.0, kDateVal), new DateTimeValue(5.0, kDateVal), false, false);
+  EXPECT_TRUE(equalEnds.IsInRange(&same));
+  EXPECT_TRUE(equalEnds.IsInRange(5.0));
+  EXPECT_FALSE(equalEnds.IsInRange(6.0));
   EXPECT_FALSE(text.IsInRange(0.0)) << "a text is no number";
   const Range five(Number(5));
   const StringValue word("5");
@@ -229,9 +233,9 @@ TEST(Range, LosesItsUpperEndButNotTheNumberForIt) {
   std::ostringstream out;
   copy.Display(out);
   EXPECT_EQ(out.str(),
-            "  Start Range Display   \nMinValue: 0;  MaxValue: NULL; High End included; lower End included\n "
-            "End of "
-            "Range Display\n\n");
+            "  Start Range Display   \n"
+            "MinValue: 0;  MaxValue: NULL; High End included; lower End included\n"
+            " End of Range Display\n\n");
 }
 
 TEST(Range, MayBeGivenOneObjectForBothEnds) {
@@ -287,27 +291,25 @@ TEST(Range, DisplaysItsEnds) {
   };
   const Row kRows[] = {
       {Range(0, 10.5, true, false),
-       "  Start Range Display   \nMinValue: 0;  MaxValue: 10.5; High End not included; lower End included\n "
-       "End of Range "
-       "Display\n\n"},
+       "  Start Range Display   \n"
+       "MinValue: 0;  MaxValue: 10.5; High End not included; lower End included\n"
+       " End of Range Display\n\n"},
       {Range(Text("a"), Text("b"), false, true),
-       "  Start Range Display   \nMinValue: a;  MaxValue: b; High End included; lower End not included\n End "
-       "of Range "
-       "Display\n\n"},
+       "  Start Range Display   \n"
+       "MinValue: a;  MaxValue: b; High End included; lower End not included\n"
+       " End of Range Display\n\n"},
       {Range(1.0 / 3, kSysmis, true, true),
-       "  Start Range Display   \nMinValue: 0.333333;  MaxValue: -1.79769e+308; High End included; lower End "
-       "included\n "
-       "End of Range "
-       "Display\n\n"},
+       "  Start Range Display   \n"
+       "MinValue: 0.333333;  MaxValue: -1.79769e+308; High End included; lower End included\n"
+       " End of Range Display\n\n"},
       {Range(static_cast<ScoreValue*>(nullptr), nullptr, false, false),
-       "  Start Range Display   \nMinValue: -inf;  MaxValue: inf; High End not included; lower End not "
-       "included\n "
-       "End of Range "
-       "Display\n\n"},
+       "  Start Range Display   \n"
+       "MinValue: -inf;  MaxValue: inf; High End not included; lower End not included\n"
+       " End of Range Display\n\n"},
       {Range(new DateTimeValue(86400.0, kDateVal)),
-       "  Start Range Display   \nMinValue: 86400;  MaxValue: 86400; High End included; lower End included\n "
-       "End of Range "
-       "Display\n\n"},
+       "  Start Range Display   \n"
+       "MinValue: 86400;  MaxValue: 86400; High End included; lower End included\n"
+       " End of Range Display\n\n"},
   };
   const kestrel_tests::CommaLocale comma;
   for (const Row& row : kRows) {
