@@ -16,8 +16,8 @@ namespace MCKestrel_800 {
 /// Elements of an interface with `GetValue`, `operator==` and `Clone`, owned and in order of arrival, with
 /// look-ups that answer as a walk would.
 ///
-/// `Element` is the implementation whose elements are filed by their value; it keeps a pointer `changed_` to
-/// a flag that it sets when its value is replaced. Other implementations are asked each time. While the flag
+/// `Element` is the implementation whose elements are filed by their value, a FiledValue `value_`, which
+/// raises our flag when another one is put in. Other implementations are asked each time. While the flag
 /// is up, look-ups walk; the next `Add` or `Remove` files everything anew. Nothing const changes anything, so
 /// readers need no lock.
 template <class Interface, class Element>
@@ -132,7 +132,7 @@ class IndexedElements {
   }
 
   void Watch(Interface* element) {
-    if (IsOwnKind(*element)) static_cast<Element*>(element)->changed_ = &changed_;
+    if (IsOwnKind(*element)) static_cast<Element*>(element)->value_.Watch(&changed_);
   }
 
   void FileNext(const Interface& element) {

@@ -1,5 +1,6 @@
 #include "kestrel/dictionary/ValueLbl.h"
 
+#include <functional>
 #include <ostream>
 
 namespace MCKestrel_800 {
@@ -8,28 +9,14 @@ ScoreValueLabel::~ScoreValueLabel() = default;
 
 ValueLbl::ValueLbl(ScoreValue* value, const std::string& label) : value_(value), label_(label) {}
 
-ValueLbl::ValueLbl(const ValueLbl& other)
-    : ScoreValueLabel(other), value_(other.value_ ? other.value_->Clone() : nullptr), label_(other.label_) {}
-
-ValueLbl& ValueLbl::operator=(const ValueLbl& other) {
-  if (this == &other) return *this;
-  value_.reset(other.value_ ? other.value_->Clone() : nullptr);
-  label_ = other.label_;
-  MarkChanged();
-  return *this;
-}
-
+ValueLbl::ValueLbl(const ValueLbl& other) = default;
+ValueLbl& ValueLbl::operator=(const ValueLbl& other) = default;
 ValueLbl::~ValueLbl() = default;
-
-void ValueLbl::MarkChanged() {
-  if (changed_ != nullptr) *changed_ = true;
-}
 
 bool ValueLbl::SetValueLabel(ScoreValue* value, const std::string& label) {
   if (value == nullptr || label.empty()) return false;
-  if (value != value_.get()) value_.reset(value);
+  value_.Put(value);
   label_ = label;
-  MarkChanged();
   return true;
 }
 
@@ -44,28 +31,23 @@ ValueLbl* ValueLbl::Clone() const {
 }
 
 bool ValueLbl::operator==(const ScoreValueLabel& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ == *value;
+  return value_.Is(std::equal_to<>(), other.GetValue());
 }
 
 bool ValueLbl::operator>(const ScoreValueLabel& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ > *value;
+  return value_.Is(std::greater<>(), other.GetValue());
 }
 
 bool ValueLbl::operator<(const ScoreValueLabel& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ < *value;
+  return value_.Is(std::less<>(), other.GetValue());
 }
 
 bool ValueLbl::operator<=(const ScoreValueLabel& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ <= *value;
+  return value_.Is(std::less_equal<>(), other.GetValue());
 }
 
 bool ValueLbl::operator>=(const ScoreValueLabel& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ >= *value;
+  return value_.Is(std::greater_equal<>(), other.GetValue());
 }
 
 std::string ValueLbl::GetLabel() const {
@@ -73,11 +55,12 @@ std::string ValueLbl::GetLabel() const {
 }
 
 const ScoreValue* ValueLbl::GetValue() const {
-  return value_.get();
+  return value_.Get();
 }
 
 void ValueLbl::Display(std::ostream& os) const {
-  os << "Value: " << (value_ ? value_->GetString() : "NULL") << ";  Label: " << label_ << "\n";
+  const ScoreValue* value = GetValue();
+  os << "Value: " << (value == nullptr ? "NULL" : value->GetString()) << ";  Label: " << label_ << "\n";
 }
 
 }  // namespace MCKestrel_800

@@ -3,9 +3,9 @@
 #ifndef KESTREL_DICTIONARY_VALUELBL_H
 #define KESTREL_DICTIONARY_VALUELBL_H
 
-#include <memory>
 #include <string>
 
+#include "kestrel/dictionary/FiledValue.h"
 #include "kestrel/dictionary/ScoreValueLabel.h"
 
 namespace MCKestrel_800 {
@@ -35,13 +35,8 @@ class KESTREL_API ValueLbl : public ScoreValueLabel {
   template <class Interface, class Element>
   friend class IndexedElements;
 
-  void MarkChanged();
-
-  std::unique_ptr<ScoreValue> value_;
+  FiledValue value_;
   std::string label_;
-  // Belongs to the set that owns this label: set when the value is replaced, so that the set's index is not
-  // trusted any more. A copy starts without it.
-  bool* changed_ = nullptr;
 };
 
 }  // namespace MCKestrel_800

@@ -1,5 +1,6 @@
 #include "kestrel/dictionary/ValueProbability.h"
 
+#include <functional>
 #include <ostream>
 
 #include "kestrel/foundation/NumberText.h"
@@ -20,30 +21,14 @@ ScoreValueProbability::~ScoreValueProbability() = default;
 ValueProbability::ValueProbability(ScoreValue* value, double probability)
     : value_(value), probability_(IsProbability(probability) ? probability : 0.0) {}
 
-ValueProbability::ValueProbability(const ValueProbability& other)
-    : ScoreValueProbability(other),
-      value_(other.value_ ? other.value_->Clone() : nullptr),
-      probability_(other.probability_) {}
-
-ValueProbability& ValueProbability::operator=(const ValueProbability& other) {
-  if (this == &other) return *this;
-  value_.reset(other.value_ ? other.value_->Clone() : nullptr);
-  probability_ = other.probability_;
-  MarkChanged();
-  return *this;
-}
-
+ValueProbability::ValueProbability(const ValueProbability& other) = default;
+ValueProbability& ValueProbability::operator=(const ValueProbability& other) = default;
 ValueProbability::~ValueProbability() = default;
-
-void ValueProbability::MarkChanged() {
-  if (changed_ != nullptr) *changed_ = true;
-}
 
 bool ValueProbability::SetValueProbability(ScoreValue* value, double probability) {
   if (value == nullptr || !IsProbability(probability)) return false;
-  if (value != value_.get()) value_.reset(value);
+  value_.Put(value);
   probability_ = probability;
-  MarkChanged();
   return true;
 }
 
@@ -58,28 +43,23 @@ ValueProbability* ValueProbability::Clone() const {
 }
 
 bool ValueProbability::operator==(const ScoreValueProbability& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ == *value;
+  return value_.Is(std::equal_to<>(), other.GetValue());
 }
 
 bool ValueProbability::operator>(const ScoreValueProbability& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ > *value;
+  return value_.Is(std::greater<>(), other.GetValue());
 }
 
 bool ValueProbability::operator<(const ScoreValueProbability& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ < *value;
+  return value_.Is(std::less<>(), other.GetValue());
 }
 
 bool ValueProbability::operator<=(const ScoreValueProbability& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ <= *value;
+  return value_.Is(std::less_equal<>(), other.GetValue());
 }
 
 bool ValueProbability::operator>=(const ScoreValueProbability& other) const {
-  const ScoreValue* value = other.GetValue();
-  return value_ && value != nullptr && *value_ >= *value;
+  return value_.Is(std::greater_equal<>(), other.GetValue());
 }
 
 double ValueProbability::GetProbability() const {
@@ -87,11 +67,12 @@ double ValueProbability::GetProbability() const {
 }
 
 const ScoreValue* ValueProbability::GetValue() const {
-  return value_.get();
+  return value_.Get();
 }
 
 void ValueProbability::Display(std::ostream& os) const {
-  os << "Value: " << (value_ ? value_->GetString() : "NULL")
+  const ScoreValue* value = GetValue();
+  os << "Value: " << (value == nullptr ? "NULL" : value->GetString())
      << ";  Probability: " << FormatSixDigits(probability_) << "\n";
 }
 

@@ -3,8 +3,7 @@
 #ifndef KESTREL_DICTIONARY_VALUEPROBABILITY_H
 #define KESTREL_DICTIONARY_VALUEPROBABILITY_H
 
-#include <memory>
-
+#include "kestrel/dictionary/FiledValue.h"
 #include "kestrel/dictionary/ScoreValueProbability.h"
 
 namespace MCKestrel_800 {
@@ -34,13 +33,8 @@ class KESTREL_API ValueProbability : public ScoreValueProbability {
   template <class Interface, class Element>
   friend class IndexedElements;
 
-  void MarkChanged();
-
-  std::unique_ptr<ScoreValue> value_;
+  FiledValue value_;
   double probability_;
-  // Belongs to the set that owns this object: set when the value is replaced, so that the set's index is not
-  // trusted any more. A copy starts without it.
-  bool* changed_ = nullptr;
 };
 
 }  // namespace MCKestrel_800
