@@ -38,22 +38,7 @@ CaseRecord::CaseRecord(int n) : stamp_(NewStamp()) {
 }
 
 // Through the other constructor, so that the destructor runs when a value cannot be cloned.
-CaseRecord::CaseRecord(const CaseRecord& other) : CaseRecord(static_cast<int>(other.values_.size())) {
-  CopyValues(other);
-}
-
-CaseRecord& CaseRecord::operator=(const CaseRecord& other) {
-  if (this == &other) return *this;
-  DeleteValues();
-  CopyValues(other);
-  return *this;
-}
-
-CaseRecord::~CaseRecord() {
-  DeleteValues();
-}
-
-void CaseRecord::CopyValues(const CaseRecord& other) {
+CaseRecord::CaseRecord(const CaseRecord& other) : CaseRecord() {
   positions_ = other.positions_;
   stamp_ = other.stamp_;
   values_.resize(other.values_.size(), nullptr);
@@ -64,12 +49,19 @@ void CaseRecord::CopyValues(const CaseRecord& other) {
   }
 }
 
-void CaseRecord::DeleteValues() {
+CaseRecord& CaseRecord::operator=(const CaseRecord& other) {
+  if (this == &other) return *this;
+  CaseRecord copy(other);
+  positions_.swap(copy.positions_);
+  values_.swap(copy.values_);
+  numbers_.swap(copy.numbers_);
+  stamp_ = copy.stamp_;
+  return *this;
+}
+
+CaseRecord::~CaseRecord() {
   for (ScoreValue* value : values_)
     delete value;
-  values_.clear();
-  numbers_.clear();
-  positions_.clear();
 }
 
 bool CaseRecord::HasSlot(int index) const {
@@ -178,13 +170,11 @@ bool CaseRecord::SetOtherMissing(std::size_t position) {
   ScoreValue* held = values_[position];
   if (held == nullptr) return false;
   if (typeid(*held) == typeid(StringValue)) {
-    static const std::string kEmpty;
-    static_cast<StringValue*>(held)->SetString(kEmpty);
+    static_cast<StringValue*>(held)->SetString(std::string());
   } else if (held->GetType() == ScoreValue::kNumeric) {
     const NumericValue missing;
     held->SetValue(&missing);
-  } else if (typeid(*held) == typeid(DateTimeValue)) {
-    auto* date = static_cast<DateTimeValue*>(held);
+  } else if (auto* date = dynamic_cast<DateTimeValue*>(held)) {
     date->SetDateTimeValue(NumericValue::gSysmisValue, date->GetDateTimeType());
   } else if (held->GetType() == ScoreValue::kDateTime) {
     const DateTimeValue missing;

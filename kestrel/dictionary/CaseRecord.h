@@ -53,8 +53,6 @@ class KESTREL_API CaseRecord : public ScoreCaseRecord {
   void Put(std::size_t position, ScoreValue* value);
   bool SetOtherNumber(std::size_t position, double value);
   bool SetOtherMissing(std::size_t position);
-  void CopyValues(const CaseRecord& other);
-  void DeleteValues();
 
   std::map<std::string, int> positions_;
   std::vector<ScoreValue*> values_;

@@ -4,6 +4,7 @@
 
 #include <limits>
 #include <memory>
+#include <new>
 #include <set>
 #include <thread>
 
@@ -156,6 +157,41 @@ TEST(CaseRecord, SetMissingValueFollowsTheKind) {
   EXPECT_TRUE(record.SetMissingValue(0));
   EXPECT_TRUE(record.SetValue(0, 4.0));
   EXPECT_EQ(record.Get(0)->GetDouble(), 4);
+}
+
+/// A date of a class derived from ours.
+class NamedDate : public DateTimeValue {
+ public:
+  using DateTimeValue::DateTimeValue;
+};
+
+TEST(CaseRecord, AMissingDateStaysOfItsKindAlsoInADerivedClass) {
+  CaseRecord record;
+  auto* date = new NamedDate(5.0, kTimeVal);
+  record.Add("date", date);
+  EXPECT_TRUE(record.SetMissingValue("date"));
+  EXPECT_TRUE(date->IsSystemMissingValue());
+  EXPECT_EQ(date->GetDateTimeType(), kTimeVal);
+}
+
+/// A value that cannot be copied.
+class Uncopyable : public WholeValue {
+ public:
+  using WholeValue::WholeValue;
+  ScoreValue* Clone() const override { throw std::bad_alloc(); }
+};
+
+TEST(CaseRecord, StaysAsItWasWhenAnotherCannotBeCopied) {
+  CaseRecord record, other;
+  record.Add("kept", NewNumber(1));
+  other.Add("a", NewNumber(2));
+  other.Add("b", new Uncopyable(3));
+  const unsigned long long stamp = record.GetLayoutStamp();
+  EXPECT_THROW(record = other, std::bad_alloc);
+  EXPECT_EQ(record.GetVarNames(), Names{"kept"});
+  EXPECT_EQ(record.Get("kept")->GetDouble(), 1);
+  EXPECT_EQ(record.GetLayoutStamp(), stamp);
+  EXPECT_THROW(CaseRecord copy(other), std::bad_alloc);
 }
 
 TEST(CaseRecord, RemoveEmptiesTheSlotAndKeepsTheName) {
