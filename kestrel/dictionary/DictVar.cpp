@@ -2,6 +2,7 @@
 
 #include <memory>
 #include <ostream>
+#include <typeinfo>
 
 #include "kestrel/dictionary/MissingValueSet.h"
 #include "kestrel/dictionary/ValueLabelSet.h"
@@ -10,6 +11,17 @@
 #include "kestrel/foundation/StringValue.h"
 
 namespace MCKestrel_800 {
+
+namespace {
+
+/// The set, when it is exactly of our own class. A class derived from ours may answer differently, so it is
+/// asked through the interface.
+template <class Own, class Interface>
+const Own* AsOwn(const Interface* set) {
+  return set != nullptr && typeid(*set) == typeid(Own) ? static_cast<const Own*>(set) : nullptr;
+}
+
+}  // namespace
 
 ScoreDictVar::~ScoreDictVar() = default;
 
@@ -220,12 +232,12 @@ ScoreMissingValueSet* DictVar::GetMissingValues() const {
 
 void DictVar::SetMissingValues(ScoreMissingValueSet* missingValues) {
   missingValues_ = missingValues;
-  indexedMissingValues_ = dynamic_cast<const MissingValueSet*>(missingValues);
+  indexedMissingValues_ = AsOwn<MissingValueSet>(missingValues);
 }
 
 void DictVar::SetValueLabels(ScoreValueLabelSet* valueLabels) {
   valueLabels_ = valueLabels;
-  indexedValueLabels_ = dynamic_cast<const ValueLabelSet*>(valueLabels);
+  indexedValueLabels_ = AsOwn<ValueLabelSet>(valueLabels);
 }
 
 ScoreValue* DictVar::ToMyValue(const std::string& text) const {
