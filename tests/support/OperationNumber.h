@@ -6,6 +6,8 @@
 
 #include <cstddef>
 #include <cstring>
+#include <numeric>
+#include <vector>
 
 namespace kestrel_tests {
 
@@ -20,6 +22,13 @@ long OperationNumber(Operation operation) {
   // Virtual ones hold their place in the table in bytes, plus one. The destructor takes the first two places.
   if (parts[0] % 2 == 0) return -1;
   return static_cast<long>((parts[0] - 1) / static_cast<std::ptrdiff_t>(sizeof(void*))) - 1;
+}
+
+/// The numbers that so many operations have when they are listed in their order: 1, 2, 3, ...
+inline std::vector<long> InOrder(std::size_t count) {
+  std::vector<long> numbers(count);
+  std::iota(numbers.begin(), numbers.end(), 1L);
+  return numbers;
 }
 
 }  // namespace kestrel_tests
