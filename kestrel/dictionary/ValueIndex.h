@@ -27,9 +27,10 @@ struct ValueKey {
   };
 
   Kind kind = kForeign;
-  std::uint32_t own = 0;  ///< where it is filed
-  std::uint32_t neighbour =
-      0;  ///< the other place where an equal value may be; the same as `own` when there is none
+  /// Where it is filed.
+  std::uint32_t own = 0;
+  /// The other place where an equal value may be; the same as `own` when there is none.
+  std::uint32_t neighbour = 0;
 
   bool IsFiled() const { return kind >= kNumber; }
 };
@@ -106,8 +107,8 @@ class KESTREL_API ValueIndex {
   void LinkAll();
 
   std::vector<std::uint32_t> places_;  // by position
-  std::vector<std::uint32_t>
-      next_;  // by position: the next one in the same chain, in a ring; kUnlinked if in none
+  // By position: the next one in the same chain, in a ring; kUnlinked if in none.
+  std::vector<std::uint32_t> next_;
   std::vector<std::uint32_t> tails_;    // by the place's low bits: the last position of the chain
   std::vector<std::uint32_t> foreign_;  // ascending
   std::size_t linked_ = 0;

@@ -18,12 +18,12 @@ struct UConverter;
 ///   _8  UTF-8.
 ///
 /// Common rules:
+///
 /// - Texts without a length end at their zero byte; a null text counts as empty. Texts with a length need no
-/// zero
-///   byte and may hold some.
+///   zero byte and may hold some.
 /// - Bytes that are no character (malformed) count as a character of one byte each; in UTF-8 the longest
-/// piece
-///   that begins like a character counts as one. Walking forwards and backwards finds the same boundaries.
+///   piece that begins like a character counts as one. Walking forwards and backwards finds the same
+///   boundaries.
 /// - A character that the code page allows and Unicode lacks is a character; its code point reads as U+FFFD.
 /// - No call allocates, but for strcspn with characters beyond ASCII in its set and FindStarts.
 /// - Steps forwards look at one character. Steps backwards in a code page must find a place where a character
@@ -31,9 +31,9 @@ struct UConverter;
 ///   far backwards takes FindStarts once.
 ///
 /// Operations:
+///
 /// - mblen: the bytes of the character at `at`, of which `length` bytes are there; 0 at the end of the text
-/// (zero
-///   byte or no length), -1 when the bytes are malformed or end within the character.
+///   (zero byte or no length), -1 when the bytes are malformed or end within the character.
 /// - mbclen: the same for terminated text; 1 or more, 0 at the end.
 /// - IsLeadByte: whether a character of several bytes can begin with the byte.
 /// - strinc: the next character; at the end it stays.
@@ -42,18 +42,15 @@ struct UConverter;
 /// - FindStart: the start of the character that holds byte `index`; `length` when `index` is not less.
 /// - FindStarts: the starts of all characters, in one pass.
 /// - strncpy: copies whole characters, at most `size` bytes of them, and fills what is left of the `size`
-/// bytes
-///   with zeros. As with C's function there is no zero byte when the text fills all. Returns `to`.
+///   bytes with zeros. As with C's function there is no zero byte when the text fills all. Returns `to`.
 /// - strchr, strrchr: the first, or last, place of a code point, or null. Zero finds the end of the text.
 /// - strcspn: how many bytes come before the first character that is in `set`.
 /// - strnicmp, qstricmp: order two texts without regard to case (Unicode's simple case folding, the same in
-/// every
-///   locale): less than, equal to or more than 0. strnicmp looks at the whole characters within the first
-///   `size` bytes of each. A null text orders like an empty one.
+///   every locale): less than, equal to or more than 0. strnicmp looks at the whole characters within the
+///   first `size` bytes of each. A null text orders like an empty one.
 /// - U32Get: the code point at `at`: 0 at the end, U+FFFD for what has none.
 /// - ConverterNew: a new converter for a name in that kind of text, or for the default encoding when the name
-/// is
-///   null; null when ICU does not know it. The caller frees it with VEXAMBConverterDelete.
+///   is null; null when ICU does not know it. The caller frees it with VEXAMBConverterDelete.
 namespace MCXML_800 {
 
 KESTREL_API int VEXAMBmblen_C(const char* at, size_t length);
