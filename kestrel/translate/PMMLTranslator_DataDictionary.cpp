@@ -104,19 +104,9 @@ void ReadExtension(DOMElement* extension, FieldSettings& settings, ScoreDictVar&
   PMMLTranslator::ParseUsageTypeExtension(extension, &variable);
 }
 
-/// The next node after `node` in document order inside `top`; null at the end.
-DOMNode* NextInSubtree(DOMNode* node, const DOMNode* top) {
-  if (DOMNode* child = node->getFirstChild()) return child;
-  while (node != top) {
-    if (DOMNode* next = node->getNextSibling()) return next;
-    node = node->getParentNode();
-  }
-  return nullptr;
-}
-
-/// Reads all extensions below a field, at any depth. Walks without recursion, so depth costs no stack.
+/// Reads all extensions below a field, at any depth.
 void ReadExtensions(DOMElement* field, FieldSettings& settings, ScoreDictVar& variable) {
-  for (DOMNode* node = NextInSubtree(field, field); node != nullptr; node = NextInSubtree(node, field)) {
+  for (DOMNode* node = NextInTree(field, field); node != nullptr; node = NextInTree(node, field)) {
     if (ElementIs(node, Tag::XML_ELE_EXTENSION)) {
       ReadExtension(static_cast<DOMElement*>(node), settings, variable);
     }

@@ -10,23 +10,6 @@ namespace MCKestrel_800 {
 
 namespace {
 
-// Calls `use` with the text of every text node below `element`, in document order. Walks without recursion.
-template <typename Use>
-void ForEachText(const xercesc::DOMNode* element, Use use) {
-  const xercesc::DOMNode* node = element != nullptr ? element->getFirstChild() : nullptr;
-  while (node != nullptr) {
-    const xercesc::DOMNode::NodeType type = node->getNodeType();
-    if (type == xercesc::DOMNode::TEXT_NODE || type == xercesc::DOMNode::CDATA_SECTION_NODE)
-      use(node->getNodeValue());
-    const xercesc::DOMNode* next = node->getFirstChild();
-    while (next == nullptr && node != element) {
-      next = node->getNextSibling();
-      if (next == nullptr) node = node->getParentNode();
-    }
-    node = next;
-  }
-}
-
 xercesc::DOMElement* ElementAtOrAfter(const xercesc::DOMNode* node, const char16_t* tag) {
   for (; node != nullptr; node = node->getNextSibling()) {
     if (node->getNodeType() != xercesc::DOMNode::ELEMENT_NODE) continue;
@@ -75,23 +58,33 @@ xercesc::DOMElement* NextSibling(const xercesc::DOMNode* node, const char16_t* t
   return node != nullptr ? ElementAtOrAfter(node->getNextSibling(), tag) : nullptr;
 }
 
+xercesc::DOMNode* NextInTree(const xercesc::DOMNode* node, const xercesc::DOMNode* top) {
+  if (node == nullptr) return nullptr;
+  if (xercesc::DOMNode* const child = node->getFirstChild()) return child;
+  while (node != nullptr && node != top) {
+    if (xercesc::DOMNode* const sibling = node->getNextSibling()) return sibling;
+    node = node->getParentNode();
+  }
+  return nullptr;
+}
+
 xercesc::DOMElement* FirstDescendant(const xercesc::DOMElement* element, const char16_t* tag) {
-  const xercesc::DOMNode* node = element != nullptr ? element->getFirstChild() : nullptr;
-  while (node != nullptr) {
-    if (ElementIs(node, tag)) return static_cast<xercesc::DOMElement*>(const_cast<xercesc::DOMNode*>(node));
-    const xercesc::DOMNode* next = node->getFirstChild();
-    while (next == nullptr && node != element) {
-      next = node->getNextSibling();
-      if (next == nullptr) node = node->getParentNode();
-    }
-    node = next;
+  for (xercesc::DOMNode* node = NextInTree(element, element); node != nullptr;
+       node = NextInTree(node, element)) {
+    if (ElementIs(node, tag)) return static_cast<xercesc::DOMElement*>(node);
   }
   return nullptr;
 }
 
 std::u16string ElementText(const xercesc::DOMNode* element) {
   std::u16string result;
-  ForEachText(element, [&result](const XMLCh* text) { result += ToUtf16(text); });
+  for (const xercesc::DOMNode* node = NextInTree(element, element); node != nullptr;
+       node = NextInTree(node, element)) {
+    const xercesc::DOMNode::NodeType type = node->getNodeType();
+    if (type == xercesc::DOMNode::TEXT_NODE || type == xercesc::DOMNode::CDATA_SECTION_NODE) {
+      result += ToUtf16(node->getNodeValue());
+    }
+  }
   return result;
 }
 

@@ -64,6 +64,10 @@ KESTREL_API xercesc::DOMElement* FirstChild(const xercesc::DOMNode* node, const 
 KESTREL_API xercesc::DOMElement* NextSibling(const xercesc::DOMNode* node);
 KESTREL_API xercesc::DOMElement* NextSibling(const xercesc::DOMNode* node, const char16_t* tag);
 
+/// The node after `node` in document order below `top`, of which `top` itself comes before all; null after
+/// the last one. Walks up and along instead of recursing, so that depth costs no stack.
+KESTREL_API xercesc::DOMNode* NextInTree(const xercesc::DOMNode* node, const xercesc::DOMNode* top);
+
 /// The first descendant element in document order with the tag, found without a live node list; null when
 /// there is none.
 KESTREL_API xercesc::DOMElement* FirstDescendant(const xercesc::DOMElement* element, const char16_t* tag);

@@ -79,6 +79,7 @@ TEST(XmlText, FindsDescendantsInDocumentOrder) {
   EXPECT_EQ(FirstDescendant(root, u"a"), nullptr) << "not the element itself";
   EXPECT_EQ(FirstDescendant(FirstChild(root, u"b"), u"e"), nullptr) << "not beside the element";
   EXPECT_EQ(FirstDescendant(nullptr, u"a"), nullptr);
+  EXPECT_EQ(NextInTree(nullptr, nullptr), nullptr);
 }
 
 TEST(XmlText, JoinsTheTextOfAllDescendants) {
