@@ -98,6 +98,15 @@ TEST(PMMLTranslatorIntervals, ThatAreEmptyMakeEverythingMissing) {
   EXPECT_TRUE(IsMissing(*variable, 100.0));
 }
 
+TEST(PMMLTranslatorIntervals, LeaveInfinityAlone) {
+  const auto valid = ContinuousField(Interval("closedClosed", "0", "10"));
+  const auto invalid = ContinuousField("<Extension name='invalidRangeLower' value='99'/>");
+  EXPECT_FALSE(IsMissing(*valid, kInfinity)) << "an infinity lies in no range";
+  EXPECT_FALSE(IsMissing(*invalid, kInfinity)) << "nor equals the end of one";
+  EXPECT_FALSE(IsMissing(*valid, -kInfinity));
+  EXPECT_TRUE(IsMissing(*valid, std::numeric_limits<double>::max())) << "the largest number does";
+}
+
 TEST(PMMLTranslatorIntervals, AreOfNumbersAlone) {
   const auto variable = ContinuousField(Interval("closedClosed", "0", "10"), "date");
   const DateTimeValue outside(100.0, kDate);
