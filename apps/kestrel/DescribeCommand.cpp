@@ -51,23 +51,30 @@ Json ToJson(const ModelDescription& model) {
 
 using TableLine = std::array<std::string, 6>;
 
-std::string Join(const std::vector<std::string>& texts) {
+/// A line stays readable; who needs them all takes the other form.
+std::string Join(const std::vector<std::string>& texts, std::size_t most) {
   std::string joined;
-  for (const std::string& text : texts)
-    joined += (joined.empty() ? "" : ", ") + ShownText(text);
+  for (std::size_t i = 0; i < texts.size() && i < most; ++i)
+    joined += (i == 0 ? "" : ", ") + ShownText(texts[i]);
+  if (texts.size() > most) joined += " and " + std::to_string(texts.size() - most) + " more (see --json)";
   return joined.empty() ? "-" : joined;
 }
 
 TableLine ToLine(const FieldDescription& field) {
+  constexpr std::size_t kMostMissing = 5;
+  constexpr std::size_t kMostCategories = 20;
   std::vector<std::string> categories;
   for (const FieldDescription::Category& category : field.categories) {
     categories.push_back(category.label.empty() ? category.value
                                                 : category.value + " (" + category.label + ")");
   }
   const bool is_target = field.role == "target";
-  return {ShownText(field.name), field.type,
-          field.level,           field.role + (field.is_read || is_target ? "" : " (not read)"),
-          Join(field.missing),   Join(categories)};
+  return {ShownText(field.name),
+          field.type,
+          field.level,
+          field.role + (field.is_read || is_target ? "" : " (not read)"),
+          Join(field.missing, kMostMissing),
+          Join(categories, kMostCategories)};
 }
 
 /// Characters, not bytes: names need not be ASCII.

@@ -5,6 +5,7 @@
 #include <iostream>
 #include <new>
 
+#include "apps/kestrel/DocumentHints.h"
 #include "apps/kestrel/InputFile.h"
 #include "apps/kestrel/ProgramError.h"
 #include "kestrel/foundation/KestrelException.h"
@@ -16,39 +17,6 @@ namespace kestrel_program {
 namespace {
 
 using namespace MCKestrel_800;
-
-/// What a person can do about a fault.
-const char* HintFor(int code) {
-  switch (code) {
-    case KestrelException::kStructure:
-      return "an element or attribute stands where it may not, or a required one is absent; compare the "
-             "place with "
-             "the PMML standard";
-    case KestrelException::kFile:
-      return "check the path, and that the file can be read";
-    case KestrelException::kConversion:
-      return "correct the text so that it reads as what the field or attribute needs";
-    case KestrelException::kMissingElement:
-      return "add what is missing, or check that the file is the right one";
-    case KestrelException::kUnsupported:
-      return "export the model in a form without this construct";
-    case KestrelException::kInvalidDocument:
-      return "the document must be well-formed XML without outside references, and attributes with a list of "
-             "values "
-             "must have one of them";
-    case KestrelException::kInvalidValue:
-      return "the value must be one that its field takes";
-    case KestrelException::kUnknownVariable:
-      return "declare every field once in the DataDictionary and spell its name the same everywhere";
-    case KestrelException::kInvalidOperator:
-    case KestrelException::kInvalidType:
-      return "the operator, optype or data type must fit the field";
-    case KestrelException::kInconsistentDictionary:
-      return "correct the DataDictionary so that it does not contradict itself";
-    default:
-      return nullptr;
-  }
-}
 
 /// Some messages begin with a line end, which belongs to their text but not onto a terminal.
 std::string WithoutLeadingLineEnds(const std::string& text) {
@@ -67,7 +35,7 @@ ProgramError Describe(const std::string& name, const KestrelException& fault) {
   if (code == KestrelException::kUnsupported && !reason.empty()) {
     text += "\n  the system says: " + reason +
             "\n  hint: install the library for this kind of model beside the others, in lib/kestrel/plugins";
-  } else if (const char* hint = HintFor(code)) {
+  } else if (const char* hint = HintForFault(code, fault.GetErrorMessage())) {
     text += std::string("\n  hint: ") + hint;
   }
   return ProgramError(code == KestrelException::kFile ? kInputOutput : kDocument, text);

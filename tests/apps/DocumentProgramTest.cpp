@@ -36,18 +36,29 @@ struct DocumentRow {
 const DocumentRow kDocuments[] = {
     {"not well-formed", "</RegressionTable>", "",
      ":16:5: Invalid XML file!! (code 6)\n"
-     "  hint: the document must be well-formed XML without outside references, and attributes with a list of "
-     "values "
-     "must have one of them\n"},
+     "  hint: up to here it is well-formed XML; what follows is not, needs something outside of the "
+     "document, "
+     "or is beyond the limits in docs/documents.md\n"},
     {"an unknown optype", "name=\"x\" optype=\"continuous\"", "name=\"x\" optype=\"gradual\"",
      ":5:61: gradual: Invalid Variable Type (code 11)\n"
-     "  hint: the operator, optype or data type must fit the field\n"},
+     "  hint: accepted as optype is continuous, categorical or ordinal; where a number is needed, no text "
+     "field\n"},
     {"a number of fields that is not right", "numberOfFields=\"2\"", "numberOfFields=\"3\"",
      ":4:38: Number of Variables in the Dictionary does not match with numberOfFields! (code 12)\n"
-     "  hint: correct the DataDictionary so that it does not contradict itself\n"},
+     "  hint: accepted is the number of DataField elements\n"},
     {"no model element", "RegressionModel", "Regress",
      ":2:57: Unsupported Model found! (code 5)\n"
-     "  hint: export the model in a form without this construct\n"},
+     "  hint: accepted is a PMML element with a model such as RegressionModel directly in it; with --models, "
+     "one that the list names\n"},
+    {"a coefficient with a comma", "coefficient=\"2\"", "coefficient=\"2,5\"",
+     ":14:53: 2,5Invalid double string --  (code 3)\n"
+     "  hint: accepted is a number such as -1.5 or 2e3, with a decimal point\n"},
+    {"a predictor that is no field", "NumericPredictor name=\"x\"", "NumericPredictor name=\"z\"",
+     ":14:51: Variable z not among the active fields of the MiningSchema! (code 8)\n"
+     "  hint: accepted is the name of a MiningField of this model with usageType=\"active\" or none\n"},
+    {"another function", "functionName=\"regression\"", "functionName=\"clustering\"",
+     ":8:46: functionName -- clustering: Not supported! (code 5)\n"
+     "  hint: accepted is regression or classification\n"},
 };
 
 TEST(KestrelCheck, SaysWhatIsWrongAndWhere) {
@@ -152,7 +163,7 @@ TEST(KestrelModels, SurvivesLibrariesThatFail) {
       {"NULL_MODEL", "kestrel: T/m.xml: the model's library made no model of it\n"},
       {"THROWS_KESTREL",
        "kestrel: T/m.xml: Variable x not in the dictionary! (code 8)\n"
-       "  hint: declare every field once in the DataDictionary and spell its name the same everywhere\n"},
+       "  hint: accepted is the name of a DataField; upper and lower case count\n"},
   };
   for (const auto& [fault, want] : rows) {
     const ProgramOutcome outcome = CheckWithFaultyLibrary(fault);
@@ -202,6 +213,26 @@ TEST(KestrelDescribe, WritesJson) {
   EXPECT_EQ(model["inputs"][7]["type"], "dateDaysSince[1970]");
   EXPECT_EQ(model["inputs"][8]["role"], "supplementary");
   EXPECT_EQ(model["inputs"][8]["read"], false);
+}
+
+TEST(KestrelDescribe, ShowsSoManyCategoriesAsCanBeRead) {
+  std::string field = "name=\"x\" optype=\"categorical\" dataType=\"double\">";
+  for (int i = 1; i <= 1000; ++i)
+    field += "<Value value=\"" + std::to_string(i) + "\"/>";
+  for (int i = 1; i <= 7; ++i)
+    field += "<Value value=\"-" + std::to_string(i) + "\" property=\"missing\"/>";
+  const std::string document =
+      Replaced(FileText(DataPath("line.xml")), "name=\"x\" optype=\"continuous\" dataType=\"double\"/>",
+               field + "</DataField>");
+  const ProgramOutcome table = RunKestrel({"describe", "-"}, document);
+  EXPECT_EQ(table.exit_code, 0) << table.errors;
+  EXPECT_NE(table.output.find("  -1, -2, -3, -4, -5 and 2 more (see --json)  1, 2, 3, "), std::string::npos)
+      << table.output;
+  EXPECT_NE(table.output.find(", 19, 20 and 980 more (see --json)\n"), std::string::npos) << table.output;
+  const nlohmann::json model =
+      nlohmann::json::parse(RunKestrel({"describe", "-", "--json"}, document).output);
+  EXPECT_EQ(model["inputs"][0]["categories"].size(), 1000u);
+  EXPECT_EQ(model["inputs"][0]["missing"].size(), 7u);
 }
 
 TEST(KestrelDescribe, AlignsNamesThatAreNotAscii) {

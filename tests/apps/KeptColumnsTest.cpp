@@ -57,6 +57,23 @@ TEST(NameOutputColumns, GivesEveryColumnANameOfItsOwn) {
   EXPECT_EQ(NameOutputColumns({}, {"probability", "probability"}), Names({"probability", "probability_2"}));
 }
 
+TEST(ShownText, HoldsPrintableUtf8Alone) {
+  const std::pair<const char*, const char*> rows[] = {
+      {"\xC3\xA4\xE2\x82\xAC\xF0\x9F\x8C\x8D", "\xC3\xA4\xE2\x82\xAC\xF0\x9F\x8C\x8D"},
+      {"a\xC2\x9B[2J", "a??[2J"},          // a terminal takes it as an escape sequence
+      {"M\xFCnchen", "M?nchen"},           // Latin-1
+      {"cut off \xE2\x82", "cut off ??"},  // the third byte is not there
+      {"\xC0\xAF", "??"},                  // longer than it need be
+      {"\xE0\x9F\xBF", "???"},
+      {"\xED\xA0\x80", "???"},  // half a surrogate pair
+      {"\xF0\x8F\xBF\xBF", "????"},
+      {"\xF4\x90\x80\x80", "????"},  // beyond the last character
+      {"\xF5\xFF\x80", "???"},
+  };
+  for (const auto& [text, want] : rows)
+    EXPECT_EQ(ShownText(text), want);
+}
+
 TEST(ShownText, IsOneShortLine) {
   EXPECT_EQ(ShownText("abc"), "abc");
   EXPECT_EQ(ShownText("a\nb\x1B[2J\x7F"), "a?b?[2J?");

@@ -1,0 +1,95 @@
+#include "apps/kestrel/DocumentHints.h"
+
+#include "kestrel/foundation/KestrelException.h"
+
+namespace kestrel_program {
+namespace {
+
+using MCKestrel_800::KestrelException;
+
+struct Hint {
+  int code;
+  const char* part;  ///< of the message; the empty one is in every message
+  const char* text;
+};
+
+/// The first row that fits counts, so a code's general row is its last.
+constexpr Hint kHints[] = {
+    {KestrelException::kStructure, "Duplicated", "each of them may be there once; remove or rename one"},
+    {KestrelException::kStructure, "defined as both", "a value may be on one of the two lists only"},
+    {KestrelException::kStructure, "more than one target",
+     "targetFieldName=\"...\" in the model chooses one"},
+    {KestrelException::kStructure, "allowed for regression",
+     "several tables belong to functionName=\"classification\""},
+    {KestrelException::kStructure, "required for each category",
+     "add a RegressionTable with this targetCategory, or remove the category from the target"},
+    {KestrelException::kStructure, "",
+     "an element or attribute stands where it may not, or a required one is absent; docs/documents.md lists "
+     "them"},
+    {KestrelException::kFile, "", "check the path, and that the file can be read"},
+    {KestrelException::kConversion, "integer",
+     "accepted is a whole number such as 12, without blanks and decimals"},
+    {KestrelException::kConversion, "", "accepted is a number such as -1.5 or 2e3, with a decimal point"},
+    {KestrelException::kMissingElement, "no dtd file",
+     "this is no XML, or its bytes are not in the encoding that it declares (UTF-8 when it declares none)"},
+    {KestrelException::kMissingElement, "not parseable",
+     "there is nothing in it; is the file the right one?"},
+    {KestrelException::kMissingElement, "", "add what is missing, or check that the file is the right one"},
+    {KestrelException::kUnsupported, "Unsupported Model found",
+     "accepted is a PMML element with a model such as RegressionModel directly in it; with --models, one "
+     "that "
+     "the list names"},
+    {KestrelException::kUnsupported, "functionName", "accepted is regression or classification"},
+    {KestrelException::kUnsupported, "without order",
+     "accepted is none, softmax or simplemax, or a target with optype=\"ordinal\""},
+    {KestrelException::kUnsupported, "", "export the model in a form without this construct"},
+    {KestrelException::kInvalidDocument, "Invalid XML file",
+     "up to here it is well-formed XML; what follows is not, needs something outside of the document, or is "
+     "beyond the limits in docs/documents.md"},
+    {KestrelException::kInvalidDocument, "invalid normalizationMethod",
+     "accepted is none, softmax, simplemax, logit, probit, cloglog, loglog, cauchit or exp"},
+    {KestrelException::kInvalidDocument, "invalid usageType",
+     "accepted is active, target, predicted, supplementary, order, group, frequencyWeight or analysisWeight"},
+    {KestrelException::kInvalidDocument, "invalid optype", "accepted is continuous, categorical or ordinal"},
+    {KestrelException::kInvalidDocument, "invalid outliers",
+     "accepted is asIs, asMissingValues or asExtremeValues"},
+    {KestrelException::kInvalidDocument, "invalid missingValueTreatment",
+     "accepted is asIs, asMean, asMode, asMedian, asValue or returnInvalid"},
+    {KestrelException::kInvalidDocument, "invalid invalidValueTreatment",
+     "accepted is returnInvalid, asIs, asMissing or asValue"},
+    {KestrelException::kInvalidDocument, "property value", "accepted is valid, invalid or missing"},
+    {KestrelException::kInvalidDocument, "invalidValueReplacement is required",
+     "invalidValueTreatment=\"asValue\" needs invalidValueReplacement=\"...\" beside it"},
+    {KestrelException::kInvalidDocument, "lowValue is above", "exchange the two"},
+    {KestrelException::kInvalidDocument, "", "attributes with a list of values must have one of them"},
+    {KestrelException::kInvalidValue, "",
+     "a field that lists its categories takes these alone, and one that is not dataType=\"string\" numbers "
+     "alone"},
+    {KestrelException::kUnknownVariable, "active fields",
+     "accepted is the name of a MiningField of this model with usageType=\"active\" or none"},
+    {KestrelException::kUnknownVariable, "in the dictionary!",
+     "accepted is the name of a DataField; upper and lower case count"},
+    {KestrelException::kUnknownVariable, "", "every DataField needs a name of its own"},
+    {KestrelException::kInvalidOperator, "", "the operator must fit the field"},
+    {KestrelException::kInvalidType, "string variable",
+     "dataType=\"string\" goes with optype categorical or ordinal"},
+    {KestrelException::kInvalidType, "flag", "a flag is a field with optype=\"categorical\""},
+    {KestrelException::kInvalidType, "",
+     "accepted as optype is continuous, categorical or ordinal; where a number is needed, no text field"},
+    {KestrelException::kInconsistentDictionary, "numberOfFields",
+     "accepted is the number of DataField elements"},
+    {KestrelException::kInconsistentDictionary, "two categories", "a flag lists two categories"},
+    {KestrelException::kInconsistentDictionary, "",
+     "correct the DataDictionary so that it does not contradict itself"},
+};
+
+}  // namespace
+
+const char* HintForFault(int code, const std::string& message) {
+  for (const Hint& hint : kHints) {
+    if (hint.code == code && message.find(hint.part) != std::string::npos) return hint.text;
+  }
+  return nullptr;
+}
+
+}  // namespace kestrel_program
