@@ -56,7 +56,7 @@ void CsvWriter::AddText(std::string_view text) {
 
 void CsvWriter::AddNumber(double number) {
   Separate();
-  AppendNumber(number, out_);
+  out_.append(numbers_.Get(number));
 }
 
 void CsvWriter::AddMissing() {

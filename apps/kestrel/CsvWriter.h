@@ -33,6 +33,7 @@ class CsvWriter : public TableWriter {
 
   std::vector<std::string> columns_;
   std::string& out_;
+  NumberTexts numbers_;
   bool at_start_ = true;
 };
 

@@ -43,7 +43,7 @@ void JsonLinesWriter::AddText(std::string_view text) {
 void JsonLinesWriter::AddNumber(double number) {
   if (!std::isfinite(number)) return AddMissing();
   out_.append(keys_[next_++]);
-  AppendNumber(number, out_);
+  out_.append(numbers_.Get(number));
 }
 
 void JsonLinesWriter::AddMissing() {

@@ -29,6 +29,7 @@ class JsonLinesWriter : public TableWriter {
   std::vector<std::string> keys_;  ///< with all that stands before the cell's value
   std::size_t next_ = 0;
   std::string& out_;
+  NumberTexts numbers_;
 };
 
 }  // namespace kestrel_program

@@ -1,6 +1,7 @@
 #include "apps/kestrel/TableWriter.h"
 
 #include <charconv>
+#include <cstring>
 
 #include "apps/kestrel/CsvWriter.h"
 #include "apps/kestrel/JsonLinesWriter.h"
@@ -15,11 +16,32 @@ std::unique_ptr<TableWriter> TableWriter::Make(Format format, const std::vector<
   return std::make_unique<CsvWriter>(columns, out);
 }
 
+namespace {
+
+/// The longest is "-1.2345678901234567e-308".
+using NumberText = char[32];
+
+std::size_t WriteNumber(double number, NumberText& text) {
+  return static_cast<std::size_t>(std::to_chars(text, text + sizeof text, number).ptr - text);
+}
+
+}  // namespace
+
 void AppendNumber(double number, std::string& out) {
-  // The longest is "-1.2345678901234567e-308".
-  char text[32];
-  const std::to_chars_result end = std::to_chars(text, text + sizeof text, number);
-  out.append(text, static_cast<std::size_t>(end.ptr - text));
+  NumberText text;
+  out.append(text, WriteNumber(number, text));
+}
+
+std::string_view NumberTexts::Get(double number) {
+  std::uint64_t bits = 0;
+  std::memcpy(&bits, &number, sizeof bits);
+  // A multiplication by an odd number without pattern carries every bit into the upper ones.
+  Entry& entry = entries_[(bits * 0x9E3779B97F4A7C15u) >> (64 - kIndexBits)];
+  if (entry.bits != bits || entry.length == 0) {
+    entry.bits = bits;
+    entry.length = WriteNumber(number, entry.text);
+  }
+  return std::string_view(entry.text, entry.length);
 }
 
 }  // namespace kestrel_program

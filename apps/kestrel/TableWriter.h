@@ -3,6 +3,8 @@
 #ifndef KESTREL_APPS_KESTREL_TABLEWRITER_H
 #define KESTREL_APPS_KESTREL_TABLEWRITER_H
 
+#include <array>
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -32,6 +34,24 @@ class TableWriter {
 
 /// Appends the shortest text that reads back to the same number.
 void AppendNumber(double number, std::string& out);
+
+/// The same texts, the latest of them remembered: a probability is that of a category as well, and where all
+/// inputs are categories the answers are few. Finding digits costs ten times as much as finding them here.
+class NumberTexts {
+ public:
+  /// Valid until the next call.
+  std::string_view Get(double number);
+
+ private:
+  struct Entry {
+    std::uint64_t bits = 0;
+    std::size_t length = 0;  ///< 0: nothing is remembered here
+    char text[32];
+  };
+  static constexpr unsigned kIndexBits = 7;
+
+  std::array<Entry, std::size_t{1} << kIndexBits> entries_{};
+};
 
 }  // namespace kestrel_program
 

@@ -117,6 +117,19 @@ TEST(TableWriter, KeepsAMissingCellOfOneColumnFromBeingABlankLine) {
   EXPECT_EQ(out, "a\n\"\"\n\"\"\n");
 }
 
+TEST(NumberTexts, AreThoseOfAppendNumberHoweverOftenAsked) {
+  kestrel_program::NumberTexts texts;
+  for (int round = 0; round < 2; ++round) {
+    for (int i = 0; i < 5000; ++i) {
+      const double number = i == 0 ? -0.0 : (i - 1) / 7.0;
+      std::string want;
+      AppendNumber(number, want);
+      EXPECT_EQ(texts.Get(number), want);
+      EXPECT_EQ(texts.Get(number), want);
+    }
+  }
+}
+
 TEST(AppendNumber, AppendsBehindWhatIsThere) {
   std::string text = "x=";
   AppendNumber(2.5, text);
