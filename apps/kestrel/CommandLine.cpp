@@ -12,6 +12,7 @@
 #include "apps/kestrel/OutputFile.h"
 #include "apps/kestrel/ProgramError.h"
 #include "apps/kestrel/ScoreCommand.h"
+#include "apps/kestrel/ShownText.h"
 
 namespace kestrel_program {
 namespace {
@@ -155,6 +156,30 @@ void AddCopy(CLI::App& program, Values& values) {
   AddTable(command, values);
 }
 
+bool HasCommand(const CLI::App& program, const std::string& name) {
+  for (const CLI::App* command : program.get_subcommands([](const CLI::App*) { return true; })) {
+    if (command->get_name() == name) return true;
+  }
+  return false;
+}
+
+/// What is wrong with the command line and what would be right.
+std::string ExplainUsage(const CLI::App& program, const std::vector<std::string>& arguments,
+                         const CLI::ParseError& fault) {
+  if (arguments.empty() || !HasCommand(program, arguments[0])) {
+    return (arguments.empty() ? std::string("a command is missing")
+                              : "\"" + ShownText(arguments[0]) + "\" is no command") +
+           "; accepted is score, describe, check or copy-table\n  hint: kestrel --help tells what they do";
+  }
+  const auto keep = std::find(arguments.begin(), arguments.end(), "--keep");
+  if (dynamic_cast<const CLI::ExtrasError*>(&fault) != nullptr && arguments.end() - keep > 1 &&
+      keep[1][0] != '-') {
+    return std::string(fault.what()) +
+           "\n  hint: the names of columns stand behind an equals sign: --keep=" + ShownText(keep[1]);
+  }
+  return std::string(fault.what()) + "\n  hint: kestrel " + arguments[0] + " --help lists what is accepted";
+}
+
 ExitCode RunScore(const Values& values) {
   ScoreOptions options;
   options.model = values.model;
@@ -213,9 +238,7 @@ ExitCode RunCommandLine(const std::vector<std::string>& arguments) {
     output.Finish();
     return kDone;
   } catch (const CLI::ParseError& fault) {
-    throw ProgramError(kUsage,
-                       std::string(fault.what()) +
-                           "\n  hint: kestrel --help lists the commands, kestrel COMMAND --help its options");
+    throw ProgramError(kUsage, ExplainUsage(program, arguments, fault));
   }
   return Run(program, values);
 }
