@@ -44,6 +44,27 @@ std::string ListNames(const std::vector<std::string>& names) {
   return list;
 }
 
+std::string InLowerCase(std::string text) {
+  for (char& c : text) {
+    if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
+  }
+  return text;
+}
+
+/// What may be the matter when inputs have no column.
+std::string HintForAbsent(const std::vector<std::string>& absent, const std::vector<std::string>& header) {
+  std::unordered_map<std::string, const std::string*> columns;
+  for (const std::string& name : header)
+    columns.emplace(InLowerCase(name), &name);
+  for (const std::string& name : absent) {
+    const auto found = columns.find(InLowerCase(name));
+    if (found == columns.end()) continue;
+    return "\n  hint: upper and lower case count; the table has " + ShownText(*found->second) +
+           " where the model reads " + ShownText(name);
+  }
+  return header.size() == 1 ? "\n  hint: --delimiter tells what separates the cells" : "";
+}
+
 }  // namespace
 
 CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*>& inputs,
@@ -68,10 +89,9 @@ CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*
     AddSlot(inputs_.back());
   }
   if (absent.empty()) return;
-  std::string text = table.DescribePlace(table.GetHeaderLine()) + "the model reads " + ListNames(absent) +
-                     ", for which there is no column; the columns are " + ListNames(table.GetHeader());
-  if (table.GetHeader().size() == 1) text += "\n  hint: --delimiter tells what separates the cells";
-  throw ProgramError(kData, text);
+  throw ProgramError(kData, table.DescribePlace(table.GetHeaderLine()) + "the model reads " +
+                                ListNames(absent) + ", for which there is no column; the columns are " +
+                                ListNames(table.GetHeader()) + HintForAbsent(absent, table.GetHeader()));
 }
 
 CaseReader::~CaseReader() = default;

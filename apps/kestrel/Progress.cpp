@@ -48,8 +48,8 @@ void Progress::Clear() {
 
 std::string Progress::Summarize() const {
   const double seconds = GetSeconds();
-  return std::to_string(cases_) + " cases, " + std::to_string(failures_) + " failed, " +
-         Thousandths(seconds) + " s, " + Rate(cases_, seconds) + " cases a second";
+  return std::to_string(cases_) + (cases_ == 1 ? " case, " : " cases, ") + std::to_string(failures_) +
+         " failed, " + Thousandths(seconds) + " s, " + Rate(cases_, seconds) + " cases a second";
 }
 
 }  // namespace kestrel_program

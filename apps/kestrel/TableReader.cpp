@@ -188,6 +188,11 @@ void TableReader::TakeHeader() {
   header_line_ = row_.line_;
   std::unordered_set<std::string_view> seen;
   for (std::size_t column = 0; column < header_.size(); ++column) {
+    if (header_[column].find('\0') != std::string::npos) {
+      throw ProgramError(kData, DescribePlace(header_line_) +
+                                    "this is no text table: there are zero bytes in its first line; is the "
+                                    "file compressed, a spreadsheet, or written in UTF-16?");
+    }
     if (!header_[column].empty() && !seen.insert(header_[column]).second) {
       throw ProgramError(kData, DescribePlace(header_line_) + "column " + ShownText(header_[column]) +
                                     " is there twice; every column needs a name of its own");

@@ -262,10 +262,25 @@ TEST(KestrelScore, RefusesTablesThatDoNotFitTheModel) {
   CheckRows({
       {"a column is absent",
        {"D/line.xml"},
+       "a,y\n1,2\n",
+       4,
+       "",
+       "kestrel: standard input:1: the model reads x, for which there is no column; the columns are a, y\n"},
+      {"its name is written otherwise",
+       {"D/line.xml"},
        "X,y\n1,2\n",
        4,
        "",
-       "kestrel: standard input:1: the model reads x, for which there is no column; the columns are X, y\n"},
+       "kestrel: standard input:1: the model reads x, for which there is no column; the columns are X, y\n"
+       "  hint: upper and lower case count; the table has X where the model reads x\n"},
+      {"a file that is no text",
+       {"D/line.xml"},
+       std::string("PK\3\4\0\0,x\n1,2\n", 14),
+       4,
+       "",
+       "kestrel: standard input:1: this is no text table: there are zero bytes in its first line; is the "
+       "file "
+       "compressed, a spreadsheet, or written in UTF-16?\n"},
       {"several are, further down",
        {"D/inputs.xml"},
        "\nx,hour\n",
@@ -383,6 +398,12 @@ TEST(KestrelScore, TellsHowFastItWent) {
   EXPECT_EQ(outcome.exit_code, 1);
   EXPECT_NE(outcome.errors.find("kestrel: 3 cases, 1 failed, "), std::string::npos) << outcome.errors;
   EXPECT_NE(outcome.errors.find(" cases a second\n"), std::string::npos) << outcome.errors;
+}
+
+TEST(KestrelScore, CountsASingleCase) {
+  EXPECT_EQ(
+      RunKestrel({"score", "D/line.xml", "--stats"}, "x\n1\n").errors.find("kestrel: 1 case, 0 failed, "),
+      0u);
 }
 
 TEST(KestrelScore, WritesFilesWholeOrNotAtAll) {
