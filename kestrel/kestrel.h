@@ -7,6 +7,7 @@
 #include "kestrel/dictionary/BaseDictionary.h"
 #include "kestrel/dictionary/CaseRecord.h"
 #include "kestrel/dictionary/DictVar.h"
+#include "kestrel/dictionary/FiledValue.h"
 #include "kestrel/dictionary/IndexedElements.h"
 #include "kestrel/dictionary/MissingValueSet.h"
 #include "kestrel/dictionary/ScoreBinningEncoder.h"
