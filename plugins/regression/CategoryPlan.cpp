@@ -18,10 +18,8 @@ namespace {
   Fail(KestrelException::kStructure, "\"" + category.GetString() + "\"" + text);
 }
 
-[[noreturn]] void FailOnMethod(Normalization method, const std::string& text) {
-  Fail(KestrelException::kUnsupported,
-       std::string(NormalizationText(method)) + " normalization: Not supported for " + text);
-}
+// How far a probability may lie outside [0, 1] and count as rounded: what the link functions promise.
+constexpr double kRounding = 1e-12;
 
 }  // namespace
 
@@ -69,7 +67,6 @@ void CategoryPlan::ListCategories(const std::vector<RegressionTable>& tables, co
 }
 
 void CategoryPlan::ChooseRule(const std::vector<RegressionTable>& tables, bool is_ordinal) {
-  if (method_ == Normalization::kExp) FailOnMethod(method_, "classification!");
   if (categories_.size() < 2) {
     Fail(KestrelException::kStructure, "Classification needs at least two categories!");
   }
@@ -78,17 +75,17 @@ void CategoryPlan::ChooseRule(const std::vector<RegressionTable>& tables, bool i
   } else if (categories_.size() == 2) {
     PlanTwoWay(tables);
   } else if (is_ordinal) {
-    PlanAllButLast(Rule::kCumulative);
+    PlanAllBut(categories_.size() - 1, Rule::kCumulative);
   } else if (method_ == Normalization::kNone) {
-    PlanAllButLast(Rule::kRemainder);
+    PlanAllBut(categories_.size() - 1, Rule::kRemainder);
   } else {
-    FailOnMethod(method_, "more than two categories without order!");
+    PlanOneAgainstRest(tables);
   }
 }
 
 void CategoryPlan::PlanShares() {
-  rule_ = method_ == Normalization::kSoftmax ? Rule::kSoftmax : Rule::kSimplemax;
-  const bool may_be_constant = rule_ == Rule::kSoftmax && categories_.size() == 2;
+  rule_ = method_ == Normalization::kSoftmax ? Rule::kShares : Rule::kSimplemax;
+  const bool may_be_constant = rule_ == Rule::kShares && categories_.size() == 2;
   for (std::size_t j = 0; j < categories_.size(); ++j) {
     if (tables_of_categories_[j] == kConstantZero && !may_be_constant) {
       FailOnCategory(*categories_[j], ": RegressionTable is required for each category!");
@@ -105,9 +102,27 @@ void CategoryPlan::PlanTwoWay(const std::vector<RegressionTable>& tables) {
   first_category_ = tables_of_categories_[0] == table ? 0 : 1;
 }
 
-void CategoryPlan::PlanAllButLast(Rule rule) {
+void CategoryPlan::PlanOneAgainstRest(const std::vector<RegressionTable>& tables) {
+  const std::size_t last = categories_.size() - 1;
+  // Categories without table stand last; PlanAllBut refuses more than one.
+  if (tables_of_categories_[last] == kConstantZero) return PlanAllBut(last, Rule::kRemainder);
+  std::size_t reference = 0;
+  int references = 0;
+  for (std::size_t j = 0; j <= last; ++j) {
+    if (!tables[tables_of_categories_[j]].IsReference()) continue;
+    reference = j;
+    ++references;
+  }
+  if (references == 1) return PlanAllBut(reference, Rule::kRemainder);
+  rule_ = Rule::kShares;
+  equations_ = tables_of_categories_;
+}
+
+void CategoryPlan::PlanAllBut(std::size_t category, Rule rule) {
   rule_ = rule;
-  for (std::size_t j = 0; j + 1 < categories_.size(); ++j) {
+  rest_category_ = category;
+  for (std::size_t j = 0; j < categories_.size(); ++j) {
+    if (j == category) continue;
     if (tables_of_categories_[j] == kConstantZero) {
       FailOnCategory(*categories_[j], ": RegressionTable is required for each category!");
     }
@@ -117,36 +132,37 @@ void CategoryPlan::PlanAllButLast(Rule rule) {
 
 bool CategoryPlan::ComputeProbabilities(const double* values, double* probabilities) const {
   switch (rule_) {
-    case Rule::kSoftmax:
-      Softmax(values, probabilities);
+    case Rule::kShares:
+      LinkShares(method_ == Normalization::kSoftmax ? Normalization::kExp : method_, values,
+                 categories_.size(), probabilities);
       return true;
     case Rule::kSimplemax:
-      return Simplemax(values, probabilities);
+      if (!Simplemax(values, probabilities)) return false;
+      break;
     case Rule::kTwoWay:
       probabilities[first_category_] = LinkBelow(method_, values[0]);
       probabilities[1 - first_category_] = LinkAbove(method_, values[0]);
-      return true;
+      break;
     case Rule::kRemainder:
       Remainder(values, probabilities);
-      return true;
+      break;
     case Rule::kCumulative:
       Cumulate(values, probabilities);
-      return true;
+      break;
   }
-  return false;
+  return Settle(probabilities);
 }
 
-// The largest value is taken off all of them, so that no exponential overflows and the sum is at least 1.
-void CategoryPlan::Softmax(const double* values, double* probabilities) const {
-  const std::size_t count = categories_.size();
-  const double largest = *std::max_element(values, values + count);
-  double sum = 0.0;
-  for (std::size_t j = 0; j < count; ++j) {
-    probabilities[j] = std::exp(values[j] - largest);
-    sum += probabilities[j];
+// False for what cannot be probabilities, and what rounding put outside [0, 1] is cut off.
+bool CategoryPlan::Settle(double* probabilities) const {
+  for (std::size_t j = 0; j < categories_.size(); ++j) {
+    double& p = probabilities[j];
+    if (!std::isfinite(p)) return false;
+    if (method_ == Normalization::kNone || method_ == Normalization::kSimplemax) continue;
+    if (p < -kRounding || p > 1.0 + kRounding) return false;
+    p = std::clamp(p, 0.0, 1.0);
   }
-  for (std::size_t j = 0; j < count; ++j)
-    probabilities[j] /= sum;
+  return true;
 }
 
 bool CategoryPlan::Simplemax(const double* values, double* probabilities) const {
@@ -160,14 +176,17 @@ bool CategoryPlan::Simplemax(const double* values, double* probabilities) const 
   return true;
 }
 
+// The largest F is not taken off 1 but asked for its own complement, which keeps the digits of small rests.
 void CategoryPlan::Remainder(const double* values, double* probabilities) const {
-  const std::size_t last = categories_.size() - 1;
-  double sum = 0.0;
-  for (std::size_t j = 0; j < last; ++j) {
-    probabilities[j] = values[j];
-    sum += values[j];
+  const double* const largest = std::max_element(values, values + equations_.size());
+  double rest = LinkAbove(method_, *largest);
+  double* out = probabilities;
+  for (const double* y = values; y != values + equations_.size(); ++y, ++out) {
+    if (out == probabilities + rest_category_) ++out;
+    *out = LinkBelow(method_, *y);
+    if (y != largest) rest -= *out;
   }
-  probabilities[last] = 1.0 - sum;
+  probabilities[rest_category_] = rest;
 }
 
 void CategoryPlan::Cumulate(const double* values, double* probabilities) const {

@@ -1,5 +1,6 @@
 #include "plugins/regression/LinkFunctions.h"
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 
@@ -74,6 +75,12 @@ double CloglogBetween(double low, double high) {
   return std::exp(-base) * -std::expm1(-step);
 }
 
+// The larger of the two carries the size, so that nothing overflows but a difference that is too large
+// itself.
+double ExpBetween(double low, double high) {
+  return low == high ? 0.0 : std::exp(high) * -std::expm1(low - high);
+}
+
 double CauchitBetween(double low, double high) {
   const double product = low * high;
   if (product <= -1.0) return (std::atan(high) - std::atan(low)) / kPi;
@@ -95,8 +102,36 @@ double BetweenOrdered(Normalization method, double low, double high) {
       return CloglogBetween(-high, -low);
     case Normalization::kCauchit:
       return CauchitBetween(low, high);
+    case Normalization::kExp:
+      return ExpBetween(low, high);
     default:
       return std::numeric_limits<double>::quiet_NaN();
+  }
+}
+
+// Below this value of F what is left of its digits might not do for a ratio, and the tail's shape is simple.
+constexpr double kTail = 1e-200;
+
+// Phi(y) * |y| / density(y), which tends to 1; for y < -30, as it is in the tail.
+double MillsFactor(double y) {
+  const double u = 1.0 / y / y;
+  return 1.0 - u * (1.0 - 3.0 * u * (1.0 - 5.0 * u * (1.0 - 7.0 * u * (1.0 - 9.0 * u * (1.0 - 11.0 * u)))));
+}
+
+// F(y) / F(largest) for y <= largest, both in the tail; of "exp", whose shape is the same everywhere, for any
+// two. Logarithms are subtracted before they get large.
+double TailRatio(Normalization method, double y, double largest) {
+  if (y == largest) return 1.0;
+  switch (method) {
+    case Normalization::kProbit:
+      return std::exp((largest - y) * (0.5 * largest + 0.5 * y)) * (largest / y) *
+             (MillsFactor(y) / MillsFactor(largest));
+    case Normalization::kLoglog:
+      return std::exp(-std::exp(-largest) * std::expm1(largest - y));
+    case Normalization::kCauchit:
+      return largest / y;
+    default:
+      return std::exp(y - largest);
   }
 }
 
@@ -116,6 +151,8 @@ double LinkBelow(Normalization method, double y) {
       return CloglogAbove(-y);
     case Normalization::kCauchit:
       return CauchitBelow(y);
+    case Normalization::kExp:
+      return std::exp(y);
     default:
       return std::numeric_limits<double>::quiet_NaN();
   }
@@ -129,6 +166,8 @@ double LinkAbove(Normalization method, double y) {
       return CloglogAbove(y);
     case Normalization::kLoglog:
       return CloglogBelow(-y);
+    case Normalization::kExp:
+      return -std::expm1(y);
     default:
       // The other distributions are symmetric about zero.
       return LinkBelow(method, -y);
@@ -137,6 +176,18 @@ double LinkAbove(Normalization method, double y) {
 
 double LinkBetween(Normalization method, double low, double high) {
   return low <= high ? BetweenOrdered(method, low, high) : -BetweenOrdered(method, high, low);
+}
+
+void LinkShares(Normalization method, const double* values, std::size_t count, double* shares) {
+  const double largest = *std::max_element(values, values + count);
+  const bool by_ratio = method == Normalization::kExp || LinkBelow(method, largest) < kTail;
+  double sum = 0.0;
+  for (std::size_t j = 0; j < count; ++j) {
+    shares[j] = by_ratio ? TailRatio(method, values[j], largest) : LinkBelow(method, values[j]);
+    sum += shares[j];
+  }
+  for (std::size_t j = 0; j < count; ++j)
+    shares[j] /= sum;
 }
 
 }  // namespace MCKestrel_800

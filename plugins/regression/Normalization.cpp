@@ -11,7 +11,7 @@ struct NormalizationRow {
 // In the order of the enumeration.
 constexpr NormalizationRow kRows[] = {
     {"none", true},    {"simplemax", false}, {"softmax", false}, {"logit", true},   {"probit", true},
-    {"cloglog", true}, {"exp", false},       {"loglog", true},   {"cauchit", true},
+    {"cloglog", true}, {"exp", true},        {"loglog", true},   {"cauchit", true},
 };
 
 }  // namespace

@@ -17,8 +17,8 @@ bool FindNormalization(std::string_view text, Normalization& method);
 /// The name that documents use.
 const char* NormalizationText(Normalization method);
 
-/// Whether the method maps each equation by a distribution function of its own (the links, and "none" as the
-/// identity), so that cumulative probabilities can be made of it.
+/// Whether the method maps each equation by a function of its own (the links, "exp", and "none" as the
+/// identity; see LinkFunctions.h), so that cumulative probabilities can be made of it.
 bool IsCumulative(Normalization method);
 
 }  // namespace MCKestrel_800

@@ -80,15 +80,9 @@ bool RegressionModel::Evaluate() {
 }
 
 double RegressionModel::Normalize(double y) const {
-  switch (definition_.normalization) {
-    case Normalization::kExp:
-      return std::exp(y);
-    case Normalization::kSoftmax:
-      // With one equation, softmax is the logistic function.
-      return LinkBelow(Normalization::kLogit, y);
-    default:
-      return LinkBelow(definition_.normalization, y);
-  }
+  // With one equation, softmax is the logistic function.
+  const bool is_softmax = definition_.normalization == Normalization::kSoftmax;
+  return LinkBelow(is_softmax ? Normalization::kLogit : definition_.normalization, y);
 }
 
 bool RegressionModel::Predict(ScoreResult& result) {

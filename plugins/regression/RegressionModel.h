@@ -23,7 +23,8 @@ namespace MCKestrel_800 {
 ///
 /// A case whose numbers are not all there has a missing result, which the missing-value policy settles: no
 /// prediction and the error status 90027, or the target's default. The same goes for an equation or a
-/// prediction that is not a finite number. A missing category is no failure: it adds nothing. A value that
+/// prediction that is not a finite number, and for equations that make no probabilities (see CategoryPlan). A
+/// missing category is no failure: it adds nothing. A value that
 /// the mining schema refuses gives the error status of ScoringStatus.h and no prediction.
 class RegressionModel : public BaseModel {
  public:

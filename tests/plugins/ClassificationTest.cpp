@@ -12,6 +12,8 @@
 #include "kestrel/dictionary/ValueProbabilitySet.h"
 #include "kestrel/model/Results.h"
 #include "tests/plugins/ModelText.h"
+#include "tests/support/FileText.h"
+#include "tests/support/PlainTable.h"
 
 namespace {
 
@@ -253,6 +255,151 @@ const SharesRow kSharesRows[] = {
      Table("low", "0.25") + Table("mid", "0.75"),
      {{"low", 0.25}, {"mid", 0.5}, {"high", 0.25}},
      "mid"},
+    {"exp of two",
+     "exp",
+     "k",
+     Table("yes", "-1.25"),
+     {{"yes", 0.2865047968601901}, {"no", 0.7134952031398099}},
+     "no"},
+    {"exp, a reference before it",
+     "exp",
+     "k",
+     Reference("yes") + Table("no", "-1.25"),
+     {{"yes", 0.7134952031398099}, {"no", 0.2865047968601901}},
+     "yes"},
+    {"exp keeps small probabilities",
+     "exp",
+     "k",
+     Table("no", "-40"),
+     {{"no", 4.248354255291589e-18}, {"yes", 1.0}},
+     "yes"},
+    {"and small rests of exp",
+     "exp",
+     "k",
+     Table("no", "-9.313225746154785e-10"),
+     {{"no", 0.9999999990686774}, {"yes", 9.313225741817976e-10}},
+     "no"},
+    {"exp of certainty", "exp", "k", Table("no", "0"), {{"no", 1.0}, {"yes", 0.0}}, "no"},
+    {"exp of certainty, but for rounding",
+     "exp",
+     "k",
+     Table("no", "4.440892098500626e-16"),
+     {{"no", 1.0}, {"yes", 0.0}},
+     "no"},
+    {"ordinal exp",
+     "exp",
+     "o",
+     Table("low", "-1.25") + Table("mid", "-0.5"),
+     {{"low", 0.2865047968601901}, {"mid", 0.32002586285244333}, {"high", 0.3934693402873666}},
+     "high"},
+    {"ordinal logit of one threshold twice",
+     "logit",
+     "o",
+     Table("low", "-0.5") + Table("mid", "-0.5"),
+     {{"low", 0.37754066879814546}, {"mid", 0.0}, {"high", 0.6224593312018546}},
+     "high"},
+    {"logit, one against the rest",
+     "logit",
+     "m",
+     Table("red", "0.5") + Table("green", "-2") + Table("blue", "1.25"),
+     {{"red", 0.4097925322174858}, {"green", 0.07847656033824675}, {"blue", 0.5117309074442674}},
+     "blue"},
+    {"probit, one against the rest",
+     "probit",
+     "m",
+     Table("red", "0.5") + Table("green", "-2") + Table("blue", "1.25"),
+     {{"red", 0.42986351099744896}, {"green", 0.014143141735967849}, {"blue", 0.5559933472665832}},
+     "blue"},
+    {"cloglog, one against the rest",
+     "cloglog",
+     "m",
+     Table("red", "0.5") + Table("green", "-2") + Table("blue", "1.25"),
+     {{"red", 0.4242610598190795}, {"green", 0.06648680798464038}, {"blue", 0.5092521321962801}},
+     "blue"},
+    {"loglog, one against the rest",
+     "loglog",
+     "m",
+     Table("red", "0.5") + Table("green", "-2") + Table("blue", "1.25"),
+     {{"red", 0.4204689692772638}, {"green", 0.0004765632827050424}, {"blue", 0.5790544674400312}},
+     "blue"},
+    {"cauchit, one against the rest",
+     "cauchit",
+     "m",
+     Table("red", "0.5") + Table("green", "-2") + Table("blue", "1.25"),
+     {{"red", 0.40976176983904977}, {"green", 0.0933842714970211}, {"blue", 0.4968539586639292}},
+     "blue"},
+    {"exp, one against the rest",
+     "exp",
+     "m",
+     Table("red", "0.5") + Table("green", "-2") + Table("blue", "1.25"),
+     {{"red", 0.31258937953733923}, {"green", 0.02565889878916787}, {"blue", 0.6617517216734928}},
+     "blue"},
+    {"logit, one against the rest, a table less",
+     "logit",
+     "m",
+     Table("red", "-0.5") + Table("green", "-2"),
+     {{"red", 0.37754066879814546}, {"green", 0.11920292202211756}, {"blue", 0.503256409179737}},
+     "blue"},
+    {"logit with a reference category",
+     "logit",
+     "m",
+     Reference("blue") + Table("red", "-0.5") + Table("green", "-2"),
+     {{"blue", 0.503256409179737}, {"red", 0.37754066879814546}, {"green", 0.11920292202211756}},
+     "blue"},
+    {"probit with a reference category",
+     "probit",
+     "m",
+     Table("red", "-0.5") + Reference("blue") + Table("green", "-2"),
+     {{"red", 0.3085375387259869}, {"blue", 0.6687123293258339}, {"green", 0.02275013194817921}},
+     "blue"},
+    {"cloglog with a reference category",
+     "cloglog",
+     "m",
+     Table("red", "-0.5") + Table("green", "-2") + Reference("blue"),
+     {{"red", 0.45476078810739495}, {"green", 0.12657698150688335}, {"blue", 0.4186622303857217}},
+     "red"},
+    {"loglog with a reference category",
+     "loglog",
+     "m",
+     Reference("blue") + Table("red", "-0.5") + Table("green", "-2"),
+     {{"blue", 0.807086375462704}, {"red", 0.19229564554796494}, {"green", 0.0006179789893310935}},
+     "blue"},
+    {"cauchit with a reference category",
+     "cauchit",
+     "m",
+     Table("red", "-0.5") + Reference("blue") + Table("green", "-2"),
+     {{"red", 0.35241638234956674}, {"blue", 0.5}, {"green", 0.14758361765043326}},
+     "blue"},
+    {"exp, one against the rest, a table less",
+     "exp",
+     "m",
+     Table("red", "-1.25") + Table("green", "-2"),
+     {{"red", 0.2865047968601901}, {"green", 0.1353352832366127}, {"blue", 0.5781599199031973}},
+     "blue"},
+    {"one against the rest with two constants",
+     "logit",
+     "m",
+     Reference("red") + Table("green", "-1.25") + Reference("blue"),
+     {{"red", 0.4089310077942476}, {"green", 0.1821379844115048}, {"blue", 0.4089310077942476}},
+     "red"},
+    {"one against the rest keeps small rests",
+     "logit",
+     "m",
+     Reference("blue") + Table("red", "30") + Table("green", "-32"),
+     {{"blue", 8.091206413929898e-14}, {"red", 0.9999999999999064}, {"green", 1.2664165549094015e-14}},
+     "red"},
+    {"one against the rest, all far off",
+     "cloglog",
+     "m",
+     Table("red", "-800") + Table("green", "-801") + Table("blue", "-900"),
+     {{"red", 0.7310585786300049}, {"green", 0.2689414213699951}, {"blue", 2.7195934554254203e-44}},
+     "red"},
+    {"one against the rest without target",
+     "logit",
+     "",
+     Table("p", "0.5") + Table("q", "-2") + Table("r", "1.25"),
+     {{"p", 0.4097925322174858}, {"q", 0.07847656033824675}, {"r", 0.5117309074442674}},
+     "r"},
     {"the first of equal ones",
      "simplemax",
      "m",
@@ -288,6 +435,73 @@ TEST(Classification, ProbabilitiesOfTheCategories) {
     }
     const auto model = BuildModel(document);
     ExpectShares(*model, row.shares, row.prediction);
+  }
+}
+
+TEST(Classification, EquationsThatMakeNoProbabilitiesGiveNoPrediction) {
+  const struct {
+    const char* why;
+    const char* method;
+    const char* target;
+    std::string tables;
+    bool has_prediction;
+  } kRows[] = {
+      {"exp above 1", "exp", "k", Table("yes", "0.25"), false},
+      {"exp above everything", "exp", "k", Table("yes", "1e300"), false},
+      {"exp just above 1", "exp", "k", Table("yes", "1e-11"), false},
+      {"exp of the rest above 1", "exp", "m", Table("red", "0.25") + Table("green", "-9"), false},
+      {"exp, sum above 1", "exp", "m", Table("red", "-0.5") + Table("green", "-0.5"), false},
+      {"logit, sum above 1", "logit", "m", Table("red", "1") + Reference("blue") + Table("green", "1"),
+       false},
+      {"logit, sum above 1 by rounding alone", "logit", "m", Table("red", "1.25") + Table("green", "-1.25"),
+       true},
+      {"crossing thresholds", "logit", "o", Table("low", "1") + Table("mid", "0.5"), false},
+      {"crossing by rounding alone", "logit", "o", Table("low", "0.5000000000000002") + Table("mid", "0.5"),
+       true},
+      {"crossing thresholds of probit", "probit", "o", Table("low", "1") + Table("mid", "0.5"), false},
+      {"crossing thresholds of exp", "exp", "o", Table("low", "-1") + Table("mid", "-2"), false},
+      {"ordinal exp above 1", "exp", "o", Table("low", "-1") + Table("mid", "0.5"), false},
+      {"ordinal exp above everything", "exp", "o", Table("low", "1e300") + Table("mid", "1e300"), false},
+      {"none is not bounded", "none", "k", Table("yes", "1.5"), true},
+      {"nor of three", "none", "m", Table("red", "0.75") + Table("green", "0.75"), true},
+      {"nor ordinal", "none", "o", Table("low", "0.75") + Table("mid", "0.5"), true},
+      {"nor are shares", "simplemax", "k", Table("yes", "3") + Table("no", "-1"), true},
+      {"a share that is no number", "simplemax", "m",
+       Table("red", "1e308") + Table("green", "-1e308") + Table("blue", "0.0001"), false},
+  };
+  for (const auto& row : kRows) {
+    SCOPED_TRACE(row.why);
+    const auto model = Classification(row.method, row.target, row.tables);
+    const CaseRecord record = RecordOf({{"x", 1.0}});
+    ClsResult result;
+    const MCScore::MCStatus status = model->Score(&record, &result);
+    EXPECT_EQ(status.GetErrorCode(), row.has_prediction ? 0 : 90027);
+    EXPECT_EQ(result.GetPrediction() != nullptr, row.has_prediction);
+    EXPECT_EQ(result.GetCategoryCount() != 0, row.has_prediction);
+  }
+}
+
+// Document and table were made by make_one_against_rest.py beside them.
+TEST(Classification, OneAgainstTheRestAgreesWithItsTrainingProgram) {
+  const std::string folder = KESTREL_SOURCE_DIR "/tests/data/regression/";
+  const auto model = BuildModel(kestrel_tests::FileText(folder + "one_against_rest.xml"));
+  const kestrel_tests::PlainTable flowers = kestrel_tests::ReadPlainTable(folder + "one_against_rest.csv");
+  ASSERT_GT(flowers.rows.size(), 20u);
+  const size_t inputs = flowers.header.size() - 3;
+  CaseRecord record;
+  for (size_t i = 0; i < inputs; ++i)
+    record.Add(flowers.header[i], new NumericValue(0.0));
+  ClsResult result;
+  for (const std::vector<std::string>& flower : flowers.rows) {
+    for (size_t i = 0; i < inputs; ++i)
+      record.SetValue(flowers.header[i], std::stod(flower[i]));
+    ASSERT_TRUE(model->Score(&record, &result).IsOK());
+    ASSERT_EQ(result.GetCategoryCount(), 3u);
+    for (size_t j = 0; j < 3; ++j) {
+      const double expected = std::stod(flower[inputs + j]);
+      EXPECT_EQ(result.GetCategory(j)->GetString(), flowers.header[inputs + j]);
+      EXPECT_NEAR(result.GetProbability(j), expected, 1e-12 * expected);
+    }
   }
 }
 

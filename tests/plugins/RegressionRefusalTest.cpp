@@ -150,12 +150,14 @@ const ModelRow kModelRows[] = {
      "\"red\": RegressionTable is required for each category!"},
     {"ordinal without an inner table", ModelOf(Classification("logit"), "o", Tables("low high")), 1,
      "\"mid\": RegressionTable is required for each category!"},
-    {"exp", ModelOf(Classification("exp"), "k", Tables("yes no")), 5,
-     "exp normalization: Not supported for classification!"},
-    {"a link without order", ModelOf(Classification("logit"), "m", Tables("red green blue")), 5,
-     "logit normalization: Not supported for more than two categories without order!"},
-    {"cauchit without order", ModelOf(Classification("cauchit"), "m", Tables("red green blue")), 5,
-     "cauchit normalization: Not supported for more than two categories without order!"},
+    {"one against the rest without two tables", ModelOf(Classification("logit"), "m", Tables("red")), 1,
+     "\"green\": RegressionTable is required for each category!"},
+    {"exp without two tables", ModelOf(Classification("exp"), "m", Tables("blue")), 1,
+     "\"red\": RegressionTable is required for each category!"},
+    {"ordinal exp without an inner table", ModelOf(Classification("exp"), "o", Tables("low high")), 1,
+     "\"mid\": RegressionTable is required for each category!"},
+    {"exp of one category", ModelOf(Classification("exp"), "", Tables("p")), 1,
+     "Classification needs at least two categories!"},
     {"a fault of the schema",
      "<RegressionModel functionName='regression'><MiningSchema/>" + kTable + "</RegressionModel>", 1,
      "<MiningSchema> is EMPTY!!"},
@@ -194,7 +196,7 @@ TEST(RegressionRefusals, HaveAPlace) {
     EXPECT_EQ(fault.GetErrorMessage(), "?Invalid double string -- ");
   }
   try {
-    BuildModel(DocumentOf("\n" + ModelOf(Classification("exp"), "k", Tables("yes no"))));
+    BuildModel(DocumentOf("\n" + ModelOf(Classification("exp"), "m", Tables("red"))));
     ADD_FAILURE();
   } catch (const KestrelException& fault) {
     EXPECT_EQ(fault.GetLine(), 2u);

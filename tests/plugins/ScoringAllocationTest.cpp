@@ -46,6 +46,10 @@ TEST(ScoringAllocation, NoneAfterTheFirstCase) {
                          table("red") + table("green") + table("blue"))),
       DocumentOf(ModelOf("functionName='classification' normalizationMethod='probit'", "o",
                          table("low") + table("mid"))),
+      DocumentOf(ModelOf("functionName='classification' normalizationMethod='cloglog'", "m",
+                         table("red") + table("green") + table("blue"))),
+      DocumentOf(ModelOf("functionName='classification' normalizationMethod='exp'", "m",
+                         table("red") + table("green") + table("blue"))),
   };
   const double missing = NumericValue::gSysmisValue;
   const std::string text = "a text that is too long to be kept in place";
