@@ -14,16 +14,25 @@
 namespace MCKestrel_800 {
 namespace {
 
-// The number that a value of the variable stands for: of a date/time the number in the variable's unit, of a
-// text the number that all of it reads as.
-double NumberOf(const ScoreValue& value, const ScoreDictVar& variable) {
-  if (value.GetType() == ScoreValue::kDateTime && variable.GetDateTimeType() != kNoDateTime) {
-    return static_cast<const DateTimeValue&>(value).GetDoubleValue(variable.GetDateTimeType());
-  }
-  if (value.GetType() != ScoreValue::kString) return value.GetDouble();
-  const std::string& text = static_cast<const StringValue&>(value).GetText();
+double NumberIn(const std::string& text) {
   double number;
   return ParseDouble(text.data(), text.data() + text.size(), number) ? number : NumericValue::gSysmisValue;
+}
+
+// The number that a value of the variable stands for: of a date/time the number in the variable's unit, of a
+// text the number that all of it reads as. Only the library's own text is read in place: hosts may have value
+// classes of their own.
+double NumberOf(const ScoreValue& value, const ScoreDictVar& variable) {
+  if (value.GetType() == ScoreValue::kDateTime && variable.GetDateTimeType() != kNoDateTime) {
+    return DateTimeValue(value.GetDouble(), kDateTimeVal).GetDoubleValue(variable.GetDateTimeType());
+  }
+  if (value.GetType() != ScoreValue::kString) return value.GetDouble();
+  if (typeid(value) != typeid(StringValue)) return NumberIn(value.GetString());
+  return NumberIn(static_cast<const StringValue&>(value).GetText());
+}
+
+bool IsEmptyText(const ScoreValue& value) {
+  return value.GetType() == ScoreValue::kString && value.GetString().empty();
 }
 
 std::uint64_t BitsOf(double number) {
@@ -202,7 +211,7 @@ unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {
   if (value == nullptr) return FillMissing(number);
   int code = ValueRules::kUnknown;
   ValueRules::Verdict verdict;
-  if (slot.is_text && value->GetType() == ScoreValue::kString) {
+  if (slot.is_text && typeid(*value) == typeid(StringValue)) {
     const std::string& text = static_cast<const StringValue*>(value)->GetText();
     verdict = slot.rules->JudgeText(text, code);
     if (verdict == ValueRules::kInvalid && text.empty()) verdict = ValueRules::kMissing;
@@ -211,6 +220,8 @@ unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {
     if (verdict == ValueRules::kValid && !slot.has_outliers) {
       if (!slot.is_category) return FillNumber(number, NumberOf(*value, *slot.field->variable));
       code = slot.rules->FindCode(*value);
+    } else if (verdict == ValueRules::kInvalid && slot.is_text && IsEmptyText(*value)) {
+      verdict = ValueRules::kMissing;
     }
   }
   if (verdict == ValueRules::kMissing) return FillMissing(number);

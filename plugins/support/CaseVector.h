@@ -34,7 +34,7 @@ class ScoreCaseRecord;
 ///
 /// Building: AddNumber and AddCategory for each input that the model reads, in any order, repeated as it
 /// likes; then Seal. Fields and their variables must outlive the vector. Afterwards Fill is called for each
-/// case; it allocates nothing for numbers and for texts and serves one case at a time.
+/// case; it allocates nothing for the library's own numbers and texts and serves one case at a time.
 class CaseVector {
  public:
   static constexpr double kMissingCategory = -2.0;

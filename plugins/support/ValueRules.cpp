@@ -1,6 +1,7 @@
 #include "plugins/support/ValueRules.h"
 
 #include <algorithm>
+#include <typeinfo>
 
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
@@ -15,6 +16,12 @@ bool IsNumber(const ScoreValue* value) {
 
 bool IsText(const ScoreValue* value) {
   return value != nullptr && value->GetType() == ScoreValue::kString;
+}
+
+// Whether it is the library's own text, whose characters can be read in place. Hosts may have classes of
+// their own, which call themselves texts and are asked for a copy.
+bool IsOwnText(const ScoreValue& value) {
+  return typeid(value) == typeid(StringValue);
 }
 
 bool IsDate(const ScoreValue* value) {
@@ -106,7 +113,7 @@ ValueRules::Verdict ValueRules::Judge(const ScoreValue* value) const {
   if (value == nullptr) return kMissing;
   if (compiled_) {
     if (type_ == ScoreDictVar::STRING_VAR) {
-      if (IsText(value)) return JudgeText(static_cast<const StringValue*>(value)->GetText());
+      if (IsOwnText(*value)) return JudgeText(static_cast<const StringValue*>(value)->GetText());
     } else if (IsNumber(value)) {
       return JudgeNumber(value->GetDouble());
     }
@@ -121,7 +128,7 @@ ValueRules::Verdict ValueRules::Ask(const ScoreValue& value) const {
 
 int ValueRules::FindCode(const ScoreValue& value) const {
   if (type_ != ScoreDictVar::STRING_VAR) return numbers_.Find(value.GetDouble());
-  if (IsText(&value)) return texts_.Find(static_cast<const StringValue&>(value).GetText());
+  if (IsOwnText(value)) return texts_.Find(static_cast<const StringValue&>(value).GetText());
   return texts_.Find(value.GetString());
 }
 

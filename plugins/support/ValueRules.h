@@ -19,9 +19,9 @@ namespace MCKestrel_800 {
 ///
 /// Codes of a categorical variable with labels are those of its encoder, or the labels' positions where it
 /// has none; other variables have the values that AddCategory was given. What the compiled form cannot hold
-/// (values of a kind other than the variable's, ranges of texts, dates with missing values) is asked of the
-/// variable itself, which may allocate. The variable must outlive the rules and not change. Built on one
-/// thread, then only read.
+/// (values of a kind other than the variable's, texts of a host's own class, ranges of texts, dates with
+/// missing values) is asked of the variable itself, which may allocate. The variable must outlive the rules
+/// and not change. Built on one thread, then only read.
 class ValueRules {
  public:
   enum Verdict { kValid, kMissing, kInvalid };
