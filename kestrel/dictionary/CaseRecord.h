@@ -16,7 +16,14 @@ class NumericValue;
 /// A case record whose slots are written in place: filling an occupied slot by position allocates nothing for
 /// numbers and dates, and for texts only when a text is longer than any before it in that slot.
 ///
-/// A record is filled once with `Add` and then reused for case after case. Copies are deep.
+/// A record is filled once with `Add` and then reused for case after case:
+///
+///   CaseRecord record;
+///   record.Add("age", new NumericValue);    // position 0
+///   record.Add("city", new StringValue);    // position 1
+///   for each case: record.SetValue(0, 42.0), record.SetValue(1, "Oslo"), or record.SetMissingValue(1)
+///
+/// Copies are deep; when one cannot be made, the record that it was for stays as it was.
 class KESTREL_API CaseRecord : public ScoreCaseRecord {
  public:
   /// Reserves room for `n` values; the record starts without slots. A number that is no sensible count is not

@@ -12,7 +12,16 @@ namespace MCKestrel_800 {
 class MissingValueSet;
 class ValueLabelSet;
 
-/// A variable held as plain fields and owned objects.
+/// A variable held as plain fields and owned objects. A text field with two categories, "n/a" missing:
+///
+///   auto var = std::make_unique<DictVar>("color", ScoreDictVar::STRING_VAR);
+///   var->SetMLevel(ScoreDictVar::kNominal);
+///   var->AddScoreValueLabel(new StringValue("r"), "red");
+///   var->AddScoreValueLabel(new StringValue("g"), "green");
+///   auto missing = std::make_unique<MissingValueSet>();
+///   missing->Add(new Range(new StringValue("n/a")));
+///   var->SetMissingValues(missing.release());
+///   dictionary.AddVar("color", var.release());
 ///
 /// Copies are deep. Assignment, unlike the setters, frees what the variable owned before.
 class KESTREL_API DictVar : public ScoreDictVar {

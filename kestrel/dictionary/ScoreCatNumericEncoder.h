@@ -11,7 +11,8 @@
 
 namespace MCKestrel_800 {
 
-/// Hands out codes 0, 1, 2, ... to numbers in the order of their first appearance.
+/// Hands out codes 0, 1, 2, ... to numbers in the order of their first appearance: `Encode` while a document
+/// is read, `EncodeConst` while cases are scored.
 ///
 /// Numbers are the same when they compare equal exactly; 0 and -0 are one. A number that is not a number
 /// (NaN) is no category: it gives -1 and is not registered. A text that does not read as a number stands for

@@ -13,7 +13,8 @@
 
 namespace MCKestrel_800 {
 
-/// Hands out codes 0, 1, 2, ... to texts in the order of their first appearance.
+/// Hands out codes 0, 1, 2, ... to texts in the order of their first appearance: `Encode` while a document is
+/// read, `EncodeConst` while cases are scored.
 ///
 /// Unless no-space-trim is set, the key of a text is the text without its trailing blanks; a text of nothing
 /// but blanks has the key " " when empty-string-OK is set and the empty key otherwise. A text whose key is

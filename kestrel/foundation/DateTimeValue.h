@@ -16,6 +16,10 @@ namespace MCKestrel_800 {
 
 /// Seconds since 1970-01-01 00:00:00, or since midnight for a time of day; the system-missing number when
 /// undefined. Texts that do not parse leave a value undefined.
+///
+///   DateTimeValue born("1970-01-02", DateTimeType::kDate);    // 86400 seconds
+///   DateTimeValue seen(20000.0, kDateDaysSince1970);          // 20,000 days
+///   seen.ComputeDurationYears(born)                           // 54.75...
 class KESTREL_API DateTimeValue : public ScoreValue {
  public:
   static constexpr int64_t fJan_1_1970_JulianDay = Calendar::kJan_1_1970_JulianDay;

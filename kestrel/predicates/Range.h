@@ -10,7 +10,11 @@
 
 namespace MCKestrel_800 {
 
-/// The interval between two values, or a single value.
+/// The interval between two values, or a single value:
+///
+///   Range(18.0, 65.0, true, false)    18 <= x < 65
+///   Range(nullptr, new NumericValue(0.0), false, true)    x <= 0
+///   Range(new StringValue("n/a"))    that text
 ///
 /// An end that is included holds whatever NumericValue::IsEqual calls equal to it; the inside is strict. A
 /// range whose ends are equal holds that value alone, whatever its flags, by the value's own equality; other
