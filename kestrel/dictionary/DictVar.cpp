@@ -111,7 +111,7 @@ bool DictVar::IsString() const {
 bool DictVar::IsInMissingRange(const ScoreValue* value) const {
   if (indexedMissingValues_ != nullptr) return indexedMissingValues_->HoldsValue(value);
   for (const ScoreValueRange* range : missingValues_->GetMissingValues()) {
-    if (range->IsInRange(value)) return true;
+    if (range != nullptr && range->IsInRange(value)) return true;
   }
   return false;
 }

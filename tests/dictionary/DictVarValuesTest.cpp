@@ -25,6 +25,7 @@ std::unique_ptr<DictVar> LabelledVar(V::VariableType type, Sets sets) {
   ScoreMissingValueSet* missing = nullptr;
   if (sets == kForeignSets) {
     missing = new ForeignMissingSet;
+    missing->Add(nullptr);
     auto* labels = new ForeignLabelSet;
     labels->Add(nullptr);
     labels->Add(new ForeignLabel(nullptr, "no value"));
