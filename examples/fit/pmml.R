@@ -1,6 +1,10 @@
-# Writes a PMML 4.4 RegressionModel and the tables that go with an example. Numbers carry 17 significant digits.
+# Writes a PMML 4.4 RegressionModel and the tables that go with an example.
 
-number <- function(x) sprintf("%.17g", x)
+# Reads back to the same double: 15 significant digits where they do, else 17.
+number <- function(x) {
+  short <- sprintf("%.15g", x)
+  ifelse(as.numeric(short) == x, short, sprintf("%.17g", x))
+}
 quoted <- function(text) {
   text <- gsub("&", "&amp;", text, fixed = TRUE)
   text <- gsub("<", "&lt;", text, fixed = TRUE)
@@ -24,8 +28,16 @@ table_lines <- function(intercept, terms, category = NULL) {
   c(sprintf("    <RegressionTable intercept=\"%s\"%s>", number(intercept), target), terms, "    </RegressionTable>")
 }
 
-# fields: lines of DataField elements; count: how many fields they are.
-write_model <- function(path, name, fields, count, inputs, target, normalization, tables, func) {
+# A field of the mining schema; what takes the place of a missing value is the mean of a number and the mode of a text.
+mining_field <- function(name, replacement = NULL) {
+  if (is.null(replacement)) return(sprintf("      <MiningField name=%s/>", quoted(name)))
+  is_number <- is.numeric(replacement)
+  sprintf("      <MiningField name=%s missingValueReplacement=%s missingValueTreatment=\"%s\"/>", quoted(name),
+    quoted(if (is_number) number(replacement) else replacement), if (is_number) "asMean" else "asMode")
+}
+
+# fields: lines of DataField elements; count: how many fields they are; replacements: by the inputs' names.
+write_model <- function(path, name, fields, count, inputs, target, normalization, tables, func, replacements = list()) {
   writeLines(c(
     "<?xml version=\"1.0\" encoding=\"UTF-8\"?>",
     "<PMML xmlns=\"http://www.dmg.org/PMML-4_4\" version=\"4.4\">",
@@ -33,13 +45,19 @@ write_model <- function(path, name, fields, count, inputs, target, normalization
     sprintf("  <DataDictionary numberOfFields=\"%d\">", count), fields, "  </DataDictionary>",
     sprintf("  <RegressionModel modelName=%s functionName=\"%s\" normalizationMethod=\"%s\">", quoted(name), func, normalization),
     "    <MiningSchema>",
-    sprintf("      <MiningField name=%s/>", vapply(inputs, quoted, "")),
+    vapply(inputs, function(input) mining_field(input, replacements[[input]]), ""),
     sprintf("      <MiningField name=%s usageType=\"target\"/>", quoted(target)),
     "    </MiningSchema>", tables, "  </RegressionModel>", "</PMML>"), path)
 }
 
-# Columns of texts and numbers; texts are quoted only where they must be, which none of ours does.
-write_table <- function(path, columns) {
-  cells <- lapply(columns, function(column) if (is.numeric(column)) number(column) else as.character(column))
-  writeLines(c(paste(names(columns), collapse = ","), do.call(paste, c(unname(cells), sep = ","))), path)
+# Missing cells are empty.
+cells_of <- function(column) {
+  cells <- rep("", length(column))
+  there <- !is.na(column)
+  cells[there] <- if (is.numeric(column)) number(column[there]) else as.character(column[there])
+  cells
 }
+
+# Columns of texts and numbers; texts are quoted only where they must be, which none of ours does.
+write_table <- function(path, columns)
+  writeLines(c(paste(names(columns), collapse = ","), do.call(paste, c(unname(lapply(columns, cells_of)), sep = ","))), path)
