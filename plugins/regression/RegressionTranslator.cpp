@@ -41,7 +41,7 @@ Normalization ReadNormalization(const DOMElement* element) {
 // The target's name; empty when the document names none.
 std::string ReadTarget(const DOMElement* element, const MiningSchema& schema,
                        const ScoreDictionary& dictionary) {
-  const std::string attribute = AttributeText(element, Tags::XML_ATT_TAGFIELDNAME);
+  std::string attribute = AttributeText(element, Tags::XML_ATT_TAGFIELDNAME);
   const MiningField* chosen = schema.Find(attribute);
   if (chosen != nullptr && chosen->role == ScoreModel::kTarget) return attribute;
   const MiningField* target = nullptr;
