@@ -85,6 +85,18 @@ TEST(MissingValueSet, HoldsValuesByTheRulesOfItsRanges) {
     EXPECT_EQ(set.HoldsValue(row.value.get()), row.held) << row.why;
 }
 
+TEST(MissingValueSet, EndsOfTwoKindsAreNoSingleValueHoweverManyRangesThereAre) {
+  MissingValueSet set;
+  for (int i = 100; i < 140; ++i)
+    set.Add(NewSingle(i));
+  // A text at the upper end leaves the range open to above.
+  set.Add(new Range(NewNumber(5), NewText("5"), true, true));
+  const NumericValue seven(7);
+  const NumericValue four(4);
+  EXPECT_TRUE(set.HoldsValue(&seven));
+  EXPECT_FALSE(set.HoldsValue(&four));
+}
+
 TEST(MissingValueSet, CopiesAreDeepAndDisplayTheRanges) {
   MissingValueSet set;
   EXPECT_EQ(DisplayOf(set), " Begin MissingValueSet Display:\nEnd MissingValueSet Display.\n");

@@ -84,6 +84,7 @@ TEST(StringValue, ReadsNumbersFromItsStart) {
       {"-99999999999999999999", std::numeric_limits<int>::min(), -1e20},
       {"1,5", 1, 1.0},
       {"\t\n 8", 8, 8.0},
+      {"\v\f\r8", 8, 8.0},
       {"- 3", 0, 0.0},
       {"+-3", 0, 0.0},
       {"1e3", 1, 1000.0},
