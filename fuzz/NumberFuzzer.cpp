@@ -1,5 +1,6 @@
 // Bytes as numbers, dates and times, held against the standard library's streams.
 
+#include <algorithm>
 #include <clocale>
 #include <cstdint>
 #include <cstdlib>
@@ -10,6 +11,7 @@
 #include <string>
 
 #include "fuzz/Check.h"
+#include "kestrel/foundation/Calendar.h"
 #include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/NumericValue.h"
 
@@ -56,6 +58,7 @@ double SecondsOfStream(const std::string& date, const std::string& time) {
   long long numbers[3];
   if (!date.empty()) {
     if (!ReadThree(date, '-', numbers)) return NumericValue::gSysmisValue;
+    numbers[0] = std::min<long long>(numbers[0], Calendar::kFarthest);
     if (!DateTimeValue::IsValidDate(numbers[0], numbers[1], numbers[2])) return NumericValue::gSysmisValue;
     seconds += static_cast<double>(DaysOf(numbers[0], numbers[1], numbers[2])) * 86400.0;
   }
@@ -99,6 +102,8 @@ void CheckDates(const std::string& text) {
   // A stream takes signs, which no part of a date has.
   if (plain.find("--") != std::string::npos || plain[0] == '-' || plain.find(":-") != std::string::npos)
     return;
+  // Nor does a stream cut a year that its integer does not hold.
+  if (plain.find_first_not_of("0123456789") > 18) return;
   const size_t split = plain.find('T');
   if (split == std::string::npos) {
     Check(DateTimeValue(text, DateTimeType::kDate).GetDouble() == SecondsOfStream(plain, ""), "a date");
