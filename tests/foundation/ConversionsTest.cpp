@@ -313,6 +313,24 @@ TEST_F(Conversions, BufferFormsTellTheLengthWithoutABuffer) {
   }
 }
 
+TEST_F(Conversions, BufferFormsEmptyTheBufferAlsoWhenTheyRefuse) {
+  char narrow[] = "before";
+  unsigned short wide[] = {'x', 'y', 0};
+  size_t length = 9;
+  EXPECT_EQ(VEXAMBGenericto8(nullptr, nullptr, 3, narrow, sizeof narrow, &length), kVEXAMBBadArgument);
+  EXPECT_STREQ(narrow, "");
+  EXPECT_EQ(length, 0u);
+  narrow[0] = 'b';
+  length = 9;
+  EXPECT_EQ(VEXAMB16toGeneric(nullptr, nullptr, 3, narrow, sizeof narrow, &length), kVEXAMBBadArgument);
+  EXPECT_STREQ(narrow, "");
+  EXPECT_EQ(length, 0u);
+  length = 9;
+  EXPECT_EQ(VEXAMBGenericto16(nullptr, nullptr, 3, wide, 3, &length), kVEXAMBBadArgument);
+  EXPECT_EQ(wide[0], 0);
+  EXPECT_EQ(length, 0u);
+}
+
 TEST_F(Conversions, ZerosInsideATextAreKept) {
   const std::string text("a\0\xC3\xA9\0", 5);
   for (const BufferForm& form : kBufferForms) {

@@ -126,4 +126,10 @@ TEST_F(NarrowText, AppendKeepsWhatIsThere) {
   EXPECT_EQ(NarrowToUtf16({}), u"");
 }
 
+TEST_F(NarrowText, TheFirstByteBeyondAsciiIsNone) {
+  EXPECT_EQ(NarrowToUtf16("a\x80"), u"a\uFFFD");
+  EXPECT_EQ(NarrowToUtf16("a\x7F"), u"a\u007F");
+  EXPECT_EQ(Utf16ToNarrow(u"a\x80", 2), "a\xC2\x80");
+}
+
 }  // namespace

@@ -278,6 +278,26 @@ TEST_F(PliantStringTest, ReplacesSubstrings) {
 }
 
 /// A search that starts over at every place would take the product of the lengths here: minutes.
+TEST_F(PliantStringTest, FindsWhatAPlainSearchFinds) {
+  const auto text = [](unsigned bits, size_t length) {
+    std::u16string made;
+    for (size_t i = 0; i < length; ++i)
+      made += (bits >> i) % 2 == 0 ? u'a' : u'b';
+    return made;
+  };
+  for (size_t partLength = 1; partLength <= 6; ++partLength) {
+    for (unsigned part = 0; part < 1u << partLength; ++part) {
+      const std::u16string searched = text(part, partLength);
+      const PliantString asPliant(searched);
+      for (unsigned whole = 0; whole < 1u << 10; ++whole) {
+        const std::u16string in = text(whole, 10);
+        ASSERT_EQ(PliantString(in).ContainsString(asPliant), in.find(searched) != std::u16string::npos)
+            << part << " of " << partLength << " in " << whole;
+      }
+    }
+  }
+}
+
 TEST_F(PliantStringTest, RepeatedTextsAreSearchedInTheirLength) {
   const PliantString part(std::u16string(100000, u'a') + u"b");
   PliantString text(std::u16string(1000000, u'a'));
