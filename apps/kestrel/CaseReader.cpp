@@ -201,7 +201,7 @@ bool CaseReader::Read(const TableRow& row, Fault& fault) {
     if (!is_read) {
       fault.column = input.column;
       fault.text = "\"" + ShownText(cell) + "\" cannot be read; accepted is " + WhatIsAccepted(input) +
-                   ", or an empty cell for a missing value";
+                   ", or an empty cell or a text of --missing for a missing value";
       return false;
     }
     ++slot;

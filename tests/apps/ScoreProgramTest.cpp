@@ -12,7 +12,8 @@ namespace {
 
 const char kHint[] = "\n  hint: --on-error null leaves such predictions empty and goes on\n";
 const char kNumber[] =
-    " cannot be read; accepted is a number such as -1.5 or 2e3, with a decimal point, or an empty cell for a "
+    " cannot be read; accepted is a number such as -1.5 or 2e3, with a decimal point, or an empty cell or a "
+    "text of --missing for a "
     "missing "
     "value";
 
@@ -119,7 +120,7 @@ TEST(KestrelScore, ReadsEveryTypeOfInput) {
 TEST(KestrelScore, StopsAtTheFirstFault) {
   const std::string header = "x,n,colour,free text,day,hour,moment,days\n";
   const std::string here = "kestrel: standard input:2: ";
-  const std::string missing = ", or an empty cell for a missing value";
+  const std::string missing = ", or an empty cell or a text of --missing for a missing value";
   CheckRows({
       {"a text where a number belongs",
        {"D/line.xml"},
