@@ -11,8 +11,7 @@ struct SecondByte {
 
 SecondByte SecondByteAfter(unsigned first) {
   switch (first) {
-    case 0xC2:
-      return {0xA0, 0xBF};  // Below are control characters, which terminals obey like those of ASCII.
+    case 0xC2:  // Below are control characters, which terminals obey like those of ASCII.
     case 0xE0:
       return {0xA0, 0xBF};
     case 0xED:
