@@ -1,5 +1,6 @@
 #include "apps/kestrel/Progress.h"
 
+#include <cmath>
 #include <cstdio>
 
 #include "kestrel/platform/Terminal.h"
@@ -9,7 +10,7 @@ namespace {
 
 /// Numbers here are for people: this many digits after the point, whatever the locale.
 std::string Thousandths(double number) {
-  const auto whole = static_cast<std::uint64_t>(number * 1000.0 + 0.5);
+  const auto whole = static_cast<std::uint64_t>(std::llround(number * 1000.0));
   const std::string digits = std::to_string(1000 + whole % 1000);
   return std::to_string(whole / 1000) + "." + digits.substr(1);
 }

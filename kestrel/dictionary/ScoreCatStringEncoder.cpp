@@ -17,7 +17,7 @@ ScoreCatStringEncoder::ScoreCatStringEncoder(int n) {
 
 ScoreCatStringEncoder::ScoreCatStringEncoder(const std::vector<std::string>& texts) {
   for (const std::string& text : texts)
-    Encode(text);
+    ScoreCatStringEncoder::Encode(text);
 }
 
 ScoreCatStringEncoder::ScoreCatStringEncoder(const ScoreCatStringEncoder& other)
@@ -69,7 +69,7 @@ std::string_view ScoreCatStringEncoder::KeyOf(std::string_view text) const {
 
 int ScoreCatStringEncoder::Encode(const std::string& text) {
   // The text itself comes first: it may have been registered untrimmed.
-  const int known = EncodeConst(text);
+  const int known = ScoreCatStringEncoder::EncodeConst(text);
   if (known >= 0) return known;
   const auto it = codes_.emplace(KeyOf(text), ++lastCode_).first;
   keys_.push_back(&it->first);

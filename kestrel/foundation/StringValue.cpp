@@ -35,6 +35,8 @@ StringValue::StringValue(const std::string& text) : text_(text), length_(static_
 StringValue::StringValue(const char* text) : StringValue(std::string(text == nullptr ? "" : text)) {}
 StringValue::StringValue(const StringValue& other) = default;
 StringValue& StringValue::operator=(const StringValue& other) = default;
+StringValue::StringValue(StringValue&& other) noexcept = default;
+StringValue& StringValue::operator=(StringValue&& other) noexcept = default;
 StringValue::~StringValue() = default;
 
 void StringValue::SetValue(const ScoreValue* other) {

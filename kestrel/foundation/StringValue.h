@@ -31,6 +31,8 @@ class KESTREL_API StringValue : public ScoreValue {
   explicit StringValue(const char* text);
   StringValue(const StringValue& other);
   StringValue& operator=(const StringValue& other);
+  StringValue(StringValue&& other) noexcept;
+  StringValue& operator=(StringValue&& other) noexcept;
   ~StringValue() override;
 
   /// Copies the other's text; anything but a text makes this one empty. The length is not changed.

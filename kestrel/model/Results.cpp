@@ -17,8 +17,8 @@ const Value* AsExactly(const ScoreValue& value) {
 
 ResultValue::ResultValue() = default;
 ResultValue::~ResultValue() = default;
-ResultValue::ResultValue(ResultValue&&) = default;
-ResultValue& ResultValue::operator=(ResultValue&&) = default;
+ResultValue::ResultValue(ResultValue&&) noexcept = default;
+ResultValue& ResultValue::operator=(ResultValue&&) noexcept = default;
 
 // Assigning to a variant that holds the same class assigns to the object in it, so a text's room is used
 // again.

@@ -25,8 +25,8 @@ class KESTREL_API ResultValue {
  public:
   ResultValue();
   ~ResultValue();
-  ResultValue(ResultValue&&);
-  ResultValue& operator=(ResultValue&&);
+  ResultValue(ResultValue&&) noexcept;
+  ResultValue& operator=(ResultValue&&) noexcept;
 
   /// Copies the value.
   void Assign(const ScoreValue& value);

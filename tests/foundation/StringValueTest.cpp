@@ -5,6 +5,8 @@
 #include <limits>
 #include <memory>
 #include <string>
+#include <type_traits>
+#include <utility>
 
 #include "kestrel/foundation/NumericValue.h"
 #include "tests/support/CommaLocale.h"
@@ -164,6 +166,15 @@ TEST(StringValue, AssignsTextAndLength) {
   const StringValue& same = other;
   other = same;
   EXPECT_EQ(other.GetString(), "abc");
+}
+
+TEST(StringValue, MovesWithItsLength) {
+  StringValue from("a text that is too long to lie in the string object itself");
+  from.SetLength(8);
+  const StringValue to(std::move(from));
+  EXPECT_EQ(to.GetString(), "a text that is too long to lie in the string object itself");
+  EXPECT_EQ(to.GetLength(), 8);
+  EXPECT_TRUE(std::is_nothrow_move_assignable_v<StringValue>);
 }
 
 TEST(StringValue, CopiesBelongToTheCaller) {
