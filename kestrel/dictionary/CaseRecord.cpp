@@ -43,6 +43,7 @@ CaseRecord::CaseRecord(const CaseRecord& other) : CaseRecord() {
   stamp_ = other.stamp_;
   values_.resize(other.values_.size(), nullptr);
   numbers_.resize(other.values_.size(), nullptr);
+  size_ = values_.size();
   for (std::size_t position = 0; position < values_.size(); ++position) {
     const ScoreValue* value = other.values_[position];
     if (value != nullptr) Put(position, value->Clone());
@@ -55,6 +56,7 @@ CaseRecord& CaseRecord::operator=(const CaseRecord& other) {
   positions_.swap(copy.positions_);
   values_.swap(copy.values_);
   numbers_.swap(copy.numbers_);
+  size_ = copy.size_;
   stamp_ = copy.stamp_;
   return *this;
 }
@@ -66,7 +68,7 @@ CaseRecord::~CaseRecord() {
 
 bool CaseRecord::HasSlot(int index) const {
   // A negative index becomes a number beyond every size.
-  return static_cast<std::size_t>(index) < values_.size();
+  return static_cast<std::size_t>(index) < size_;
 }
 
 void CaseRecord::Put(std::size_t position, ScoreValue* value) {
@@ -80,6 +82,7 @@ void CaseRecord::Add(const std::string& name, ScoreValue* value) {
   if (isNew) {
     values_.push_back(nullptr);
     numbers_.push_back(nullptr);
+    size_ = values_.size();
     stamp_ = NewStamp();
   }
   Put(static_cast<std::size_t>(it->second), value);

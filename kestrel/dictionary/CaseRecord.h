@@ -66,6 +66,8 @@ class KESTREL_API CaseRecord : public ScoreCaseRecord {
   // values_[i] again where it is exactly a NumericValue, else null: spares the per-case road asking for its
   // type.
   std::vector<NumericValue*> numbers_;
+  // The number of slots: the vectors would compute it anew from two addresses for every value that is set.
+  std::size_t size_ = 0;
   unsigned long long stamp_;
 };
 

@@ -44,18 +44,6 @@ std::uint64_t BitsOf(double number) {
 // No other number has this pattern, so comparing the bits is comparing the numbers.
 constexpr std::uint64_t kSysmisBits = 0xFFEFFFFFFFFFFFFFu;
 
-/// Values by position from the array that a record with a layout stamp shows.
-struct ArraySource {
-  const ScoreValue* const* values;
-  const ScoreValue* At(std::size_t position) const { return values[position]; }
-};
-
-/// Values by position from a record that promises nothing.
-struct RecordSource {
-  const ScoreCaseRecord& record;
-  const ScoreValue* At(std::size_t position) const { return record.Get(static_cast<int>(position)); }
-};
-
 }  // namespace
 
 CaseVector::CaseVector() = default;
@@ -132,14 +120,23 @@ unsigned CaseVector::Fill(const ScoreCaseRecord& record) {
   if (stamp == 0) {
     layout_stamp_ = 0;
     LookUpPositions(record);
-    return FillFrom(RecordSource{record});
+    return FillFrom(GatherValues(record));
   }
   const std::vector<ScoreValue*>& values = record.GetAllValues();
   if (stamp != layout_stamp_ || values.size() < static_cast<std::size_t>(positions_end_)) {
     LookUpPositions(record);
     layout_stamp_ = stamp;
   }
-  return FillFrom(ArraySource{values.data()});
+  return FillFrom(values.data());
+}
+
+// A record without a layout stamp promises nothing about its values as a whole.
+const ScoreValue* const* CaseVector::GatherValues(const ScoreCaseRecord& record) {
+  gathered_.assign(static_cast<std::size_t>(positions_end_), nullptr);
+  for (const Slot& slot : slots_) {
+    if (slot.position >= 0) gathered_[static_cast<std::size_t>(slot.position)] = record.Get(slot.position);
+  }
+  return gathered_.data();
 }
 
 void CaseVector::LookUpPositions(const ScoreCaseRecord& record) {
@@ -161,49 +158,53 @@ void CaseVector::LookUpPositions(const ScoreCaseRecord& record) {
       absent_outcome_ |= slot.missing_outcome;
     }
   }
+  missing_slots_.resize(plain_slots_.size() + 1);
 }
 
-// Which values of a case are missing is as good as random, so nothing here branches on a single one of them:
-// numbers are copied as they are, an empty place as a system-missing number, and only whether there was any
-// is noted. Values of other classes than the library's own number (addresses of type descriptions are
-// compared, which at worst sends a number there, too) take the general way.
-template <typename Source>
-unsigned CaseVector::FillFrom(const Source& source) {
+unsigned CaseVector::FillFrom(const ScoreValue* const* record) {
   invalid_slot_ = GetSlotCount();
   unsigned outcome = absent_outcome_;
-  bool has_missing = false;
-  double* const values = values_.data();
   const PlainSlot* const end = plain_slots_.data() + plain_slots_.size();
-  for (const PlainSlot* slot = plain_slots_.data(); slot != end; ++slot) {
-    const ScoreValue* value = source.At(slot->position);
-    if (value == nullptr) value = &NumericValue::SYSMIS;
-    if (&typeid(*value) != &typeid(NumericValue)) {
-      outcome |= FillTreated(static_cast<int>(slot->number), value);
-      continue;
-    }
-    const double number = static_cast<const NumericValue*>(value)->NumericValue::GetDouble();
-    has_missing |= BitsOf(number) == kSysmisBits;
-    values[slot->number] = number;
+  const PlainSlot** missing_end = missing_slots_.data();
+  for (const PlainSlot* slot = plain_slots_.data();; ++slot) {
+    slot = CopyNumbers(slot, record, missing_end);
+    if (slot == end) break;
+    outcome |= FillTreated(static_cast<int>(slot->number), record[slot->position]);
   }
-  if (has_missing) outcome |= FillMissingPlain();
+  for (const PlainSlot* const* slot = missing_slots_.data(); slot != missing_end; ++slot) {
+    std::memcpy(&values_[(*slot)->number], &(*slot)->missing_bits, sizeof(double));
+    if ((*slot)->missing_bits == kSysmisBits) outcome |= kMissingNumber;
+  }
   for (const int number : other_slots_) {
     const int position = slots_[number].position;
-    outcome |= FillTreated(number, position < 0 ? nullptr : source.At(static_cast<std::size_t>(position)));
+    outcome |= FillTreated(number, position < 0 ? nullptr : record[position]);
   }
   return outcome;
 }
 
-// Puts what stands for a missing value where a number is missing, picked by a mask for the reason above.
-unsigned CaseVector::FillMissingPlain() {
-  bool still_missing = false;
+// Copies numbers from the slot on and lists those that are missing. Stops at a value that is not of the
+// library's own number class, or at the end. (Addresses of type descriptions are compared, which at worst
+// stops at a number, too.)
+//
+// Which values of a case are missing is as good as random, so nothing here branches on a single one: every
+// slot is written behind the list, which grows when the number was missing. The loop calls nothing, so that
+// all it uses stays in registers.
+const CaseVector::PlainSlot* CaseVector::CopyNumbers(const PlainSlot* slot, const ScoreValue* const* record,
+                                                     const PlainSlot**& missing_end) {
   double* const values = values_.data();
-  for (const PlainSlot& slot : plain_slots_) {
-    const std::uint64_t bits = BitsOf(values[slot.number]);
-    const std::uint64_t chosen = bits == kSysmisBits ? slot.missing_bits : bits;
-    std::memcpy(&values[slot.number], &chosen, sizeof chosen);
-    still_missing |= chosen == kSysmisBits;
+  const PlainSlot* const end = plain_slots_.data() + plain_slots_.size();
+  const PlainSlot** missing = missing_end;
+  const std::type_info* const own_number = &typeid(NumericValue);
+  for (; slot != end; ++slot) {
+    const ScoreValue* const value = record[slot->position];
+    if (value == nullptr || &typeid(*value) != own_number) break;
+    const double number = static_cast<const NumericValue*>(value)->NumericValue::GetDouble();
+    *missing = slot;
+    missing += BitsOf(number) == kSysmisBits;
+    values[slot->number] = number;
   }
-  return still_missing ? kMissingNumber : kComplete;
+  missing_end = missing;
+  return slot;
 }
 
 unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {

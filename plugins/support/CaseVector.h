@@ -112,9 +112,10 @@ class CaseVector {
   int AddSlot(const MiningField& field, bool is_category, double map_missing_to);
   static void Prepare(Slot& slot);
   void LookUpPositions(const ScoreCaseRecord& record);
-  template <typename Source>
-  unsigned FillFrom(const Source& source);
-  unsigned FillMissingPlain();
+  const ScoreValue* const* GatherValues(const ScoreCaseRecord& record);
+  unsigned FillFrom(const ScoreValue* const* record);
+  const PlainSlot* CopyNumbers(const PlainSlot* slot, const ScoreValue* const* record,
+                               const PlainSlot**& missing_end);
   unsigned FillTreated(int number, const ScoreValue* value);
   unsigned FillNumber(int number, double value);
   unsigned FillMissing(int number);
@@ -126,8 +127,11 @@ class CaseVector {
   /// outcome.
   std::vector<PlainSlot> plain_slots_;
   unsigned absent_outcome_ = kComplete;
+  /// The plain slots that are missing in the case at hand, with room for one more than there are.
+  std::vector<const PlainSlot*> missing_slots_;
   std::vector<int> other_slots_;
   std::vector<double> values_;
+  std::vector<const ScoreValue*> gathered_;  ///< by position, of a record without layout stamp
   std::vector<const MiningField*> fields_;
   std::vector<std::unique_ptr<ValueRules>> rules_;  ///< by field
   // Needed until Seal alone.
