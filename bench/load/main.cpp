@@ -91,8 +91,8 @@ void CompareSizes(const char* title, const std::string& once, const std::string&
       {"n", [&] { model = Load(once); }, [&] { model.reset(); }},
       {"2n", [&] { model = Load(twice); }, [&] { model.reset(); }},
   };
-  std::printf("%s\n", title);
-  PrintRatios(contestants, Compare(contestants));
+  const std::vector<double> seconds = Compare(contestants);
+  std::printf("  %-46s %10.6f s  %6.2f x\n", title, seconds[0], seconds[1] / seconds[0]);
 }
 
 /// The smallest document of a shape that has at least that many bytes.
@@ -110,8 +110,9 @@ int Run(bool smoke) {
   CompareLoads("regression document", OfSize(large, [](size_t n) { return ClassificationModel(n, 20); }), 1);
   CompareLoads("dictionary document", OfSize(large, DictionaryModel), 1);
   CompareLoads("small regression document (20 inputs)", LinearModel(20, false), smoke ? 10 : 500);
-  CompareSizes("fields: n = 10,000", DictionaryModel(many), DictionaryModel(2 * many));
-  CompareSizes("categories of one field: n = 10,000", CategoriesModel(many), CategoriesModel(2 * many));
+  std::printf("growth: t(2n) / t(n), n = %zu\n", many);
+  for (const GrowthShape& shape : GrowthShapes())
+    CompareSizes(shape.name, shape.make(many), shape.make(2 * many));
   return 0;
 }
 

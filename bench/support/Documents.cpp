@@ -110,13 +110,72 @@ std::string DictionaryModel(size_t fields) {
          RegressionModel(InputFields(1, false), Table(Predictors(1, 0)));
 }
 
-std::string CategoriesModel(size_t categories) {
+namespace {
+
+/// 0, 1, ... n - 1 out of order.
+std::string Shuffled(size_t i, size_t n) {
+  return std::to_string(i * 7919 % n);
+}
+
+/// A small model on one input with that content.
+std::string OneInputModel(const char* optype, const char* type, const std::string& content) {
+  return Begin(3) + Field("f", optype, type, content) + NumericInputs(1) +
+         Field("y", "continuous", "double", "") +
+         RegressionModel(InputFields(1, false), Table(Predictors(1, 0)));
+}
+
+std::string TextCategories(size_t n) {
   std::string values;
-  for (size_t i = 0; i < categories; ++i)
-    values += Value("category number " + std::to_string(i), "");
-  return Begin(2) + Field("x0", "categorical", "string", values) + Field("y", "continuous", "double", "") +
-         RegressionModel(InputFields(1, false), Table("      <CategoricalPredictor name=\"x0\" "
-                                                      "value=\"category number 1\" coefficient=\"2\"/>\n"));
+  for (size_t i = 0; i < n; ++i)
+    values += Value("category number " + Shuffled(i, n), "");
+  return OneInputModel("categorical", "string", values);
+}
+
+std::string NumberCategories(size_t n) {
+  std::string values;
+  for (size_t i = 0; i < n; ++i)
+    values += Value(Shuffled(i, n) + ".5", "");
+  return OneInputModel("ordinal", "double", values);
+}
+
+std::string ValidAndMissing(size_t n, const char* optype) {
+  std::string values;
+  for (size_t i = 0; i < n; ++i)
+    values += Value(Shuffled(i, n), i % 2 == 0 ? "valid" : "missing");
+  return OneInputModel(optype, "double", values);
+}
+
+std::string Extensions(size_t n) {
+  std::string content;
+  for (size_t i = 0; i < n; ++i)
+    content += "      <Extension name=\"width\" value=\"8\"/>\n";
+  return OneInputModel("continuous", "double", content);
+}
+
+std::string Intervals(size_t n) {
+  std::string content;
+  for (size_t i = 0; i < n; ++i) {
+    const std::string left = Shuffled(i, n);
+    content += "      <X-DataField><Interval leftMargin=\"" + left + "\" rightMargin=\"" + left +
+               ".5\"/></X-DataField>\n";
+  }
+  return OneInputModel("continuous", "double", content);
+}
+
+}  // namespace
+
+const std::vector<GrowthShape>& GrowthShapes() {
+  static const std::vector<GrowthShape> shapes = {
+      {"fields", DictionaryModel},
+      {"inputs of the model", [](size_t n) { return LinearModel(n, true); }},
+      {"categories of one text field", TextCategories},
+      {"categories of one numeric field", NumberCategories},
+      {"valid and missing categories", [](size_t n) { return ValidAndMissing(n, "ordinal"); }},
+      {"valid and missing numbers", [](size_t n) { return ValidAndMissing(n, "continuous"); }},
+      {"intervals of one field", Intervals},
+      {"extensions of one field", Extensions},
+  };
+  return shapes;
 }
 
 }  // namespace kestrel_bench

@@ -5,6 +5,7 @@
 
 #include <cstddef>
 #include <string>
+#include <vector>
 
 namespace kestrel_bench {
 
@@ -19,8 +20,14 @@ std::string ClassificationModel(size_t inputs, size_t categories);
 /// numeric ordinal with missing values, and a small model on the first.
 std::string DictionaryModel(size_t fields);
 
-/// One categorical input with that many categories, and a small model on it.
-std::string CategoriesModel(size_t categories);
+/// A way to make a document of n equal pieces, to see how the load grows with n.
+struct GrowthShape {
+  const char* name;
+  std::string (*make)(size_t n);
+};
+
+/// Fields, inputs of the model, and each kind of content that one field can have, always in shuffled order.
+const std::vector<GrowthShape>& GrowthShapes();
 
 }  // namespace kestrel_bench
 
