@@ -40,8 +40,6 @@ constexpr Hint kHints[] = {
      "that "
      "the list names"},
     {KestrelException::kUnsupported, "functionName", "accepted is regression or classification"},
-    {KestrelException::kUnsupported, "without order",
-     "accepted is none, softmax or simplemax, or a target with optype=\"ordinal\""},
     {KestrelException::kUnsupported, "", "export the model in a form without this construct"},
     {KestrelException::kInvalidDocument, "Invalid XML file",
      "up to here it is well-formed XML; what follows is not, needs something outside of the document, or is "
