@@ -6,6 +6,9 @@
 
 #include <xercesc/util/XercesDefs.hpp>
 
+#include <string>
+#include <vector>
+
 #include "kestrel/foundation/DateTimeType.h"
 #include "kestrel/platform/Export.h"
 #include "kestrel/translate/BaseTranslator.h"
@@ -17,9 +20,14 @@ XERCES_CPP_NAMESPACE_END
 
 namespace MCKestrel_800 {
 
+class DiscreteSplit;
 class ScoreDictVar;
 class ScoreDictionary;
 class ScoreMissingValueSet;
+class ScorePredicate;
+class ScoreSplitVar;
+class ScoreValue;
+struct LeafNodeStats;
 
 /// The readers of PMML elements.
 ///
@@ -77,6 +85,32 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   /// Gives a nominal or ordinal variable its category encoder, unless it has one, and encodes its value
   /// labels in their order. Returns false, doing nothing, for null and for a continuous variable.
   static bool SetupCatEncoder(ScoreDictVar* variable);
+
+  // ---- Predicates. What they give back belongs to the caller; the variables of the dictionaries must
+  // outlive it. A field is looked up in `dictionary` and then, unless it is null, in `derivedDictionary`.
+
+  /// Reads a `SimplePredicate` element.
+  /// ordinalAsScale  whether an ordinal number field is compared by its numbers instead of by the positions
+  /// of
+  ///                 its categories.
+  static ScorePredicate* ParsePredicate(xercesc::DOMElement* element, const ScoreDictionary* dictionary,
+                                        const ScoreDictionary* derivedDictionary, bool ordinalAsScale);
+
+  /// Reads a `SimpleSetPredicate` element.
+  static ScorePredicate* ParseSetPredicate(xercesc::DOMElement* element, const ScoreDictionary* dictionary,
+                                           const ScoreDictionary* derivedDictionary);
+
+  /// Reads a `CompoundPredicate` element with all that is in it. Constants that change nothing are dropped,
+  /// and a single child stands for the compound. Null when nothing is left: no predicate, which the caller
+  /// accepts.
+  static ScorePredicate* ParseCompoundPredicate(xercesc::DOMElement* element,
+                                                const ScoreDictionary* dictionary,
+                                                const ScoreDictionary* derivedDictionary,
+                                                bool ordinalAsScale);
+
+  /// Reads the `ScoreDistribution` children of a node into `stats`, in document order, replacing what it
+  /// held.
+  static void SetLeafNodeStats(xercesc::DOMElement* node, std::vector<LeafNodeStats>& stats);
 };
 
 }  // namespace MCKestrel_800
