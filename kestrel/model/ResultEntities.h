@@ -43,7 +43,8 @@ class KESTREL_API ResultEntities {
   void SetDecidingId(std::string_view id) { deciding_id_.assign(id); }
   const std::string& GetDecidingId() const { return deciding_id_; }
 
-  /// The entities in the order in which the case met them. Models add them only when the path is wanted.
+  /// The entities in the order in which the case met them. Nothing is added unless the path is wanted; a
+  /// model that has to look for the identifier asks IsPathWanted() first.
   void AddToPath(std::string_view id);
   std::size_t GetPathLength() const { return path_length_; }
   /// `position` is below GetPathLength().

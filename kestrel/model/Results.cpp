@@ -58,6 +58,7 @@ void ClsResult::Reset() {
   has_prediction_ = false;
   probability_ = 0.0;
   count_ = 0;
+  entities_.Reset();
 }
 
 void ClsResult::SetProbability(double probability) {
@@ -121,6 +122,7 @@ void RegResult::Reset() {
   has_prediction_ = false;
   probability_ = 0.0;
   standard_error_ = NumericValue::gSysmisValue;
+  entities_.Reset();
 }
 
 void RegResult::SetProbability(double probability) {

@@ -12,6 +12,7 @@
 #include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
+#include "kestrel/model/ResultEntities.h"
 #include "kestrel/model/ScoreClsResult.h"
 #include "kestrel/model/ScoreRegResult.h"
 #include "kestrel/platform/Export.h"
@@ -62,6 +63,10 @@ class KESTREL_API ClsResult : public ScoreClsResult {
   /// The probability at the position; 0.0 past the end.
   double GetProbability(size_t index) const;
 
+  /// The parts of the model that led to this result. Belong to it.
+  ResultEntities& GetEntities() { return entities_; }
+  const ResultEntities& GetEntities() const { return entities_; }
+
  private:
   struct Entry {
     ResultValue category;
@@ -74,6 +79,7 @@ class KESTREL_API ClsResult : public ScoreClsResult {
   /// Entries past count_ are left from earlier cases, kept to be written over.
   std::vector<Entry> entries_;
   size_t count_ = 0;
+  ResultEntities entities_;
 };
 
 /// The outcome of a regression: kind 1.
@@ -92,11 +98,16 @@ class KESTREL_API RegResult : public ScoreRegResult {
   void SetStandardError(double error) override;
   double GetStandardError() const override;
 
+  /// The parts of the model that led to this result. Belong to it.
+  ResultEntities& GetEntities() { return entities_; }
+  const ResultEntities& GetEntities() const { return entities_; }
+
  private:
   ResultValue prediction_;
   bool has_prediction_ = false;
   double probability_ = 0.0;
   double standard_error_;
+  ResultEntities entities_;
 };
 
 }  // namespace MCKestrel_800

@@ -59,4 +59,29 @@ TEST(ResultAllocation, ClassificationCasesNeedNoneAfterTheFirst) {
       {DateTimeValue(0.0, kDateVal), DateTimeValue(86400.0, kDateVal)});
 }
 
+template <typename Result>
+void ExpectPathsNeedNoneAfterTheLongest(const std::string& id) {
+  Result result;
+  ResultEntities* entities = ResultEntities::Of(&result);
+  entities->SetPathWanted(true);
+  size_t after_first = 0;
+  for (int i = 0; i < 1000; ++i) {
+    result.Reset();
+    const int length = 20 - i % 20;
+    for (int node = 0; node < length; ++node)
+      entities->AddToPath(id);
+    entities->SetDecidingId(id);
+    if (i == 0) after_first = CountAllocations();
+  }
+  EXPECT_EQ(CountAllocations(), after_first);
+  EXPECT_EQ(entities->GetDecidingId(), id);
+}
+
+TEST(ResultAllocation, PathsNeedNoneAfterTheLongest) {
+  for (const std::string& id : {std::string("n1"), std::string(100, 'n')}) {
+    ExpectPathsNeedNoneAfterTheLongest<ClsResult>(id);
+    ExpectPathsNeedNoneAfterTheLongest<RegResult>(id);
+  }
+}
+
 }  // namespace

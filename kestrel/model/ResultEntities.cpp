@@ -1,0 +1,39 @@
+#include "kestrel/model/ResultEntities.h"
+
+#include <typeinfo>
+
+#include "kestrel/model/Results.h"
+
+namespace MCKestrel_800 {
+
+ResultEntities::ResultEntities() = default;
+ResultEntities::~ResultEntities() = default;
+
+// Models ask for every case. Nearly all results are of one of the two classes themselves, and to compare the
+// class costs far less than to search its bases.
+ResultEntities* ResultEntities::Of(ScoreResult* result) {
+  if (result == nullptr) return nullptr;
+  const std::type_info& type = typeid(*result);
+  if (type == typeid(ClsResult)) return &static_cast<ClsResult*>(result)->GetEntities();
+  if (type == typeid(RegResult)) return &static_cast<RegResult*>(result)->GetEntities();
+  if (auto* classification = dynamic_cast<ClsResult*>(result)) return &classification->GetEntities();
+  if (auto* regression = dynamic_cast<RegResult*>(result)) return &regression->GetEntities();
+  return nullptr;
+}
+
+void ResultEntities::AddToPath(std::string_view id) {
+  if (!path_wanted_) return;
+  if (path_length_ < path_.size()) {
+    path_[path_length_].assign(id);
+  } else {
+    path_.emplace_back(id);
+  }
+  ++path_length_;
+}
+
+void ResultEntities::Reset() {
+  deciding_id_.clear();
+  path_length_ = 0;
+}
+
+}  // namespace MCKestrel_800
