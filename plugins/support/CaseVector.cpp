@@ -50,16 +50,18 @@ CaseVector::CaseVector() = default;
 CaseVector::~CaseVector() = default;
 
 int CaseVector::AddNumber(const MiningField& field, double map_missing_to) {
-  return AddSlot(field, false, map_missing_to);
+  return AddSlot(field, false, map_missing_to, kOtherCategory);
 }
 
-int CaseVector::AddCategory(const MiningField& field) {
-  return AddSlot(field, true, std::numeric_limits<double>::quiet_NaN());
+int CaseVector::AddCategory(const MiningField& field, double other_code) {
+  return AddSlot(field, true, std::numeric_limits<double>::quiet_NaN(), other_code);
 }
 
-int CaseVector::AddSlot(const MiningField& field, bool is_category, double map_missing_to) {
-  char bits[sizeof map_missing_to];
-  std::memcpy(bits, &map_missing_to, sizeof bits);
+int CaseVector::AddSlot(const MiningField& field, bool is_category, double map_missing_to,
+                        double other_code) {
+  const double parts[] = {map_missing_to, other_code};
+  char bits[sizeof parts];
+  std::memcpy(bits, parts, sizeof bits);
   std::string key = field.name + (is_category ? "c" : "n");
   key.append(bits, sizeof bits);
   const int number = GetSlotCount();
@@ -70,7 +72,8 @@ int CaseVector::AddSlot(const MiningField& field, bool is_category, double map_m
     fields_.push_back(&field);
     rules_.push_back(std::make_unique<ValueRules>(*field.variable));
   }
-  slots_.push_back({&field, rules_[place->second].get(), is_category, map_missing_to, place->second});
+  slots_.push_back(
+      {&field, rules_[place->second].get(), is_category, map_missing_to, other_code, place->second});
   return number;
 }
 
@@ -100,7 +103,7 @@ void CaseVector::Prepare(Slot& slot) {
   const MiningField& field = *slot.field;
   const ScoreDictVar& variable = *field.variable;
   const auto place = [&slot](const ScoreValue& value) {
-    return slot.is_category ? static_cast<double>(slot.rules->FindCode(value))
+    return slot.is_category ? CodeValue(slot, slot.rules->FindCode(value))
                             : NumberOf(value, *slot.field->variable);
   };
   slot.is_text = variable.GetVarType() == ScoreDictVar::STRING_VAR;
@@ -113,6 +116,10 @@ void CaseVector::Prepare(Slot& slot) {
   if (field.invalid_replacement != nullptr) slot.invalid_value = place(*field.invalid_replacement);
   slot.is_plain =
       !slot.is_category && !slot.has_outliers && !field.missing_is_invalid && slot.rules->TakesEveryNumber();
+}
+
+double CaseVector::CodeValue(const Slot& slot, int code) {
+  return code == ValueRules::kUnknown ? slot.other_code : code;
 }
 
 unsigned CaseVector::Fill(const ScoreCaseRecord& record) {
@@ -228,7 +235,7 @@ unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {
   if (verdict == ValueRules::kMissing) return FillMissing(number);
   if (verdict == ValueRules::kInvalid) return FillInvalid(number, *value);
   if (slot.has_outliers) return FillNumber(number, NumberOf(*value, *slot.field->variable));
-  values_[number] = code;
+  values_[number] = CodeValue(slot, code);
   return kComplete;
 }
 
@@ -243,7 +250,7 @@ unsigned CaseVector::FillNumber(int number, double value) {
       value = value < field.low_value ? field.low_value : field.high_value;
     }
   }
-  values_[number] = slot.is_category ? slot.rules->FindCode(NumericValue(value)) : value;
+  values_[number] = slot.is_category ? CodeValue(slot, slot.rules->FindCode(NumericValue(value))) : value;
   return kComplete;
 }
 
@@ -263,7 +270,7 @@ unsigned CaseVector::FillInvalid(int number, const ScoreValue& value) {
       return kComplete;
     case MiningField::InvalidTreatment::kAsIs:
       if (slot.is_category) {
-        values_[number] = slot.rules->FindCode(value);
+        values_[number] = CodeValue(slot, slot.rules->FindCode(value));
         return kComplete;
       }
       values_[number] = NumberOf(value, *slot.field->variable);

@@ -59,7 +59,10 @@ class CaseVector {
   int AddNumber(const MiningField& field, double map_missing_to = std::numeric_limits<double>::quiet_NaN());
 
   /// The slot that holds the field as a category code. An input asked for twice is one slot.
-  int AddCategory(const MiningField& field);
+  /// other_code  what stands for a value that has no code: kOtherCategory, or kMissingCategory for models
+  /// that
+  ///             make no difference.
+  int AddCategory(const MiningField& field, double other_code = kOtherCategory);
 
   /// The code of a value in a category slot; see ValueRules::AddCategory.
   int AddCategoryValue(int slot, const ScoreValue& value);
@@ -99,6 +102,7 @@ class CaseVector {
     ValueRules* rules;
     bool is_category;
     double map_missing_to;
+    double other_code;
     int field_position;
     bool is_plain = false;
     bool is_text = false;
@@ -109,8 +113,9 @@ class CaseVector {
     double invalid_value = NumericValue::gSysmisValue;
   };
 
-  int AddSlot(const MiningField& field, bool is_category, double map_missing_to);
+  int AddSlot(const MiningField& field, bool is_category, double map_missing_to, double other_code);
   static void Prepare(Slot& slot);
+  static double CodeValue(const Slot& slot, int code);
   void LookUpPositions(const ScoreCaseRecord& record);
   const ScoreValue* const* GatherValues(const ScoreCaseRecord& record);
   unsigned FillFrom(const ScoreValue* const* record);

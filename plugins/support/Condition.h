@@ -37,6 +37,8 @@ struct Condition {
     kXor,
     kSurrogate
   };
+  /// Whether the test of a node's first child tells which child is taken; see TreeTable.
+  enum Decides : std::uint32_t { kDecidesNothing, kDecidesNumber, kDecidesNumberAbove, kDecidesCode };
   /// Consecutive entries of the table.
   struct Span {
     std::uint32_t first;
@@ -49,7 +51,8 @@ struct Condition {
     Span span;
   };
   std::uint32_t slot : 24;
-  std::uint32_t kind : 8;
+  std::uint32_t kind : 6;
+  std::uint32_t decides : 2;
   /// For the owner's use. Inside a ConditionTable: the entry after this one and all that belongs to it.
   std::int32_t next;
 };

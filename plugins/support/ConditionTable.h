@@ -12,9 +12,9 @@
 
 namespace MCKestrel_800 {
 
+class DiscreteSplit;
 class PredicateInputs;
 class ScaleSplit;
-class ScoreSplitVar;
 
 /// Decides exactly what the predicate objects decide on the same vector, without calling them. All predicates
 /// that the core's reader makes can be compiled, so the objects need not be kept.
@@ -43,7 +43,7 @@ class ConditionTable {
   };
 
   Condition CompileNumber(const ScaleSplit& split, PredicateInputs& inputs);
-  Condition CompileCategory(const ScoreSplitVar& split, PredicateInputs& inputs);
+  Condition CompileCategory(const DiscreteSplit& split, PredicateInputs& inputs);
   void AddPart(const ScorePredicate* predicate, PredicateInputs& inputs);
   ScorePredicate::PredicateResult EvaluateCategory(const Condition& condition, double code) const;
   ScorePredicate::PredicateResult EvaluateCompound(std::size_t part, const double* values) const;

@@ -1,0 +1,68 @@
+// What every model library's translator does the same way: the document's frame around the model element.
+
+#ifndef KESTREL_PLUGINS_SUPPORT_MODELTRANSLATOR_H
+#define KESTREL_PLUGINS_SUPPORT_MODELTRANSLATOR_H
+
+#include <memory>
+#include <string>
+
+#include "kestrel/translate/PMMLTranslator.h"
+#include "plugins/support/MiningSchema.h"
+
+namespace MCKestrel_800 {
+
+class ScoreDictVar;
+class ScoreModel;
+
+/// What the attributes and the mining schema of a model element say, whatever its kind.
+struct ModelFrame {
+  bool is_classification = false;
+  MiningSchema schema;
+  /// The name of the field that is predicted; empty when the document names none.
+  std::string target;
+  /// The variable of that name; null when there is none.
+  const ScoreDictVar* target_variable = nullptr;
+};
+
+/// Reads `DataDictionary` and a model element and leaves the model itself to the derived class.
+/// `TransformationDictionary` and `LocalTransformations` are not read. `modelName` and `algorithmName` play
+/// no part.
+///
+/// Errors, all KestrelException with the place in the document where it is known, beside those of the readers
+/// of dictionary and mining schema:
+///   code 1   no `DataDictionary`, several targets without a choice;
+///   code 4   no model element as a child of the root, no `MiningSchema`, no `functionName`;
+///   code 5   another function than regression and classification, a model marked as not scorable;
+///   code 8   `targetFieldName` is needed and not in the dictionary;
+///   code 11  a regression whose target is a text.
+class ModelTranslator : public PMMLTranslator {
+ public:
+  using PMMLTranslator::ParseFromTree;
+
+  /// tag  the model element's, which must live as long as the translator.
+  explicit ModelTranslator(const char* tag) : tag_(tag) {}
+
+  /// root  the document's root element, or any element with the dictionary and the model as children.
+  /// arg   without meaning. Returns a new model that the caller deletes.
+  ScoreModel* ParseFromTree(xercesc::DOMElement* root, const std::string& arg) override;
+
+  /// Builds the model of one element with a dictionary at hand. The model gets copies of the dictionaries;
+  /// the result dictionary may be null. Returns a new model that the caller deletes.
+  ScoreModel* ParseFromTree(xercesc::DOMElement* modelElement, ScoreDictionary* dictionary,
+                            ScoreDictionary* resultDictionary, const std::string& arg) override;
+
+ protected:
+  /// Reads the model element, with a dictionary that becomes the model's own.
+  virtual std::unique_ptr<ScoreModel> BuildModel(xercesc::DOMElement* element,
+                                                 std::unique_ptr<ScoreDictionary> dictionary) = 0;
+
+  /// Reads the frame of a model element; the schema speaks of the dictionary's variables.
+  static ModelFrame ReadFrame(xercesc::DOMElement* element, ScoreDictionary& dictionary);
+
+ private:
+  const char* tag_;
+};
+
+}  // namespace MCKestrel_800
+
+#endif  // KESTREL_PLUGINS_SUPPORT_MODELTRANSLATOR_H

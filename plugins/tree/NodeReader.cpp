@@ -1,0 +1,214 @@
+#include "plugins/tree/NodeReader.h"
+
+#include <xercesc/dom/DOMElement.hpp>
+
+#include <algorithm>
+#include <cmath>
+
+#include "kestrel/dictionary/ScoreDictionary.h"
+#include "kestrel/foundation/KestrelException.h"
+#include "kestrel/translate/PMMLModelTags.h"
+#include "kestrel/translate/PMMLTranslator.h"
+#include "kestrel/translate/ReaderFault.h"
+#include "kestrel/translate/XmlText.h"
+#include "plugins/support/PredicateReader.h"
+
+namespace MCKestrel_800 {
+namespace {
+
+using xercesc::DOMElement;
+using Tags = PMMLTagText;
+
+constexpr double kNoNumber = NumericValue::gSysmisValue;
+
+/// A finite number, or system-missing when the attribute is absent or empty.
+double ReadNumber(const DOMElement* element, const char16_t* attribute) {
+  const XMLCh* text = FindAttribute(element, attribute);
+  if (IsEmpty(text)) return kNoNumber;
+  double number = 0.0;
+  try {
+    number = BaseTranslator::VerifyDouble(text);
+  } catch (const KestrelException& fault) {
+    // The same words, with the place that the conversion does not know.
+    FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
+  }
+  if (!std::isfinite(number)) {
+    FailAt(element, KestrelException::kInvalidDocument,
+           "invalid " + Narrow(ToXMLCh(attribute)) + " -- " + Narrow(text));
+  }
+  return number;
+}
+
+double ReadRecordCount(const DOMElement* element) {
+  const double count = ReadNumber(element, Tags::XML_ATT_RECORDCOUNT);
+  if (count < 0.0 && count != kNoNumber) {
+    FailAt(element, KestrelException::kInvalidDocument,
+           "invalid recordCount -- " + AttributeText(element, Tags::XML_ATT_RECORDCOUNT));
+  }
+  return count;
+}
+
+/// Elements that producers add for themselves.
+bool IsExtension(const DOMElement* element) {
+  const XMLCh* name = element->getTagName();
+  return ElementIs(element, Tags::XML_ELE_EXTENSION) ||
+         ((name[0] == u'X' || name[0] == u'x') && name[1] == u'-');
+}
+
+bool IsEmbeddedModel(const DOMElement* element) {
+  return ElementIs(element, Tags::XML_ELE_REGRESSION) || ElementIs(element, Tags::XML_ELE_DECISIONTREE);
+}
+
+/// The predicate of a node, after a look at all of its children.
+DOMElement* FindPredicate(const DOMElement* element) {
+  DOMElement* predicate = nullptr;
+  for (DOMElement* child : ChildElements(element)) {
+    if (ElementIs(child, Tags::XML_ELE_NODE) || ElementIs(child, Tags::XML_ELE_SCOREDISTRIBUTION)) continue;
+    if (IsPredicate(child)) {
+      if (predicate != nullptr) {
+        FailAt(child, KestrelException::kStructure, "<Node> has more than one predicate!");
+      }
+      predicate = child;
+    } else if (IsEmbeddedModel(child)) {
+      FailAt(child, KestrelException::kUnsupported,
+             Narrow(child->getTagName()) + " in <Node>: Not supported!");
+    } else if (!IsExtension(child) && !ElementIs(child, Tags::XML_ELE_PARTITION)) {
+      FailAt(child, KestrelException::kStructure, Narrow(child->getTagName()) + ": Invalid element!");
+    }
+  }
+  if (predicate == nullptr) {
+    FailAt(element, KestrelException::kMissingElement, "<Node> has no predicate!");
+  }
+  return predicate;
+}
+
+[[noreturn]] void FailOnMissing(const DOMElement* element, const char* what, const TreeOptions& options) {
+  FailAt(element, KestrelException::kMissingElement,
+         std::string(what) + " is required for missingValueStrategy " + options.GetStrategyText() + "!");
+}
+
+}  // namespace
+
+void NodeReader::Read(DOMElement* root) {
+  struct OpenElement {
+    DOMElement* element;
+    int node;
+  };
+  std::vector<OpenElement> open;
+  DOMElement* element = root;
+  while (element != nullptr) {
+    open.push_back({element, OpenNode(element)});
+    element = FirstChild(element, Tags::XML_ELE_NODE);
+    while (element == nullptr && !open.empty()) {
+      const OpenElement done = open.back();
+      open.pop_back();
+      CloseNode(done.element, done.node);
+      if (!open.empty()) element = NextSibling(done.element, Tags::XML_ELE_NODE);
+    }
+  }
+  tree_.conditions.Seal();
+  tree_.scores.Seal();
+}
+
+int NodeReader::OpenNode(DOMElement* element) {
+  const Condition condition = CompilePredicate(element, FindPredicate(element));
+  NodeScores::Node node;
+  const std::string id = AttributeText(element, Tags::XML_VAL_NAME_ID);
+  node.id = id;
+  node.record_count = ReadRecordCount(element);
+  shares_.clear();
+  if (tree_.options.is_classification) {
+    ReadDistribution(element, node);
+    const XMLCh* score = FindAttribute(element, Tags::XML_ATT_SCORE);
+    if (score != nullptr) node.winner = tree_.categories.Find(element, Narrow(score));
+  } else {
+    node.number = ReadNumber(element, Tags::XML_ATT_SCORE);
+  }
+  tree_.scores.Add(node, shares_);
+  return tree_.table.Open(condition);
+}
+
+Condition NodeReader::CompilePredicate(DOMElement* element, DOMElement* predicate) {
+  const std::unique_ptr<ScorePredicate> object = ReadPredicate(predicate, dictionary_);
+  try {
+    return tree_.conditions.Compile(object.get(), inputs_);
+  } catch (const KestrelException& fault) {
+    FailAt(predicate != nullptr ? predicate : element,
+           static_cast<KestrelException::ExceptionCode>(fault.GetErrorCode()), fault.GetErrorMessage());
+  }
+}
+
+// The winner is the category with the most records, the first among equals.
+void NodeReader::ReadDistribution(DOMElement* element, NodeScores::Node& node) {
+  PMMLTranslator::SetLeafNodeStats(element, stats_);
+  if (stats_.empty()) return;
+  double total = 0.0;
+  bool has_probabilities = true;
+  for (const LeafNodeStats& entry : stats_) {
+    total += entry.record_count;
+    has_probabilities &= entry.probability != kNoNumber;
+  }
+  double most = -1.0;
+  for (const LeafNodeStats& entry : stats_) {
+    const double share = total > 0.0 ? entry.record_count / total : 0.0;
+    const double probability = has_probabilities ? entry.probability : share;
+    const double confidence = entry.confidence != kNoNumber ? entry.confidence : probability;
+    const int category = tree_.categories.Find(element, entry.value);
+    shares_.push_back({category, entry.record_count, probability, confidence});
+    if (entry.record_count > most) {
+      most = entry.record_count;
+      node.winner = category;
+    }
+  }
+  if (node.record_count == kNoNumber) node.record_count = total;
+  SortDistribution(element);
+}
+
+void NodeReader::SortDistribution(const DOMElement* element) {
+  std::sort(shares_.begin(), shares_.end(),
+            [](const CategoryShare& a, const CategoryShare& b) { return a.category < b.category; });
+  const auto same = std::adjacent_find(
+      shares_.begin(), shares_.end(),
+      [](const CategoryShare& a, const CategoryShare& b) { return a.category == b.category; });
+  if (same == shares_.end()) return;
+  FailAt(element, KestrelException::kInvalidValue,
+         tree_.categories.Get(same->category).GetString() + ": Duplicated Category Value!");
+}
+
+void NodeReader::CloseNode(DOMElement* element, int node) {
+  tree_.table.Close(node);
+  const TreeOptions& options = tree_.options;
+  if (Tree::NeedsRecordCounts(options) && tree_.scores.GetRecordCount(node) == kNoNumber && node != 0) {
+    FailOnMissing(element, "recordCount", options);
+  }
+  if (tree_.table.IsLeaf(node)) {
+    CheckLeaf(element, node);
+  } else if (options.strategy == MissingValueStrategy::kDefaultChild) {
+    FindDefaultChild(element, node);
+  }
+}
+
+void NodeReader::CheckLeaf(const DOMElement* element, int node) const {
+  if (!tree_.scores.HasScore(node)) {
+    FailAt(element, KestrelException::kMissingElement, "<Node> without children has no score!");
+  }
+  const TreeOptions& options = tree_.options;
+  if (options.strategy == MissingValueStrategy::kAggregateNodes && options.is_classification &&
+      !tree_.scores.HasDistribution(node)) {
+    FailOnMissing(element, "ScoreDistribution", options);
+  }
+}
+
+void NodeReader::FindDefaultChild(const DOMElement* element, int node) {
+  const std::string wanted = AttributeText(element, Tags::XML_ATT_DEFAULTCHILD);
+  if (wanted.empty()) FailOnMissing(element, "defaultChild", tree_.options);
+  const TreeTable& table = tree_.table;
+  for (int child = table.FirstChild(node); child != table.NodeAfter(node); child = table.NodeAfter(child)) {
+    if (tree_.scores.GetId(child) != wanted) continue;
+    tree_.scores.SetDefaultChild(node, child);
+    return;
+  }
+  FailAt(element, KestrelException::kInvalidDocument, "invalid defaultChild -- " + wanted);
+}
+
+}  // namespace MCKestrel_800

@@ -1,0 +1,177 @@
+#include "plugins/tree/TreeModel.h"
+
+#include <algorithm>
+#include <charconv>
+#include <ostream>
+#include <utility>
+
+#include "kestrel/dictionary/ScoreDictionary.h"
+#include "kestrel/foundation/NumberText.h"
+#include "kestrel/model/ResultEntities.h"
+#include "kestrel/model/Results.h"
+#include "kestrel/translate/PMMLModelTags.h"
+#include "plugins/support/ScoringStatus.h"
+
+namespace MCKestrel_800 {
+
+using MCScore::MCStatus;
+
+TreeModel::TreeModel(std::unique_ptr<ScoreDictionary> dictionary, MiningSchema schema,
+                     const std::string& target, std::unique_ptr<Tree> tree)
+    : schema_(std::move(schema)), tree_(std::move(tree)), walker_(*tree_) {
+  SetScoreDictionary(dictionary.release());
+  schema_.SetRoles(*this);
+  if (!target.empty()) SetVarRole(target, kTarget);
+}
+
+TreeModel::~TreeModel() = default;
+
+MCStatus TreeModel::Score(const ScoreCaseRecord* record, ScoreResult* result) {
+  if (record == nullptr || result == nullptr) return MCStatus(kNullArgumentStatus, false);
+  if ((tree_->inputs.Fill(*record) & CaseVector::kInvalidInput) != 0) {
+    result->Reset();
+    MCStatus status(kInvalidValueStatus, false);
+    status.SetDiscreteDatum(0, tree_->inputs.GetInvalidField());
+    return status;
+  }
+  return ScoreVector(tree_->inputs.GetValues(), result);
+}
+
+MCStatus TreeModel::ScoreVector(const double* values, ScoreResult* result) {
+  result->Reset();
+  switch (Walk(values, result)) {
+    case TreeWalker::End::kNode:
+      Predict(*result);
+      return MCStatus();
+    case TreeWalker::End::kSeveral:
+      PredictTogether(*result);
+      return MCStatus();
+    default:
+      break;
+  }
+  if (GetMissingValuePolicy() == kDefaultPrediction) return HandleMissingValue(result);
+  return MCStatus(kNoPredictionStatus, false);
+}
+
+TreeWalker::End TreeModel::Walk(const double* values, ScoreResult* result) {
+  ResultEntities* const entities = ResultEntities::Of(result);
+  const bool has_path = entities != nullptr && entities->IsPathWanted();
+  const TreeWalker::End end = has_path ? walker_.WalkAndNotePath(values) : walker_.Walk(values);
+  if (entities != nullptr) NameEntities(end, has_path, *entities);
+  return end;
+}
+
+void TreeModel::NameEntities(TreeWalker::End end, bool has_path, ResultEntities& entities) {
+  if (has_path) {
+    for (const int node : walker_.GetPath()) {
+      NameNode(node);
+      entities.AddToPath(name_);
+    }
+  }
+  if (end != TreeWalker::End::kNode) return;
+  const std::string_view id = tree_->scores.GetId(walker_.GetNode());
+  if (!id.empty()) return entities.SetDecidingId(id);
+  NameNode(walker_.GetNode());
+  entities.SetDecidingId(name_);
+}
+
+void TreeModel::NameNode(int node) {
+  name_ = tree_->scores.GetId(node);
+  if (!name_.empty()) return;
+  char digits[16];
+  const auto [end, failure] = std::to_chars(std::begin(digits), std::end(digits), node + 1);
+  static_cast<void>(failure);
+  name_.assign(1, '#').append(digits, end);
+}
+
+double TreeModel::Penalize(double confidence) const {
+  for (int i = 0; i < walker_.GetSubstitutions(); ++i)
+    confidence *= tree_->options.penalty;
+  return confidence;
+}
+
+void TreeModel::Predict(ScoreResult& result) {
+  const NodeScores& scores = tree_->scores;
+  const int node = walker_.GetNode();
+  if (!tree_->options.is_classification) {
+    prediction_.SetDoubleValue(scores.GetNumber(node));
+    result.SetPrediction(&prediction_);
+    return;
+  }
+  const int winner = scores.GetWinner(node);
+  result.SetPrediction(&tree_->categories.Get(winner));
+  const CategoryShare* share = scores.FirstShare(node);
+  const CategoryShare* const end = scores.EndOfShares(node);
+  const bool has_distribution = share != end;
+  // Kind 0 is what MakeResult gives; another kind has no place for the single categories.
+  auto* const classification = result.GetResultKind() == 0 ? static_cast<ScoreClsResult*>(&result) : nullptr;
+  double confidence = has_distribution ? 0.0 : 1.0;
+  for (int category = 0; category < tree_->categories.GetCount(); ++category) {
+    double probability = !has_distribution && category == winner ? 1.0 : 0.0;
+    if (share != end && share->category == category) {
+      probability = share->probability;
+      if (category == winner) confidence = share->confidence;
+      ++share;
+    }
+    if (classification != nullptr)
+      classification->AddCategoryProbability(&tree_->categories.Get(category), probability);
+  }
+  result.SetProbability(Penalize(confidence));
+}
+
+void TreeModel::PredictTogether(ScoreResult& result) {
+  const std::vector<double>& votes = walker_.GetVotes();
+  if (!tree_->options.is_classification) {
+    prediction_.SetDoubleValue(votes[0]);
+    result.SetPrediction(&prediction_);
+    return;
+  }
+  const auto winner = static_cast<int>(std::max_element(votes.begin(), votes.end()) - votes.begin());
+  result.SetPrediction(&tree_->categories.Get(winner));
+  result.SetProbability(Penalize(votes[static_cast<std::size_t>(winner)]));
+  if (result.GetResultKind() != 0) return;
+  auto& classification = static_cast<ScoreClsResult&>(result);
+  for (int category = 0; category < tree_->categories.GetCount(); ++category) {
+    classification.AddCategoryProbability(&tree_->categories.Get(category),
+                                          votes[static_cast<std::size_t>(category)]);
+  }
+}
+
+std::vector<const ScoreDictVar*> TreeModel::GetPredictors() const {
+  std::vector<const ScoreDictVar*> variables;
+  for (const MiningField* field : tree_->inputs.GetFields())
+    variables.push_back(field->variable);
+  return variables;
+}
+
+ScoreResult* TreeModel::MakeResult() const {
+  if (tree_->options.is_classification) return new ClsResult;
+  return new RegResult;
+}
+
+std::string TreeModel::GetModelKind() const {
+  return PMMLModelTags::XML_ELE_TREEMODEL;
+}
+
+bool TreeModel::SuppressCategoryProbabilities() const {
+  return false;
+}
+
+void TreeModel::Display(std::ostream& out) const {
+  const TreeOptions& options = tree_->options;
+  int leaves = 0;
+  for (int node = 0; node < tree_->table.GetCount(); ++node)
+    leaves += tree_->table.IsLeaf(node) ? 1 : 0;
+  out << "Start TreeModel Display:\n";
+  out << "Function = " << (options.is_classification ? "classification" : "regression");
+  if (!GetTargetName().empty()) out << "; Target = " << GetTargetName();
+  out << "\nMissing value strategy = " << options.GetStrategyText()
+      << "; Penalty = " << FormatSixDigits(options.penalty) << "; No true child = "
+      << (options.returns_last_prediction ? PMMLModelTags::XML_VAL_RETURNLASTPREDICTION
+                                          : PMMLModelTags::XML_VAL_RETURNNULLPREDICTION)
+      << "\nNodes = " << tree_->table.GetCount() << "; Leaves = " << leaves
+      << "; Levels = " << tree_->table.GetDepth() << "\n";
+  out << "End of TreeModel Display.\n\n";
+}
+
+}  // namespace MCKestrel_800

@@ -1,0 +1,34 @@
+#include "plugins/tree/TreeTranslator.h"
+
+#include <xercesc/dom/DOMElement.hpp>
+
+#include <utility>
+
+#include "kestrel/dictionary/ScoreDictionary.h"
+#include "kestrel/translate/PMMLModelTags.h"
+#include "plugins/support/PredicateInputs.h"
+#include "plugins/tree/NodeReader.h"
+#include "plugins/tree/TreeModel.h"
+
+namespace MCKestrel_800 {
+
+TreeTranslator::TreeTranslator() : ModelTranslator(PMMLModelTags::XML_ELE_TREEMODEL) {}
+
+std::unique_ptr<ScoreModel> TreeTranslator::BuildModel(xercesc::DOMElement* element,
+                                                       std::unique_ptr<ScoreDictionary> dictionary) {
+  ModelFrame frame = ReadFrame(element, *dictionary);
+  TreeOptions options;
+  options.is_classification = frame.is_classification;
+  options.Read(element);
+  auto tree = std::make_unique<Tree>(options, frame.target_variable);
+  PredicateInputs inputs(frame.schema, *dictionary, tree->inputs);
+  auto* const root =
+      static_cast<xercesc::DOMElement*>(GetChildByTagForced(element, PMMLModelTags::XML_ELE_NODE));
+  NodeReader(*dictionary, inputs, *tree).Read(root);
+  tree->inputs.Seal();
+  tree->table.Seal(tree->inputs);
+  return std::make_unique<TreeModel>(std::move(dictionary), std::move(frame.schema), frame.target,
+                                     std::move(tree));
+}
+
+}  // namespace MCKestrel_800
