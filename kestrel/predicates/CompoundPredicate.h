@@ -15,10 +15,10 @@ namespace MCKestrel_800 {
 ///   or         the first true child makes it true; else unknown if a child was unknown, else false
 ///   and        the first false child makes it false; else unknown if a child was unknown, else true
 ///   xor        the first unknown child makes it unknown; else true for an odd number of true children
-///   surrogate  the first child that is not unknown decides; when that is a later one that is true, the
-///   result
-///              is PredSurrogateTrue; unknown when all are
-/// PredSurrogateTrue of a child is not "true" to or and xor, and not "false" to and.
+///   surrogate  the first child that is not unknown decides; when that is true and not the first of the
+///              list, the result is PredSurrogateTrue; unknown when all children are
+/// PredSurrogateTrue of a child is not "true" to or and xor, and not "false" to and. Any other operator value
+/// is PredUnknown.
 class KESTREL_API CompoundPredicate : public ScorePredicate {
  public:
   /// A list of surrogates.
@@ -40,11 +40,12 @@ class KESTREL_API CompoundPredicate : public ScorePredicate {
   const ScoreSplitVar* GetSplit() const override;
   void Display(std::ostream& out) const override;
 
-  /// Appends a child, which the compound owns from then on.
+  /// Appends a child, which the compound owns from then on. Null is refused: nothing happens.
   void AddPredicate(ScorePredicate* child);
   /// Takes the first child with that address out of the list; it is the caller's from then on. False when it
   /// is not there.
   bool RemovePredicate(ScorePredicate* child);
+  /// The children, none of them null; whoever changes the list keeps it so.
   const std::vector<ScorePredicate*>& GetPredicates() const;
   std::vector<ScorePredicate*>& GetPredicates();
   int GetCount() const;

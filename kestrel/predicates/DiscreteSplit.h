@@ -36,7 +36,7 @@ class KESTREL_API DiscreteSplit : public ScoreSplitVar {
   /// Shows the values; the codes are not shown.
   void Display(std::ostream& out) const override;
 
-  /// Appends a value, which the split owns from then on.
+  /// Appends a value, which the split owns from then on. Null is refused: nothing happens.
   void PutSplit(ScoreValue* value, int child);
   /// Adds a code; one that is there already keeps its child.
   void PutSplit(double code, int child);

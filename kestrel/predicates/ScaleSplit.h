@@ -34,7 +34,7 @@ class KESTREL_API ScaleSplit : public ScoreSplitVar {
   int GetSplitChildIndex(const ScoreValue* value) const override;
   void Display(std::ostream& out) const override;
 
-  /// Appends a range, which the split owns from then on.
+  /// Appends a range, which the split owns from then on. Null is refused: nothing happens.
   void PutSplit(ScoreValueRange* range, int child);
 
   /// The first range, or the first of a child; null when there is none. They belong to the split.

@@ -39,9 +39,8 @@ class KESTREL_API ScorePredicate {
   /// A new deep copy that the caller owns.
   virtual ScorePredicate* Clone() const = 0;
   virtual PredicateResult Evaluate(const std::vector<double>& values) const = 0;
-  /// derivedRecord  the values of derived variables; may be null, and then derived variables are looked for
-  /// in
-  ///                `record`, too. A null record holds nothing.
+  /// Values are found by the name of the predicate's variable. Those of derived variables are looked for in
+  /// `derivedRecord`, or, when that is null, in `record` like all others. A null record holds nothing.
   virtual PredicateResult Evaluate(const ScoreCaseRecord* record,
                                    const ScoreCaseRecord* derivedRecord) const = 0;
   virtual PredicateType GetPredType() const = 0;

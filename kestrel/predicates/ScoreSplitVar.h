@@ -33,7 +33,7 @@ class KESTREL_API ScoreSplitVar {
   /// The child that missing values go to; -1, the default, for none.
   virtual void SetMissvalMap(int child);
   virtual const ScoreDictVar* GetSplitVar() const;
-  /// These four ask the variable, which must be set.
+  /// The variable's name, label, type and level; without a variable the texts are empty and the numbers -1.
   virtual std::string GetSplitName() const;
   virtual std::string GetSplitLabel() const;
   /// The variable's `VariableType`.

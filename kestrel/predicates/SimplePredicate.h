@@ -4,7 +4,6 @@
 #define KESTREL_PREDICATES_SIMPLEPREDICATE_H
 
 #include <iosfwd>
-#include <memory>
 #include <string>
 #include <vector>
 
@@ -60,8 +59,8 @@ class KESTREL_API SimplePredicate : public ScorePredicate {
   void SetPredicateOperator(const std::string& text);
   SimplePredOperator GetPredicateOperator() const;
   /// Keeps the text and its number: the category code where the split's variable has an encoder (which
-  /// registers a new text), else what the variable's own conversion gives. The split must be set, with its
-  /// variable.
+  /// registers a new text), else what the variable's own conversion gives. The split and its variable must
+  /// be set before; without them the text alone is kept.
   void SetPredicateValue(const std::string& text);
   /// The system-missing value until one is set.
   double GetPredValueByDouble() const;
