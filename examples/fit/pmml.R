@@ -1,4 +1,4 @@
-# Writes a PMML 4.4 RegressionModel and the tables that go with an example.
+# Writes a PMML 4.4 document and the tables that go with an example. tree.R has what trees need beyond that.
 
 # Reads back to the same double: 15 significant digits where they do, else 17.
 number <- function(x) {
@@ -36,19 +36,25 @@ mining_field <- function(name, replacement = NULL) {
     quoted(if (is_number) number(replacement) else replacement), if (is_number) "asMean" else "asMode")
 }
 
-# fields: lines of DataField elements; count: how many fields they are; replacements: by the inputs' names.
-write_model <- function(path, name, fields, count, inputs, target, normalization, tables, func, replacements = list()) {
-  writeLines(c(
-    "<?xml version=\"1.0\" encoding=\"UTF-8\"?>",
-    "<PMML xmlns=\"http://www.dmg.org/PMML-4_4\" version=\"4.4\">",
-    sprintf("  <Header description=%s/>", quoted(name)),
-    sprintf("  <DataDictionary numberOfFields=\"%d\">", count), fields, "  </DataDictionary>",
+mining_schema <- function(inputs, target, replacements = list()) c(
+  "    <MiningSchema>",
+  vapply(inputs, function(input) mining_field(input, replacements[[input]]), ""),
+  sprintf("      <MiningField name=%s usageType=\"target\"/>", quoted(target)),
+  "    </MiningSchema>")
+
+# fields: lines of DataField elements; count: how many fields they are; model: lines of the model element.
+write_document <- function(path, name, fields, count, model) writeLines(c(
+  "<?xml version=\"1.0\" encoding=\"UTF-8\"?>",
+  "<PMML xmlns=\"http://www.dmg.org/PMML-4_4\" version=\"4.4\">",
+  sprintf("  <Header description=%s/>", quoted(name)),
+  sprintf("  <DataDictionary numberOfFields=\"%d\">", count), fields, "  </DataDictionary>",
+  model, "</PMML>"), path)
+
+# replacements: by the inputs' names.
+write_model <- function(path, name, fields, count, inputs, target, normalization, tables, func, replacements = list())
+  write_document(path, name, fields, count, c(
     sprintf("  <RegressionModel modelName=%s functionName=\"%s\" normalizationMethod=\"%s\">", quoted(name), func, normalization),
-    "    <MiningSchema>",
-    vapply(inputs, function(input) mining_field(input, replacements[[input]]), ""),
-    sprintf("      <MiningField name=%s usageType=\"target\"/>", quoted(target)),
-    "    </MiningSchema>", tables, "  </RegressionModel>", "</PMML>"), path)
-}
+    mining_schema(inputs, target, replacements), tables, "  </RegressionModel>"))
 
 # Missing cells are empty.
 cells_of <- function(column) {

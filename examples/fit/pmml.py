@@ -1,4 +1,4 @@
-"""Writes a PMML 4.4 RegressionModel and the tables that go with an example: data.csv and expected.csv.
+"""Writes a PMML 4.4 model and the tables that go with an example: data.csv and expected.csv.
 
 Numbers are written with repr(), the shortest text that reads back to the same double.
 """
@@ -7,19 +7,14 @@ import os
 from xml.sax.saxutils import quoteattr
 
 
-class Model:
-    """A regression model to be written: fields, target and one table per equation."""
+class Document:
+    """A model of one kind: the inputs, all continuous, and the target."""
 
-    def __init__(self, name, inputs, target, categories=None, normalization="none"):
+    def __init__(self, name, inputs, target, categories=None):
         self.name = name
         self.inputs = inputs  # names of the continuous inputs
         self.target = target
         self.categories = categories  # None for regression
-        self.normalization = normalization
-        self.tables = []  # (target category or None, intercept, coefficients)
-
-    def add_table(self, intercept, coefficients, category=None):
-        self.tables.append((category, float(intercept), [float(c) for c in coefficients]))
 
     def write(self, path):
         with open(path, "w", encoding="utf-8", newline="\n") as out:
@@ -40,14 +35,35 @@ class Model:
                 yield f'      <Value value={quoteattr(category)}/>'
             yield "    </DataField>"
         yield "  </DataDictionary>"
-        function = "regression" if self.categories is None else "classification"
-        yield (f'  <RegressionModel modelName={quoteattr(self.name)} functionName="{function}" '
-               f'normalizationMethod="{self.normalization}">')
+        yield from self.model_lines()
+        yield "</PMML>"
+
+    def function(self):
+        return "regression" if self.categories is None else "classification"
+
+    def mining_schema_lines(self):
         yield "    <MiningSchema>"
         for name in self.inputs:
             yield f'      <MiningField name={quoteattr(name)}/>'
         yield f'      <MiningField name={quoteattr(self.target)} usageType="target"/>'
         yield "    </MiningSchema>"
+
+
+class Model(Document):
+    """A regression model to be written: fields, target and one table per equation."""
+
+    def __init__(self, name, inputs, target, categories=None, normalization="none"):
+        super().__init__(name, inputs, target, categories)
+        self.normalization = normalization
+        self.tables = []  # (target category or None, intercept, coefficients)
+
+    def add_table(self, intercept, coefficients, category=None):
+        self.tables.append((category, float(intercept), [float(c) for c in coefficients]))
+
+    def model_lines(self):
+        yield (f'  <RegressionModel modelName={quoteattr(self.name)} functionName="{self.function()}" '
+               f'normalizationMethod="{self.normalization}">')
+        yield from self.mining_schema_lines()
         for category, intercept, coefficients in self.tables:
             target = "" if category is None else f" targetCategory={quoteattr(category)}"
             if not coefficients:
@@ -58,7 +74,36 @@ class Model:
                 yield f'      <NumericPredictor name={quoteattr(name)} coefficient="{coefficient!r}"/>'
             yield "    </RegressionTable>"
         yield "  </RegressionModel>"
-        yield "</PMML>"
+
+
+class RegressionTree(Document):
+    """A binary tree that scikit-learn fitted; its nodes are called by scikit-learn's numbers."""
+
+    def __init__(self, name, inputs, target, fitted):
+        super().__init__(name, inputs, target)
+        self.tree = fitted.tree_
+
+    def model_lines(self):
+        yield (f'  <TreeModel modelName={quoteattr(self.name)} functionName="{self.function()}" '
+               'splitCharacteristic="binarySplit">')
+        yield from self.mining_schema_lines()
+        yield from self.node_lines(0, "<True/>", "    ")
+        yield "  </TreeModel>"
+
+    def node_lines(self, node, predicate, indent):
+        tree = self.tree
+        yield (f'{indent}<Node id="{node}" score="{float(tree.value[node, 0, 0])!r}" '
+               f'recordCount="{tree.n_node_samples[node]}">')
+        yield f"{indent}  {predicate}"
+        left, right = tree.children_left[node], tree.children_right[node]
+        if left >= 0:
+            yield from self.node_lines(left, self.predicate(node, "lessOrEqual"), indent + "  ")
+            yield from self.node_lines(right, self.predicate(node, "greaterThan"), indent + "  ")
+        yield f"{indent}</Node>"
+
+    def predicate(self, node, operator):
+        name, threshold = self.inputs[self.tree.feature[node]], float(self.tree.threshold[node])
+        return f'<SimplePredicate field={quoteattr(name)} operator="{operator}" value="{threshold!r}"/>'
 
 
 def write_table(path, header, rows):
