@@ -1,4 +1,4 @@
-# Writes a PMML 4.4 document and the tables that go with an example. tree.R has what trees need beyond that.
+# Writes a PMML 4.4 document, a RegressionModel above all, and the tables that go with an example.
 
 # Reads back to the same double: 15 significant digits where they do, else 17.
 number <- function(x) {
