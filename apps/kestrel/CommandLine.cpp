@@ -33,9 +33,11 @@ constexpr const char* kScoreHelp =
     "  prediction              the predicted number or category\n"
     "  probability             of the predicted category (classifications)\n"
     "  probability_<category>  of each category that the target lists, in its order (classifications)\n"
-    "A case without prediction has empty cells (null in jsonl). A name that a kept column has already gets "
-    "\"_2\"\n"
-    "behind it. A file that is written appears when it is complete, not before.\n";
+    "  explanation             with --explain: the nodes that the case passed, or the rules that fired\n"
+    "A case without prediction has empty cells (null in jsonl), but is explained as far as it came. A name "
+    "that a\n"
+    "kept column has already gets \"_2\" behind it. A file that is written appears when it is complete, not "
+    "before.\n";
 
 /// Shows an option that may have a value behind "=" as such; the parser's own way shows its stand-in for no
 /// value.
@@ -58,6 +60,7 @@ struct Values {
   std::string on_error = "stop";
   std::vector<std::string> keep;
   std::vector<std::string> missing;
+  bool explains = false;
   bool shows_statistics = false;
   bool as_json = false;
 };
@@ -133,6 +136,8 @@ void AddScore(CLI::App& program, Values& values) {
           "empty and go on")
       ->check(CLI::IsMember({"stop", "null"}))
       ->type_name("WHAT");
+  command.add_flag("--explain", values.explains,
+                   "Tell which nodes of a tree, or rules of a rule set, led to each prediction");
   command.add_flag("--stats", values.shows_statistics,
                    "Tell in the end how many cases there were and how fast it went");
   command.footer(std::string(kScoreHelp) + "\n" + kExitCodesHelp);
@@ -192,6 +197,7 @@ ExitCode RunScore(const Values& values) {
   options.missing = values.missing;
   options.goes_on_after_faults = values.on_error == "null";
   options.format = FormatOf(values);
+  options.explains = values.explains;
   options.shows_statistics = values.shows_statistics;
   return Score(options);
 }

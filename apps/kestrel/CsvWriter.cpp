@@ -64,6 +64,14 @@ void CsvWriter::AddMissing() {
   if (columns_.size() == 1) out_.append("\"\"");
 }
 
+// Joined before they are written, since one of them may need quotation marks around all.
+void CsvWriter::AddList(const std::vector<std::string_view>& texts) {
+  joined_.clear();
+  for (std::size_t i = 0; i < texts.size(); ++i)
+    joined_.append(i == 0 ? "" : " > ").append(texts[i]);
+  AddText(joined_);
+}
+
 void CsvWriter::EndRow() {
   out_.push_back('\n');
   at_start_ = true;

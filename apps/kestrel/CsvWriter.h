@@ -23,6 +23,7 @@ class CsvWriter : public TableWriter {
   void AddText(std::string_view text) override;
   void AddNumber(double number) override;
   void AddMissing() override;
+  void AddList(const std::vector<std::string_view>& texts) override;
   void EndRow() override;
 
  private:
@@ -33,6 +34,7 @@ class CsvWriter : public TableWriter {
 
   std::vector<std::string> columns_;
   std::string& out_;
+  std::string joined_;  ///< the list being written
   NumberTexts numbers_;
   bool at_start_ = true;
 };

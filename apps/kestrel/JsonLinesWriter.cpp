@@ -51,6 +51,16 @@ void JsonLinesWriter::AddMissing() {
   out_.append("null");
 }
 
+void JsonLinesWriter::AddList(const std::vector<std::string_view>& texts) {
+  out_.append(keys_[next_++]);
+  out_.push_back('[');
+  for (std::size_t i = 0; i < texts.size(); ++i) {
+    if (i > 0) out_.push_back(',');
+    AppendQuoted(texts[i], out_);
+  }
+  out_.push_back(']');
+}
+
 void JsonLinesWriter::EndRow() {
   out_.append("}\n");
   next_ = 0;

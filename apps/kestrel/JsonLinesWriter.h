@@ -23,6 +23,7 @@ class JsonLinesWriter : public TableWriter {
   void AddText(std::string_view text) override;
   void AddNumber(double number) override;
   void AddMissing() override;
+  void AddList(const std::vector<std::string_view>& texts) override;
   void EndRow() override;
 
  private:

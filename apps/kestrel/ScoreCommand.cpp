@@ -6,6 +6,7 @@
 #include <optional>
 
 #include "apps/kestrel/CaseReader.h"
+#include "apps/kestrel/ExplanationColumn.h"
 #include "apps/kestrel/InputFile.h"
 #include "apps/kestrel/KeptColumns.h"
 #include "apps/kestrel/LoadedModel.h"
@@ -75,7 +76,12 @@ class ScoreRun {
         input_(options.data),
         table_(input_, options.delimiter),
         cases_(table_, predictors_, options.missing),
-        predictions_(*model_) {}
+        predictions_(*model_),
+        added_(predictions_.GetNames()) {
+    if (!options.explains) return;
+    explanation_.emplace(predictions_.GetResult());
+    added_.push_back(ExplanationColumn::kName);
+  }
 
   ExitCode Run() {
     ChooseColumns();
@@ -108,9 +114,9 @@ class ScoreRun {
     std::vector<std::string> kept_names;
     for (const std::size_t column : kept_)
       kept_names.push_back(table_.GetHeader()[column]);
-    const std::vector<std::string> names = NameOutputColumns(kept_names, predictions_.GetNames());
-    for (std::size_t i = 0; i < predictions_.GetNames().size(); ++i) {
-      const std::string& wanted = predictions_.GetNames()[i];
+    const std::vector<std::string> names = NameOutputColumns(kept_names, added_);
+    for (std::size_t i = 0; i < added_.size(); ++i) {
+      const std::string& wanted = added_[i];
       const std::string& given = names[kept_names.size() + i];
       if (given != wanted) {
         Say("the table has a column " + ShownText(wanted) + "; the model's is called " + ShownText(given));
@@ -128,6 +134,7 @@ class ScoreRun {
 
   void ScoreRow(const TableRow& row) {
     std::optional<MCStatus> status;
+    if (explanation_.has_value()) explanation_->BeginCase();
     if (cases_.Read(row, fault_)) status = model_->Score(&cases_.GetRecord(), predictions_.GetResult());
     const bool is_scored = status.has_value() && !status->IsError();
     if (!is_scored) {
@@ -140,6 +147,7 @@ class ScoreRun {
     } else {
       predictions_.WriteMissing(*writer_);
     }
+    if (explanation_.has_value()) WriteExplanation(is_scored);
     writer_->EndRow();
   }
 
@@ -155,6 +163,17 @@ class ScoreRun {
         writer_->AddText(cell);
       }
     }
+  }
+
+  /// A model that has nothing to tell would leave the user to wonder about an empty column.
+  void WriteExplanation(bool is_scored) {
+    if (is_scored && !any_is_scored_ && !explanation_->HasPath()) {
+      Say("the first scored case has no explanation: no node of a tree and no rule led to it (the model is "
+          "a " +
+          ShownText(model_->GetModelKind()) + ")");
+    }
+    any_is_scored_ = any_is_scored_ || is_scored;
+    explanation_->Write(*writer_);
   }
 
   /// Puts into words why the model did not score the row.
@@ -217,6 +236,9 @@ class ScoreRun {
   TableReader table_;
   CaseReader cases_;
   PredictionColumns predictions_;
+  std::optional<ExplanationColumn> explanation_;
+  std::vector<std::string> added_;  ///< the names of the columns behind the kept ones
+  bool any_is_scored_ = false;
   std::vector<std::size_t> kept_;
   std::vector<bool> kept_as_number_;
   std::unique_ptr<TableWriter> writer_;

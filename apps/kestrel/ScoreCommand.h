@@ -22,6 +22,7 @@ struct ScoreOptions {
   std::vector<std::string> missing;  ///< what stands for a missing value beside the empty cell
   bool goes_on_after_faults = false;
   TableWriter::Format format = TableWriter::Format::kCsv;
+  bool explains = false;  ///< tells which parts of the model led to each prediction
   bool shows_statistics = false;
 };
 

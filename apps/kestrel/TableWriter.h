@@ -29,6 +29,8 @@ class TableWriter {
   /// The shortest text that reads back to the same number.
   virtual void AddNumber(double number) = 0;
   virtual void AddMissing() = 0;
+  /// One cell for several texts: with " > " between them where a cell can only be a text.
+  virtual void AddList(const std::vector<std::string_view>& texts) = 0;
   virtual void EndRow() = 0;
 };
 

@@ -37,7 +37,7 @@ TEST(KestrelCommandLine, HelpOfScoreTellsOfEveryOption) {
   const std::string help = RunKestrel({"score", "--help"}).output;
   for (const char* word : {"MODEL", "DATA", "-o,--output", "--models", "--delimiter", "--format",
                            "{csv,jsonl}", "--keep[=NAME,...]", "--missing", "--on-error", "{stop,null}",
-                           "--stats", "--version", "probability_<category>"}) {
+                           "--explain", "--stats", "--version", "probability_<category>", "explanation"}) {
     EXPECT_NE(help.find(word), std::string::npos) << word;
   }
 }

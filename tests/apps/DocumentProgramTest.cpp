@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <nlohmann/json.hpp>
+#include <set>
 
 #include "apps/kestrel/LoadedModel.h"
 #include "tests/apps/KestrelProgram.h"
@@ -15,6 +16,8 @@ TEST(KestrelCheck, SaysThatADocumentIsGood) {
   const std::pair<const char*, const char*> rows[] = {
       {"D/line.xml", "D/line.xml: good: RegressionModel with 1 input, target y\n"},
       {"D/inputs.xml", "D/inputs.xml: good: RegressionModel with 8 inputs, target y\n"},
+      {"D/tree.xml", "D/tree.xml: good: TreeModel with 2 inputs, target size\n"},
+      {"D/rules.xml", "D/rules.xml: good: RuleSetModel with 1 input, target y\n"},
   };
   for (const auto& [model, want] : rows) {
     const ProgramOutcome outcome = RunKestrel({"check", model});
@@ -124,8 +127,10 @@ TEST(KestrelModels, TakesTheNamesFromAFile) {
 }
 
 TEST(KestrelModels, SaysWhyAModelLibraryCannotBeLoaded) {
+  const std::set<std::string> left_out = {"RegressionModel", "RuleSetModel", "TreeModel",
+                                          "AssociationModelLattice"};
   for (const std::string& element : kestrel_program::StandardModelElements()) {
-    if (element == "RegressionModel" || element == "AssociationModelLattice") continue;
+    if (left_out.count(element) != 0) continue;
     const std::string document = Replaced(FileText(DataPath("line.xml")), "RegressionModel", element);
     const ProgramOutcome outcome = RunKestrel({"check", "-"}, document);
     EXPECT_EQ(outcome.exit_code, 3) << element;
@@ -196,6 +201,36 @@ TEST(KestrelDescribe, ShowsATable) {
       "  moment     dateTime             continuous  predictor                 -                -\n"
       "  days       dateDaysSince[1970]  continuous  predictor                 -                -\n"
       "  comment    text                 nominal     supplementary (not read)  -                -\n");
+}
+
+TEST(KestrelDescribe, ShowsEveryKindOfModel) {
+  const std::pair<const char*, const char*> rows[] = {
+      {"D/tree.xml",
+       "kind:    TreeModel\n"
+       "version: 4.4\n"
+       "target:\n"
+       "  name  type  level    role    missing values  categories\n"
+       "  size  text  nominal  target  -               small, large\n"
+       "inputs: 2\n"
+       "  name    type    level       role       missing values  categories\n"
+       "  x       number  continuous  predictor  -               -\n"
+       "  colour  text    nominal     predictor  -               red, gr\xC3\xBCn\n"},
+      {"D/rules.xml",
+       "kind:    RuleSetModel\n"
+       "version: 4.4\n"
+       "target:\n"
+       "  name  type    level       role    missing values  categories\n"
+       "  y     number  continuous  target  -               -\n"
+       "inputs: 1\n"
+       "  name  type    level       role       missing values  categories\n"
+       "  x     number  continuous  predictor  -               -\n"},
+  };
+  for (const auto& [model, want] : rows) {
+    const ProgramOutcome outcome = RunKestrel({"describe", model});
+    EXPECT_EQ(outcome.exit_code, 0) << outcome.errors;
+    EXPECT_EQ(outcome.output, want);
+    EXPECT_EQ(outcome.errors, "");
+  }
 }
 
 TEST(KestrelDescribe, WritesJson) {

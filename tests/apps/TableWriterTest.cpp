@@ -106,6 +106,43 @@ TEST(TableWriter, WritesRowsAsJsonLines) {
             "{\"a\":null,\"b\\\"c\":null,\"d\":\"y\"}\n");
 }
 
+struct ListRow {
+  const char* why;
+  std::vector<std::string_view> texts;
+  const char* csv;
+  const char* json;
+};
+
+const ListRow kLists[] = {
+    {"none", {}, "", "[]"},
+    {"one", {"n1"}, "n1", "[\"n1\"]"},
+    {"several", {"n1", "n2", "n3"}, "n1 > n2 > n3", "[\"n1\",\"n2\",\"n3\"]"},
+    {"one empty", {""}, "", "[\"\"]"},
+    {"empty between", {"a", "", "b"}, "a >  > b", "[\"a\",\"\",\"b\"]"},
+    {"empty at the ends need quotation marks", {"", ""}, "\" > \"", "[\"\",\"\"]"},
+    {"one has a comma", {"a", "b,c"}, "\"a > b,c\"", "[\"a\",\"b,c\"]"},
+    {"quotation mark", {"5\" pipe", "b"}, "\"5\"\" pipe > b\"", "[\"5\\\" pipe\",\"b\"]"},
+    {"line end", {"a\nb", "c"}, "\"a\nb > c\"", "[\"a\\nb\",\"c\"]"},
+    {"what stands between texts in one", {"a > b", "c"}, "a > b > c", "[\"a > b\",\"c\"]"},
+    {"not UTF-8", {"a\xFF"}, "a\xFF", "[\"a\xEF\xBF\xBD\"]"},
+};
+
+TEST(TableWriter, WritesLists) {
+  for (const ListRow& row : kLists) {
+    std::string csv, json;
+    const auto csv_writer = TableWriter::Make(TableWriter::Format::kCsv, {"t", "u"}, csv);
+    csv_writer->AddList(row.texts);
+    csv_writer->AddList(row.texts);
+    csv_writer->EndRow();
+    EXPECT_EQ(csv, std::string(row.csv) + "," + row.csv + "\n") << row.why;
+    const auto json_writer = TableWriter::Make(TableWriter::Format::kJsonLines, {"t", "u"}, json);
+    json_writer->AddList(row.texts);
+    json_writer->AddList(row.texts);
+    json_writer->EndRow();
+    EXPECT_EQ(json, "{\"t\":" + std::string(row.json) + ",\"u\":" + row.json + "}\n") << row.why;
+  }
+}
+
 TEST(TableWriter, KeepsAMissingCellOfOneColumnFromBeingABlankLine) {
   std::string out;
   const auto writer = TableWriter::Make(TableWriter::Format::kCsv, {"a"}, out);
