@@ -51,7 +51,8 @@ bool RuleSetModel::Decide(const double* values, ScoreResult& result) {
   }
   result.SetPrediction(&rule_set_.scores.Get(choice.score));
   if (!NumericValue::IsSystemMissingValue(choice.confidence)) result.SetProbability(choice.confidence);
-  if (ResultEntities* entities = ResultEntities::Of(&result)) TellRules(choice, values, *entities);
+  ResultEntities* const entities = ResultEntities::Of(&result);
+  if (entities != nullptr && entities->IsDecidingIdWanted()) TellRules(choice, values, *entities);
   if (definition_.frame.is_classification) TellCategories(choice, result);
   return true;
 }

@@ -31,8 +31,8 @@ class ResultEntities;
 /// set, has. Where there are none the predicted category stands alone, with the prediction's confidence, if
 /// there is one.
 ///
-/// The result's deciding entity is the rule; the default score has none. Its path, when wanted, are all rules
-/// that fire, also those that the criterion does not look at.
+/// The result's deciding entity, when wanted, is the rule; the default score has none. Its path, when wanted,
+/// are all rules that fire, also those that the criterion does not look at.
 class RuleSetModel : public BaseModel {
  public:
   /// What a document says, compiled.
