@@ -8,6 +8,12 @@
 
 namespace MCKestrel_800 {
 
+PredicateInputs::PredicateInputs(const MiningSchema& schema, ScoreDictionary& dictionary, CaseVector& inputs)
+    : schema_(schema), dictionary_(dictionary), inputs_(inputs) {
+  for (ScoreDictVar* variable : dictionary.GetScoreDictVars())
+    variable->SetEncodedValueIndex(-1);
+}
+
 int PredicateInputs::SlotOf(const ScoreDictVar& variable) {
   if (variable.GetEncodedValueIndex() >= 0) return variable.GetEncodedValueIndex();
   const MiningField* field = schema_.Find(variable.GetName());

@@ -15,9 +15,9 @@ class ScoreDictionary;
 /// value that is no category of a nominal field counts as missing here, as it does for predicates on records.
 class PredicateInputs {
  public:
-  /// All three must outlive this object; `dictionary` is the one that the schema was read with.
-  PredicateInputs(const MiningSchema& schema, ScoreDictionary& dictionary, CaseVector& inputs)
-      : schema_(schema), dictionary_(dictionary), inputs_(inputs) {}
+  /// All three must outlive this object; `dictionary` is the one that the schema was read with. Forgets the
+  /// indexes that its variables bring along: it may be a copy of another model's.
+  PredicateInputs(const MiningSchema& schema, ScoreDictionary& dictionary, CaseVector& inputs);
 
   /// Errors: code 8 for a variable that is no active field of the schema.
   int SlotOf(const ScoreDictVar& variable);
