@@ -40,7 +40,7 @@ OPPOSITES = {"lessThan": "greaterOrEqual", "lessOrEqual": "greaterThan", "equal"
 
 
 class NumberField:
-    """Values lie on its thresholds, half way between two, or beyond all of them. A room: the thresholds that are left."""
+    """Values lie on its thresholds, half way between two, or beyond them all. A room: the thresholds that are left."""
 
     def __init__(self, rng, name):
         self.name = name
@@ -218,9 +218,21 @@ class Document:
             rng.shuffle(parts)
         if operator in ("and", "or") and rng.random() < 0.15:
             parts.insert(rng.randrange(len(parts) + 1), ["<True/>"] if operator == "and" else ["<False/>"])
-        if rng.random() < 0.05:
-            parts = [test]
         return compound(operator, parts)
+
+    def with_surrogates(self, test):
+        """A test that others stand in for, often inside a compound, to which a true surrogate is less than true."""
+        rng = self.rng
+        parts = [self.real_atom() for _ in range(rng.choice([1, 1, 2, 3]))]
+        listed = compound("surrogate", [test] + parts)
+        chance = rng.random()
+        if chance < 0.5:
+            return listed
+        operator = rng.choice(["or", "and", "xor"])
+        if chance < 0.7:  # a compound of one, with a constant that is dropped or none
+            neutral = {"or": ["<False/>"], "and": ["<True/>"], "xor": []}[operator]
+            return compound(operator, rng.sample([neutral, listed], 2))
+        return compound(operator, rng.sample([self.real_atom(), listed], 2))
 
     def split(self, rooms):
         """The predicates of a node's children, and the rooms of each."""
@@ -232,7 +244,7 @@ class Document:
         for i, test in enumerate(tests):
             chance = rng.random()
             if self.surrogates and chance < 0.4:
-                tests[i] = compound("surrogate", [test] + [self.real_atom() for _ in range(rng.choice([1, 1, 2, 3]))])
+                tests[i] = self.with_surrogates(test)
             elif chance < 0.6 and rng.random() < 0.5:
                 tests[i] = self.mixed_with(test, 2)
             elif chance < 0.65:
@@ -286,11 +298,13 @@ class Document:
         categories = rng.sample(self.target.categories, rng.choice([rng.randint(1, most), most]))
         counts = [rng.choice([0, rng.randint(1, 9), rng.randint(1, 40), 5]) for _ in categories]
         counts[rng.randrange(len(counts))] += 3
+        if rng.random() < 0.15:
+            counts = [rng.randint(1, 20)] * len(counts)  # a tie
         total = f' recordCount="{sum(counts)}"' if counted else ""
         if silent:
             return total, []
         if self.strategy != "aggregateNodes" and rng.random() < 0.15:
-            return f" score={quoteattr(categories[0])}{total}", []
+            return f" score={quoteattr(rng.choice(categories))}{total}", []
         score = f" score={quoteattr(rng.choice(categories))}" if rng.random() < 0.6 else ""
         return score + total, self.distribution(categories, counts)
 
