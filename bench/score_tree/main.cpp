@@ -20,6 +20,7 @@
 #include "bench/support/TreeDocuments.h"
 #include "kestrel/dictionary/CaseRecord.h"
 #include "kestrel/dictionary/DictVar.h"
+#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
 #include "kestrel/model/Results.h"

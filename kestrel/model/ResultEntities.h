@@ -18,8 +18,8 @@ class ScoreResult;
 /// rules of a rule set that fired. Models of other kinds have none. A part to which the document gives no
 /// identifier is called by its number in document order, from 1, behind a "#".
 ///
-/// A model always tells the one entity whose score is the prediction. All that led there are recorded on
-/// request:
+/// Names are copied for every case, so a model gives them on request only: the one entity whose score is the
+/// prediction, or all that led there as well.
 ///
 ///   ResultEntities* entities = ResultEntities::Of(result.get());
 ///   entities->SetPathWanted(true);                  // once; stays so from case to case
@@ -36,10 +36,14 @@ class KESTREL_API ResultEntities {
   /// The entities of a result; null for null and for a result of a class that has none.
   static ResultEntities* Of(ScoreResult* result);
 
+  /// Whether models are to tell the deciding entity.
+  void SetDecidingIdWanted(bool wanted) { deciding_id_wanted_ = wanted; }
+  bool IsDecidingIdWanted() const { return deciding_id_wanted_ || path_wanted_; }
+  /// Whether they are to tell all entities; the deciding one is told with them.
   void SetPathWanted(bool wanted) { path_wanted_ = wanted; }
   bool IsPathWanted() const { return path_wanted_; }
 
-  /// The deciding entity; empty when no single one decided.
+  /// The deciding entity; empty when no single one decided, or when it was not wanted.
   void SetDecidingId(std::string_view id) { deciding_id_.assign(id); }
   const std::string& GetDecidingId() const { return deciding_id_; }
 
@@ -50,10 +54,11 @@ class KESTREL_API ResultEntities {
   /// `position` is below GetPathLength().
   const std::string& GetPathId(std::size_t position) const { return path_[position]; }
 
-  /// Forgets the case; whether the path is wanted stays.
+  /// Forgets the case; what is wanted stays.
   void Reset();
 
  private:
+  bool deciding_id_wanted_ = false;
   bool path_wanted_ = false;
   std::string deciding_id_;
   std::vector<std::string> path_;  ///< longer than the path when an earlier case had a longer one

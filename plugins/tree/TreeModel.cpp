@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <charconv>
 #include <ostream>
+#include <typeinfo>
 #include <utility>
 
 #include "kestrel/dictionary/ScoreDictionary.h"
@@ -38,26 +39,42 @@ MCStatus TreeModel::Score(const ScoreCaseRecord* record, ScoreResult* result) {
 }
 
 MCStatus TreeModel::ScoreVector(const double* values, ScoreResult* result) {
-  result->Reset();
+  return !tree_->options.is_classification && &typeid(*result) == &typeid(RegResult)
+             ? ScoreNumber(values, static_cast<RegResult&>(*result))
+             : ScoreAny(values, *result);
+}
+
+// Most cases of most trees: a number at a leaf, into a result of the class that MakeResult gives.
+MCStatus TreeModel::ScoreNumber(const double* values, RegResult& result) {
+  if (result.GetEntities().IsDecidingIdWanted()) return ScoreAny(values, result);
+  result.RegResult::Reset();
+  if (walker_.Walk(values) != TreeWalker::End::kNode) return ScoreAny(values, result);
+  result.SetNumber(tree_->scores.GetNumber(walker_.GetNode()));
+  return MCStatus();
+}
+
+MCStatus TreeModel::ScoreAny(const double* values, ScoreResult& result) {
+  result.Reset();
   switch (Walk(values, result)) {
     case TreeWalker::End::kNode:
-      Predict(*result);
+      Predict(result);
       return MCStatus();
     case TreeWalker::End::kSeveral:
-      PredictTogether(*result);
+      PredictTogether(result);
       return MCStatus();
     default:
       break;
   }
-  if (GetMissingValuePolicy() == kDefaultPrediction) return HandleMissingValue(result);
+  if (GetMissingValuePolicy() == kDefaultPrediction) return HandleMissingValue(&result);
   return MCStatus(kNoPredictionStatus, false);
 }
 
-TreeWalker::End TreeModel::Walk(const double* values, ScoreResult* result) {
-  ResultEntities* const entities = ResultEntities::Of(result);
-  const bool has_path = entities != nullptr && entities->IsPathWanted();
+TreeWalker::End TreeModel::Walk(const double* values, ScoreResult& result) {
+  ResultEntities* const entities = ResultEntities::Of(&result);
+  if (entities == nullptr || !entities->IsDecidingIdWanted()) return walker_.Walk(values);
+  const bool has_path = entities->IsPathWanted();
   const TreeWalker::End end = has_path ? walker_.WalkAndNotePath(values) : walker_.Walk(values);
-  if (entities != nullptr) NameEntities(end, has_path, *entities);
+  NameEntities(end, has_path, *entities);
   return end;
 }
 

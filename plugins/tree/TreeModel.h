@@ -15,6 +15,7 @@
 
 namespace MCKestrel_800 {
 
+class RegResult;
 class ResultEntities;
 
 /// Scores cases by a tree. Keeps nothing of the document. Serves one case at a time.
@@ -50,7 +51,9 @@ class TreeModel : public BaseModel {
   const Tree& GetTree() const { return *tree_; }
 
  private:
-  TreeWalker::End Walk(const double* values, ScoreResult* result);
+  MCScore::MCStatus ScoreNumber(const double* values, RegResult& result);
+  MCScore::MCStatus ScoreAny(const double* values, ScoreResult& result);
+  TreeWalker::End Walk(const double* values, ScoreResult& result);
   void NameEntities(TreeWalker::End end, bool has_path, ResultEntities& entities);
   void NameNode(int node);
   void Predict(ScoreResult& result);

@@ -41,22 +41,27 @@ class TreeTable {
   /// be asked one by one.
   int Descend(int node, const double* values) const {
     const Condition* const nodes = nodes_.data();
+    const Condition* at = nodes + node;
     for (;;) {
       // Of a leaf this is the node after it, which is nobody's first child and decides nothing.
-      const Condition& test = nodes[node + 1];
-      if (test.decides == Condition::kDecidesNothing) return node;
-      const double x = values[test.slot];
-      if (test.decides == Condition::kDecidesCode) {
-        if (!(x >= 0)) return node;
-        node = (test.codes >> (static_cast<unsigned>(x) & 63u) & 1) != 0 ? node + 1 : test.next;
+      const Condition* const first = at + 1;
+      if (first->decides == Condition::kDecidesNothing) break;
+      const Condition* const second = nodes + first->next;
+      const double x = values[first->slot];
+      if (first->decides == Condition::kDecidesCode) {
+        if (!(x >= 0)) break;
+        at = (first->codes >> (static_cast<unsigned>(x) & 63u) & 1) != 0 ? first : second;
         continue;
       }
-      if (!IsOrdinary(x)) return node;
-      // Half of all comparisons go either way, so the choice is made without a branch.
-      const bool is_first = (x <= test.number) != (test.decides == Condition::kDecidesNumberAbove);
-      const int step = -static_cast<int>(is_first);
-      node = test.next ^ ((test.next ^ (node + 1)) & step);
+      if (!IsOrdinary(x)) break;
+      // Half of all comparisons go either way, and a wrong guess costs more than a level of the tree. Both
+      // nodes being at hand, the compiler chooses between them without a branch.
+      const bool is_above = first->decides == Condition::kDecidesNumberAbove;
+      const Condition* const low = is_above ? second : first;
+      const Condition* const high = is_above ? first : second;
+      at = x <= first->number ? low : high;
     }
+    return static_cast<int>(at - nodes);
   }
 
   std::size_t GetMemorySize() const { return nodes_.capacity() * sizeof(Condition); }

@@ -66,6 +66,7 @@ class TreeWalker {
   void AddRecords(int node);
 
   const Tree& tree_;
+  const bool is_root_true_;
   int node_ = 0;
   int substitutions_ = 0;
   std::vector<double> votes_;
