@@ -1,5 +1,6 @@
 #include "kestrel/predicates/Range.h"
 
+#include <cmath>
 #include <memory>
 #include <ostream>
 
@@ -24,6 +25,12 @@ void UnboundBelow(ScoreValue* min) {
 
 ScoreValue* CloneOf(const ScoreValue* value) {
   return value == nullptr ? nullptr : value->Clone();
+}
+
+/// IsEqual, asked only of numbers that are near each other: most that are tested lie well outside, and the
+/// question costs more than all the rest.
+bool IsEnd(double x, double end) {
+  return std::fabs(x - end) <= std::fabs(end) * 1e-6 && NumericValue::IsEqual(x, end);
 }
 
 void DisplayEnd(std::ostream& out, const ScoreValue* value) {
@@ -165,11 +172,10 @@ void Range::SetMax(ScoreValue* value) {
 }
 
 bool Range::IsInRange(double x) const {
-  if (single_) return NumericValue::IsEqual(x, min_number_);
+  if (single_) return IsEnd(x, min_number_);
+  if (min_number_ < x && x < max_number_) return !NumericValue::IsSystemMissingValue(x);
   if (NumericValue::IsSystemMissingValue(x)) return false;
-  if (low_included_ && NumericValue::IsEqual(x, min_number_)) return true;
-  if (high_included_ && NumericValue::IsEqual(x, max_number_)) return true;
-  return min_number_ < x && x < max_number_;
+  return (low_included_ && IsEnd(x, min_number_)) || (high_included_ && IsEnd(x, max_number_));
 }
 
 bool Range::IsInRange(const ScoreValue* value) const {

@@ -4,8 +4,6 @@
 #include <string>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
-#include "kestrel/foundation/NumericValue.h"
-#include "kestrel/predicates/ScoreValueRange.h"
 
 namespace MCKestrel_800 {
 
@@ -35,14 +33,6 @@ ScaleSplit* ScaleSplit::Clone() const {
 
 ScoreSplitVar::SplitVarType ScaleSplit::GetSplitVarType() const {
   return kScale;
-}
-
-int ScaleSplit::GetSplitChildIndex(double x) const {
-  if (NumericValue::IsSystemMissingValue(x)) return GetMissvalMap();
-  for (const auto& [range, child] : ranges_) {
-    if (range->IsInRange(x)) return child;
-  }
-  return -1;
 }
 
 int ScaleSplit::GetSplitChildIndex(const ScoreValue* value) const {

@@ -14,10 +14,6 @@ void ScoreSplitVar::SetMissvalMap(int child) {
   missval_map_ = child;
 }
 
-const ScoreDictVar* ScoreSplitVar::GetSplitVar() const {
-  return variable_;
-}
-
 std::string ScoreSplitVar::GetSplitName() const {
   return variable_ == nullptr ? std::string() : variable_->GetName();
 }

@@ -32,7 +32,7 @@ class KESTREL_API ScoreSplitVar {
   virtual void SetSplitVar(const ScoreDictVar* variable);
   /// The child that missing values go to; -1, the default, for none.
   virtual void SetMissvalMap(int child);
-  virtual const ScoreDictVar* GetSplitVar() const;
+  virtual const ScoreDictVar* GetSplitVar() const { return variable_; }
   /// The variable's name, label, type and level; without a variable the texts are empty and the numbers -1.
   virtual std::string GetSplitName() const;
   virtual std::string GetSplitLabel() const;

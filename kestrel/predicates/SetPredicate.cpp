@@ -28,9 +28,9 @@ SetPredicate* SetPredicate::Clone() const {
 ScorePredicate::PredicateResult SetPredicate::Evaluate(const std::vector<double>& values) const {
   const ScoreDictVar* variable = VariableOf(split_);
   if (variable == nullptr) return PredUnknown;
-  const VectorInput input = FindInput(*variable, values);
-  if (input.missing) return PredUnknown;
-  return ResultOfChild(split_->GetSplitChildIndex(input.x));
+  const double x = FindNumber(*variable, values);
+  if (IsMissingMarker(*variable, x)) return PredUnknown;
+  return ResultOfChild(split_->GetSplitChildIndex(x));
 }
 
 ScorePredicate::PredicateResult SetPredicate::Evaluate(const ScoreCaseRecord* record,

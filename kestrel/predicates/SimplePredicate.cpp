@@ -5,6 +5,7 @@
 
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/foundation/ScoreValue.h"
+#include "kestrel/predicates/ScaleSplit.h"
 #include "kestrel/predicates/SplitInput.h"
 
 namespace MCKestrel_800 {
@@ -52,9 +53,10 @@ SimplePredicate* SimplePredicate::Clone() const {
 ScorePredicate::PredicateResult SimplePredicate::Evaluate(const std::vector<double>& values) const {
   const ScoreDictVar* variable = VariableOf(split_);
   if (variable == nullptr) return PredUnknown;
-  const VectorInput input = FindInput(*variable, values);
-  if (input.missing) return split_->GetMissvalMap() == -1 ? PredUnknown : PredTrue;
-  return ResultOfChild(split_->GetSplitChildIndex(input.x));
+  const double x = FindNumber(*variable, values);
+  if (IsMissingMarker(*variable, x)) return split_->GetMissvalMap() == -1 ? PredUnknown : PredTrue;
+  // ScaleSplit.h is included so that this is mostly no call.
+  return ResultOfChild(split_->GetSplitChildIndex(x));
 }
 
 ScorePredicate::PredicateResult SimplePredicate::Evaluate(const ScoreCaseRecord* record,

@@ -35,21 +35,28 @@ struct RecordInput {
 RecordInput FindInput(const ScoreDictVar& variable, const ScoreCaseRecord* record,
                       const ScoreCaseRecord* derivedRecord);
 
-/// The variable's part of a flat vector.
-struct VectorInput {
-  double x;
-  bool missing;
-};
+/// Whether a flat vector holds the variable's category codes.
+inline bool IsEncoded(const ScoreDictVar& variable) {
+  const ScoreDictVar::MeasureLevel level = variable.GetMLevel();
+  return level == ScoreDictVar::kOrdinal || level == ScoreDictVar::kNominal;
+}
 
-inline VectorInput FindInput(const ScoreDictVar& variable, const std::vector<double>& values) {
-  constexpr double kNoCategory = -1.0, kMissingCategory = -2.0;
-  const bool isEncoded = variable.GetMLevel() != ScoreDictVar::kContinuous;
+/// The variable's number in a flat vector. A category that is not there is no category, and so differs from
+/// one that is missing; a number that is not there is missing.
+inline double FindNumber(const ScoreDictVar& variable, const std::vector<double>& values) {
+  constexpr double kNoCategory = -1.0;
+  // A negative index becomes a number beyond every size.
   const auto index = static_cast<std::size_t>(variable.GetEncodedValueIndex());
-  // A negative index becomes a number beyond every size. A category that is not in the vector is no category,
-  // and so differs from one that is missing; a number that is not there is missing.
-  const double absent = isEncoded ? kNoCategory : NumericValue::gSysmisValue;
-  const double x = index < values.size() ? values[index] : absent;
-  return {x, x == (isEncoded ? kMissingCategory : NumericValue::gSysmisValue)};
+  if (index < values.size()) return values[index];
+  return IsEncoded(variable) ? kNoCategory : NumericValue::gSysmisValue;
+}
+
+/// Whether a number is the missing marker of its variable. The level is asked for only where it matters: a
+/// virtual call is a good part of an evaluation.
+inline bool IsMissingMarker(const ScoreDictVar& variable, double x) {
+  constexpr double kMissingCategory = -2.0, kMissingNumber = NumericValue::gSysmisValue;
+  if (x == kMissingNumber) return !IsEncoded(variable);
+  return x == kMissingCategory && IsEncoded(variable);
 }
 
 /// The variable that a predicate asks about; null when it has no split or the split has no variable.
