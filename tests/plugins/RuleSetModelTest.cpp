@@ -180,12 +180,15 @@ TEST(RuleSetModel, BuildsFromAnElementAndADictionary) {
                 If("<SimplePredicate field='n' operator='equal' value='2'/>", "score='yes'"))));
   const auto dictionary =
       kestrel_test::ReadDictionary(kestrel_test::DictionaryOf(9, kestrel_tests::TestFields()));
+  // A dictionary that served another model first knows that model's places.
+  dictionary->GetVar("n")->SetEncodedValueIndex(3);
   RuleSetTranslator translator;
   const std::unique_ptr<ScoreModel> model(
       translator.ParseFromTree(tree->GetRoot(), dictionary.get(), dictionary.get(), std::string()));
   EXPECT_NE(model->GetDictionary(), dictionary.get());
   EXPECT_NE(model->GetResultDictionary(), nullptr);
   EXPECT_NE(model->GetResultDictionary(), dictionary.get());
+  EXPECT_EQ(dictionary->GetVar("n")->GetEncodedValueIndex(), 3) << "the host's own is left alone";
   Telling<ClsResult> result;
   for (const double n : {1.0, 2.0}) {
     const CaseRecord record = RecordOf({{"n", n}});
