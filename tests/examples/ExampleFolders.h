@@ -26,6 +26,12 @@ inline std::vector<std::string> ExampleFolders() {
   return names;
 }
 
+/// The model elements that examples hold.
+inline const std::vector<std::string>& ExampleKinds() {
+  static const std::vector<std::string> kinds = {"RegressionModel", "TreeModel", "RuleSetModel"};
+  return kinds;
+}
+
 /// A test name may hold letters and digits only.
 inline std::string TestNameOf(const std::string& folder) {
   std::string name;

@@ -28,7 +28,7 @@ class EveryExample : public testing::TestWithParam<std::string> {
   void SetUp() override {
     std::ifstream document(ExamplePath(GetParam(), "model.xml"), std::ios::binary);
     ASSERT_TRUE(document.is_open());
-    model_.reset(ModelFactory::MakeModelFromXML(document, {"RegressionModel"}, std::string()));
+    model_.reset(ModelFactory::MakeModelFromXML(document, ExampleKinds(), std::string()));
     ASSERT_NE(model_, nullptr);
     data_ = ReadPlainTable(ExamplePath(GetParam(), "data.csv"));
     expected_ = ReadPlainTable(ExamplePath(GetParam(), "expected.csv"));
