@@ -13,6 +13,7 @@
 
 #include "bench/support/Documents.h"
 #include "bench/support/Interleaved.h"
+#include "bench/support/TreeDocuments.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ScoreModel.h"
 #include "kestrel/translate/DocumentReader.h"
@@ -42,7 +43,8 @@ void ParseWithStockParser(const std::string& document) {
 
 std::unique_ptr<ScoreModel> Load(const std::string& document) {
   std::istringstream in(document);
-  std::unique_ptr<ScoreModel> model(ModelFactory::MakeModelFromXML(in, {"RegressionModel"}, std::string()));
+  std::unique_ptr<ScoreModel> model(
+      ModelFactory::MakeModelFromXML(in, {"RegressionModel", "TreeModel"}, std::string()));
   if (model == nullptr || model->GetPredictors().empty()) Fail("a document gave no model");
   return model;
 }
@@ -51,7 +53,8 @@ double Megabytes(size_t bytes) {
   return static_cast<double>(bytes) / 1e6;
 }
 
-void CompareLoads(const char* title, const std::string& document, int repeat) {
+/// Times the load of a document. Returns the bytes that the model keeps.
+size_t CompareLoads(const char* title, const std::string& document, int repeat) {
   std::unique_ptr<ScoreModel> model;
   const size_t before = mallinfo2().uordblks;
   model = Load(document);
@@ -83,6 +86,21 @@ void CompareLoads(const char* title, const std::string& document, int repeat) {
   PrintRatios(contestants, seconds);
   std::printf("  %-46s %10.2f us\n", "one whole load", 1e6 * seconds[2] / repeat);
   std::printf("  %-46s %10.3f MB\n", "memory that the model keeps", Megabytes(kept));
+  return kept;
+}
+
+/// The same for a tree: with identifiers and, for a classification, distributions of three categories, all of
+/// which are kept.
+void CompareTreeLoads(const char* title, int depth, const TreeShape& shape) {
+  constexpr int kInputs = 30;
+  const PlainTree tree = RandomTree(kInputs, depth, 20);
+  const size_t kept = CompareLoads(title, TreeDocument(tree, kInputs, shape), 1);
+  size_t strings = 0;
+  for (size_t node = 0; node < tree.nodes.size(); ++node)
+    strings += std::to_string(node).size();
+  const size_t distributions = tree.nodes.size() * static_cast<size_t>(shape.categories) * 32;
+  std::printf("  %-46s %10.1f bytes\n", "a node, beside identifiers and distributions",
+              static_cast<double>(kept - strings - distributions) / static_cast<double>(tree.nodes.size()));
 }
 
 void CompareSizes(const char* title, const std::string& once, const std::string& twice) {
@@ -109,6 +127,8 @@ int Run(bool smoke) {
   const size_t many = smoke ? 500 : 10'000;
   CompareLoads("regression document", OfSize(large, [](size_t n) { return ClassificationModel(n, 20); }), 1);
   CompareLoads("dictionary document", OfSize(large, DictionaryModel), 1);
+  CompareTreeLoads("regression tree document", smoke ? 10 : 16, {});
+  CompareTreeLoads("classification tree document", smoke ? 10 : 15, {3, true});
   CompareLoads("small regression document (20 inputs)", LinearModel(20, false), smoke ? 10 : 500);
   std::printf("growth: t(2n) / t(n), n = %zu\n", many);
   for (const GrowthShape& shape : GrowthShapes())
