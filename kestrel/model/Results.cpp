@@ -7,10 +7,11 @@ namespace MCKestrel_800 {
 namespace {
 
 /// The value as a `Value` when it is exactly one. A class derived from it may hold more, which an assignment
-/// would lose.
+/// would lose. Descriptions are compared by address, which takes no look at names; one that had two would
+/// only mean a clone.
 template <typename Value>
 const Value* AsExactly(const ScoreValue& value) {
-  return typeid(value) == typeid(Value) ? static_cast<const Value*>(&value) : nullptr;
+  return &typeid(value) == &typeid(Value) ? static_cast<const Value*>(&value) : nullptr;
 }
 
 }  // namespace
@@ -21,12 +22,13 @@ ResultValue::ResultValue(ResultValue&&) noexcept = default;
 ResultValue& ResultValue::operator=(ResultValue&&) noexcept = default;
 
 // Assigning to a variant that holds the same class assigns to the object in it, so a text's room is used
-// again.
+// again. Categories come in the same order case after case: mostly the text is there already.
 void ResultValue::Assign(const ScoreValue& value) {
   if (const NumericValue* number = AsExactly<NumericValue>(value)) {
-    held_ = *number;
+    Assign(number->GetDouble());
   } else if (const StringValue* text = AsExactly<StringValue>(value)) {
-    held_ = *text;
+    const auto* const held = std::get_if<StringValue>(&held_);
+    if (held == nullptr || held->GetText() != text->GetText()) held_ = *text;
   } else if (const DateTimeValue* moment = AsExactly<DateTimeValue>(value)) {
     held_ = *moment;
   } else {
