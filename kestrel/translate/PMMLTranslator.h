@@ -89,10 +89,8 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   // ---- Predicates. What they give back belongs to the caller; the variables of the dictionaries must
   // outlive it. A field is looked up in `dictionary` and then, unless it is null, in `derivedDictionary`.
 
-  /// Reads a `SimplePredicate` element.
-  /// ordinalAsScale  whether an ordinal number field is compared by its numbers instead of by the positions
-  /// of
-  ///                 its categories.
+  /// Reads a `SimplePredicate` element. With `ordinalAsScale` an ordinal number field is compared by its
+  /// numbers instead of by the positions of its categories.
   static ScorePredicate* ParsePredicate(xercesc::DOMElement* element, const ScoreDictionary* dictionary,
                                         const ScoreDictionary* derivedDictionary, bool ordinalAsScale);
 
@@ -108,8 +106,78 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
                                                 const ScoreDictionary* derivedDictionary,
                                                 bool ordinalAsScale);
 
+  // ---- The parts of these three, for plug-ins whose elements compare fields in other forms. `element` is
+  // what the attributes are read from and what faults point at; where no attribute is read it may be null. A
+  // value satisfies the comparison exactly when the split sends it to a child.
+
+  /// Builds the split of a `SimplePredicate` on numbers, or on categories, with the one child 0.
+  /// operatorText, valueText  set to what the attributes say; empty when they are absent.
+  /// missing                  set to whether the predicate's own value is the missing one.
+  static ScoreSplitVar* HandleNodeScaleSplit(const xercesc::DOMElement* element, const ScoreDictVar* variable,
+                                             std::string& operatorText, std::string& valueText,
+                                             bool& missing);
+  static ScoreSplitVar* HandleNodeDiscreteSplit(const xercesc::DOMElement* element,
+                                                const ScoreDictVar* variable, std::string& operatorText,
+                                                std::string& valueText, bool& missing);
+
+  /// The interval that an ordering operator, "equal" or "notEqual" makes of a number. `included` tells
+  /// whether its finite ends belong to it; of "notEqual", which is all but one number, they do not.
+  static void GetScaleSplitValue(const xercesc::DOMElement* element, const XMLCh* value,
+                                 const XMLCh* operatorText, double& low, double& high, bool& included);
+
+  /// Sends the one category that `value` names to a child. Null stands for an absent attribute, which is an
+  /// error (code 1), as is a value that is no category.
+  static void SetDiscreteSplitValue(const xercesc::DOMElement* element, const ScoreDictVar* variable,
+                                    DiscreteSplit* split, const XMLCh* value, int child);
+
+  /// Sends the categories that lie before or behind `value` in the variable's list to a child, by the
+  /// operator, and notes where in the list they begin and end. "notEqual" sends all but one, which is no
+  /// interval. No category at all, and an operator that is none, is an error (code 9).
+  static void HandleOrdinalVariable(const xercesc::DOMElement* element, const ScoreDictVar* variable,
+                                    DiscreteSplit* split, const XMLCh* value, const XMLCh* operatorText,
+                                    int child);
+
+  /// The position of a value in the variable's list of categories, or -1.
+  static int GetIndexOfOrdinalValue(const xercesc::DOMElement* element, const ScoreDictVar* variable,
+                                    const ScoreValue& value);
+
+  /// Builds the split of a set from the `Array` in `element`, with the one child 0.
+  /// booleanOperator  "isIn" or "isNotIn".
+  /// values           set to the array's values: codes where the variable has an encoder, else numbers.
+  static ScoreSplitVar* HandleArrayDiscreteSplit(const xercesc::DOMElement* element,
+                                                 const ScoreDictVar* variable, const XMLCh* booleanOperator,
+                                                 std::vector<double>& values);
+
+  /// Whether a text is one of the variable's categories: as a text, without regard to trailing blanks unless
+  /// the variable keeps them, or as exactly the same number. False for a text that is no number where one is
+  /// needed. A variable without categories is an error (code 1).
+  static bool IsValidScoreValue(const xercesc::DOMElement* element, const ScoreDictVar* variable,
+                                const std::string& text);
+
+  /// The variable's categories without those that the texts name, in their order; they stay the variable's.
+  /// A text that is no category is an error (code 3).
+  static std::vector<const ScoreValue*> Remove(const xercesc::DOMElement* element,
+                                               const ScoreDictVar* variable,
+                                               const std::vector<std::string>& toRemove);
+
+  // ---- Arrays. Elements stand between blanks, or between double quotes when there are blanks in them.
+
+  /// The first `Array` child; code 4 when there is none.
+  static xercesc::DOMElement* GetArrayNode(const xercesc::DOMElement* parent);
+
+  /// The elements of an array as they are written. Of the types "int" and "real" each must be a number of
+  /// that kind; the attribute `n` must be their number when it is there; there must be one at least.
+  static std::vector<std::string> GetArrayElements(const xercesc::DOMElement* array);
+
+  /// The numbers of an `Array` or of a row of a basis matrix, under the same rules whatever its type says.
+  static std::vector<double> VerifyDoubleArray(const xercesc::DOMElement* array);
+  static std::vector<int> VerifyIntArray(const xercesc::DOMElement* array);
+
+  /// Code 4 unless `element` has the tag.
+  static void VerifyOneElem(const xercesc::DOMElement* element, const std::string& tag);
+
   /// Reads the `ScoreDistribution` children of a node into `stats`, in document order, replacing what it
-  /// held.
+  /// held; its memory is used again.
   static void SetLeafNodeStats(xercesc::DOMElement* node, std::vector<LeafNodeStats>& stats);
 };
 
