@@ -28,10 +28,13 @@ class RuleScores {
   RuleScores(bool is_classification, const ScoreDictVar* target)
       : is_classification_(is_classification), categories_(target) {}
 
-  /// The number of the score that a text of the document names, from 0. Errors, at the element: code 3 for
-  /// a regression's score that is no number, code 7 for one that is not finite and for a category that the
-  /// target does not have.
-  int Find(const xercesc::DOMElement* element, const std::string& text);
+  /// The number of a classification's category, from 0; errors as TargetCategories says.
+  int FindCategory(const xercesc::DOMElement* element, const std::string& text) {
+    return categories_.Find(element, text);
+  }
+
+  /// The number of a regression's score, which is finite.
+  int FindNumber(double score);
 
   int GetCount() const {
     return is_classification_ ? categories_.GetCount() : static_cast<int>(numbers_.size());

@@ -12,7 +12,6 @@
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
-#include "plugins/rule_set/FiniteNumber.h"
 #include "plugins/support/PredicateReader.h"
 
 namespace MCKestrel_800 {
@@ -25,9 +24,31 @@ using Tags = PMMLTagText;
   FailAt(element, KestrelException::kStructure, Narrow(element->getTagName()) + ": Invalid element!");
 }
 
+// Elements that producers add for themselves.
+bool IsExtension(const DOMElement* element) {
+  const XMLCh* name = element->getTagName();
+  return ElementIs(element, Tags::XML_ELE_EXTENSION) ||
+         ((name[0] == u'X' || name[0] == u'x') && name[1] == u'-');
+}
+
+double ReadNumber(const DOMElement* element, const char16_t* attribute) {
+  const XMLCh* text = Attribute(element, attribute);
+  double number = 0.0;
+  try {
+    number = BaseTranslator::VerifyDouble(text);
+  } catch (const KestrelException& fault) {
+    // The same words, with the place that the conversion does not know.
+    FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
+  }
+  if (!std::isfinite(number) || NumericValue::IsSystemMissingValue(number)) {
+    FailAt(element, KestrelException::kInvalidDocument,
+           "invalid " + Narrow(ToXMLCh(attribute)) + " -- " + Narrow(text));
+  }
+  return number;
+}
+
 double ReadNumberOr(const DOMElement* element, const char16_t* attribute, double absent) {
-  const std::string text = AttributeText(element, attribute);
-  return text.empty() ? absent : ReadFiniteNumber(element, text);
+  return IsEmpty(Attribute(element, attribute)) ? absent : ReadNumber(element, attribute);
 }
 
 // The statistics of training that play no part in scoring.
@@ -37,11 +58,19 @@ void CheckCounts(const DOMElement* element) {
 }
 
 DOMElement* FindPredicate(const DOMElement* rule) {
+  DOMElement* predicate = nullptr;
   for (DOMElement* child : ChildElements(rule)) {
-    if (IsPredicate(child)) return child;
+    if (!IsPredicate(child)) continue;
+    if (predicate != nullptr) {
+      FailAt(child, KestrelException::kStructure,
+             "<" + Narrow(rule->getTagName()) + "> has more than one predicate!");
+    }
+    predicate = child;
   }
-  FailAt(rule, KestrelException::kStructure,
-         "A predicate is required in <" + Narrow(rule->getTagName()) + ">!!");
+  if (predicate == nullptr) {
+    FailAt(rule, KestrelException::kMissingElement, "<" + Narrow(rule->getTagName()) + "> has no predicate!");
+  }
+  return predicate;
 }
 
 }  // namespace
@@ -96,7 +125,7 @@ void RuleSetReader::ReadRules(DOMElement* rule_set) {
       DOMElement* const predicate = FindPredicate(element);
       const int compound = AddRule(predicate, RuleTable::Rule(), std::string());
       levels.push_back({compound, predicate, FirstChild(element)});
-    } else if (element != level.predicate && !ElementIs(element, Tags::XML_ELE_EXTENSION)) {
+    } else if (element != level.predicate && !IsExtension(element)) {
       const bool is_part = levels.size() == 1 && (ElementIs(element, Tags::XML_ELE_RULESET_RULESELECMETHOD) ||
                                                   ElementIs(element, Tags::XML_ELE_SCOREDISTRIBUTION));
       if (!is_part) FailOnElement(element);
@@ -110,18 +139,23 @@ void RuleSetReader::ReadSimpleRule(DOMElement* element) {
   for (const DOMElement* child : ChildElements(element)) {
     if (ElementIs(child, Tags::XML_ELE_SCOREDISTRIBUTION)) {
       has_distribution = true;
-    } else if (child != predicate && !ElementIs(child, Tags::XML_ELE_EXTENSION)) {
+    } else if (child != predicate && !IsExtension(child)) {
       FailOnElement(child);
     }
   }
   CheckCounts(element);
   RuleTable::Rule rule;
-  rule.score = rule_set_.scores.Find(
-      element, Narrow(BaseTranslator::GetAttributeForced(element, PMMLModelTags::XML_ATT_SCORE)));
+  BaseTranslator::GetAttributeForced(element, PMMLModelTags::XML_ATT_SCORE);
+  rule.score = FindScore(element, Tags::XML_ATT_SCORE);
   rule.weight = ReadNumberOr(element, Tags::XML_ATT_SIMPLERULE_WEIGHT, rule.weight);
   rule.confidence = ReadNumberOr(element, Tags::XML_ATT_SIMPLERULE_CONF, rule.confidence);
   const int number = AddRule(predicate, rule, AttributeText(element, Tags::XML_ATT_SIMPLERULE_ID));
   if (has_distribution) pending_.push_back({element, number});
+}
+
+int RuleSetReader::FindScore(const DOMElement* element, const char16_t* attribute) {
+  if (is_classification_) return rule_set_.scores.FindCategory(element, AttributeText(element, attribute));
+  return rule_set_.scores.FindNumber(ReadNumber(element, attribute));
 }
 
 int RuleSetReader::AddRule(DOMElement* predicate, const RuleTable::Rule& rule, const std::string& id) {
@@ -136,8 +170,9 @@ int RuleSetReader::AddRule(DOMElement* predicate, const RuleTable::Rule& rule, c
 }
 
 void RuleSetReader::ReadDefault(DOMElement* element) {
-  const std::string score = AttributeText(element, Tags::XML_ATT_RULESET_DEFAULTSCORE);
-  if (!score.empty()) rule_set_.default_score = rule_set_.scores.Find(element, score);
+  if (!IsEmpty(Attribute(element, Tags::XML_ATT_RULESET_DEFAULTSCORE))) {
+    rule_set_.default_score = FindScore(element, Tags::XML_ATT_RULESET_DEFAULTSCORE);
+  }
   rule_set_.default_confidence =
       ReadNumberOr(element, Tags::XML_ATT_RULESET_DEFAULTCONF, rule_set_.default_confidence);
 }
@@ -154,7 +189,7 @@ int RuleSetReader::ReadDistribution(DOMElement* element) {
   std::vector<DistributionTable::Share> shares;
   auto stats = stats_.begin();
   for (const DOMElement* child : ChildElements(element, Tags::XML_ELE_SCOREDISTRIBUTION)) {
-    const int score = rule_set_.scores.Find(child, stats->value);
+    const int score = rule_set_.scores.FindCategory(child, stats->value);
     const auto place = static_cast<std::size_t>(score);
     if (distributions_of_scores_.size() <= place) distributions_of_scores_.resize(place + 1, nullptr);
     if (distributions_of_scores_[place] == element) {

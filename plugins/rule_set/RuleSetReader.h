@@ -23,13 +23,13 @@ class ScoreDictionary;
 /// Reads one rule set. Its predicates are compiled one by one and dropped.
 ///
 /// Errors, all KestrelException with the place in the document, beside those of the readers of predicates and
-/// of `ScoreDistribution` elements and of RuleScores:
-///   code 1   an element that does not belong here, a rule without predicate, a category twice in a
+/// of `ScoreDistribution` elements and of TargetCategories:
+///   code 1   an element that does not belong here, a rule with several predicates, a category twice in a
 ///            distribution;
-///   code 3   a number that is none;
-///   code 4   no `RuleSelectionMethod`, or one without `criterion`; a `SimpleRule` without `score`;
-///   code 6   an unknown `criterion`;
-///   code 7   a number that is not finite;
+///   code 3   a number that is none, such as a regression's `score`;
+///   code 4   no `RuleSelectionMethod`, or one without `criterion`; a rule without predicate, a `SimpleRule`
+///            without `score`;
+///   code 6   an unknown `criterion`, a number that is not finite;
 ///   code 8   a predicate's field that is not one of the active fields.
 class RuleSetReader {
  public:
@@ -57,6 +57,7 @@ class RuleSetReader {
   void ReadSimpleRule(xercesc::DOMElement* element);
   void ReadDefault(xercesc::DOMElement* element);
   int ReadDistribution(xercesc::DOMElement* element);
+  int FindScore(const xercesc::DOMElement* element, const char16_t* attribute);
   int AddRule(xercesc::DOMElement* predicate, const RuleTable::Rule& rule, const std::string& id);
 
   const bool is_classification_;

@@ -272,7 +272,7 @@ const ChoiceRow kChoices[] = {
     {"extensions everywhere",
      "firstHit",
      "",
-     "<Extension/><CompoundRule><Extension/><True/><SimpleRule id='r1' score='red'><Extension/><True/>"
+     "<Extension/><X-Rules/><CompoundRule><x-more/><True/><SimpleRule id='r1' score='red'><Extension/><True/>"
      "<Extension/></SimpleRule><Extension/></CompoundRule>",
      {},
      "red 1 r1",
