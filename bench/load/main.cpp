@@ -13,16 +13,24 @@
 
 #include "bench/support/Documents.h"
 #include "bench/support/Interleaved.h"
+#include "bench/support/PredicateDocuments.h"
 #include "bench/support/TreeDocuments.h"
+#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ScoreModel.h"
+#include "kestrel/predicates/ScorePredicate.h"
 #include "kestrel/translate/DocumentReader.h"
+#include "kestrel/translate/PMMLTranslator.h"
+#include "kestrel/translate/XmlText.h"
 
 namespace kestrel_bench {
 namespace {
 
 using MCKestrel_800::ModelFactory;
+using MCKestrel_800::PMMLTranslator;
+using MCKestrel_800::ScoreDictionary;
 using MCKestrel_800::ScoreModel;
+using MCKestrel_800::ScorePredicate;
 
 [[noreturn]] void Fail(const char* what) {
   std::fprintf(stderr, "bench_load: %s\n", what);
@@ -103,14 +111,44 @@ void CompareTreeLoads(const char* title, int depth, const TreeShape& shape) {
               static_cast<double>(kept - strings - distributions) / static_cast<double>(tree.nodes.size()));
 }
 
-void CompareSizes(const char* title, const std::string& once, const std::string& twice) {
-  std::unique_ptr<ScoreModel> model;
+/// A dictionary and the predicate on it, as a plug-in reads them.
+struct ReadRule {
+  std::unique_ptr<ScoreDictionary> dictionary;
+  std::unique_ptr<ScorePredicate> predicate;
+};
+
+ReadRule LoadRule(const std::string& document) {
+  class Translator : public PMMLTranslator {
+   public:
+    using PMMLTranslator::ParseFromTree;
+    ScoreModel* ParseFromTree(xercesc::DOMElement*, const std::string&) override { return nullptr; }
+  };
+  std::istringstream in(document);
+  const auto tree = MCKestrel_800::ReadDocument(in);
+  xercesc::DOMElement* const first = MCKestrel_800::FirstChild(tree->GetRoot());
+  xercesc::DOMElement* const second = MCKestrel_800::NextSibling(first);
+  ReadRule rule;
+  rule.dictionary.reset(Translator().ParseDictionary(first, false));
+  const bool isSet = MCKestrel_800::ElementIs(second, u"SimpleSetPredicate");
+  rule.predicate.reset(
+      isSet ? PMMLTranslator::ParseSetPredicate(second, rule.dictionary.get(), nullptr)
+            : PMMLTranslator::ParseCompoundPredicate(second, rule.dictionary.get(), nullptr, false));
+  if (rule.predicate == nullptr) Fail("a document gave no predicate");
+  return rule;
+}
+
+/// How the time grows from a document to one twice as long.
+template <typename LoadOne>
+void CompareSizes(const GrowthShape& shape, size_t n, LoadOne load) {
+  const std::string once = shape.make(n);
+  const std::string twice = shape.make(2 * n);
+  decltype(load(once)) loaded = {};
   const std::vector<Contestant> contestants = {
-      {"n", [&] { model = Load(once); }, [&] { model.reset(); }},
-      {"2n", [&] { model = Load(twice); }, [&] { model.reset(); }},
+      {"n", [&] { loaded = load(once); }, [&] { loaded = {}; }},
+      {"2n", [&] { loaded = load(twice); }, [&] { loaded = {}; }},
   };
   const std::vector<double> seconds = Compare(contestants);
-  std::printf("  %-46s %10.6f s  %6.2f x\n", title, seconds[0], seconds[1] / seconds[0]);
+  std::printf("  %-46s %10.6f s  %6.2f x\n", shape.name, seconds[0], seconds[1] / seconds[0]);
 }
 
 /// The smallest document of a shape that has at least that many bytes.
@@ -132,7 +170,9 @@ int Run(bool smoke) {
   CompareLoads("small regression document (20 inputs)", LinearModel(20, false), smoke ? 10 : 500);
   std::printf("growth: t(2n) / t(n), n = %zu\n", many);
   for (const GrowthShape& shape : GrowthShapes())
-    CompareSizes(shape.name, shape.make(many), shape.make(2 * many));
+    CompareSizes(shape, many, Load);
+  for (const GrowthShape& shape : PredicateShapes())
+    CompareSizes(shape, many, LoadRule);
   return 0;
 }
 
