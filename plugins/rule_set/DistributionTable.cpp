@@ -10,6 +10,11 @@ int DistributionTable::Add(const std::vector<Share>& shares) {
   return static_cast<int>(ends_.size()) - 1;
 }
 
+void DistributionTable::Seal() {
+  shares_.shrink_to_fit();
+  ends_.shrink_to_fit();
+}
+
 void DistributionTable::Fill(int distribution, std::vector<double>& probabilities) const {
   std::fill(probabilities.begin(), probabilities.end(), 0.0);
   const std::size_t first = distribution == 0 ? 0 : ends_[distribution - 1];

@@ -23,6 +23,9 @@ class DistributionTable {
   /// Appends a distribution and returns its number.
   int Add(const std::vector<Share>& shares);
 
+  /// Gives back the room that building needed.
+  void Seal();
+
   /// Writes the probabilities of all scores, by position; 0 for those that the distribution does not name.
   void Fill(int distribution, std::vector<double>& probabilities) const;
 

@@ -2,9 +2,7 @@
 
 #include <xercesc/dom/DOMElement.hpp>
 
-#include <algorithm>
 #include <cmath>
-#include <memory>
 
 #include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
@@ -12,6 +10,7 @@
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
+#include "plugins/support/Attributes.h"
 #include "plugins/support/PredicateReader.h"
 
 namespace MCKestrel_800 {
@@ -24,53 +23,10 @@ using Tags = PMMLTagText;
   FailAt(element, KestrelException::kStructure, Narrow(element->getTagName()) + ": Invalid element!");
 }
 
-// Elements that producers add for themselves.
-bool IsExtension(const DOMElement* element) {
-  const XMLCh* name = element->getTagName();
-  return ElementIs(element, Tags::XML_ELE_EXTENSION) ||
-         ((name[0] == u'X' || name[0] == u'x') && name[1] == u'-');
-}
-
-double ReadNumber(const DOMElement* element, const char16_t* attribute) {
-  const XMLCh* text = Attribute(element, attribute);
-  double number = 0.0;
-  try {
-    number = BaseTranslator::VerifyDouble(text);
-  } catch (const KestrelException& fault) {
-    // The same words, with the place that the conversion does not know.
-    FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
-  }
-  if (!std::isfinite(number) || NumericValue::IsSystemMissingValue(number)) {
-    FailAt(element, KestrelException::kInvalidDocument,
-           "invalid " + Narrow(ToXMLCh(attribute)) + " -- " + Narrow(text));
-  }
-  return number;
-}
-
-double ReadNumberOr(const DOMElement* element, const char16_t* attribute, double absent) {
-  return IsEmpty(Attribute(element, attribute)) ? absent : ReadNumber(element, attribute);
-}
-
 // The statistics of training that play no part in scoring.
 void CheckCounts(const DOMElement* element) {
   ReadNumberOr(element, Tags::XML_ATT_RULESET_RECOUNT, 0.0);
   ReadNumberOr(element, Tags::XML_ATT_RULESET_NBCORRECT, 0.0);
-}
-
-DOMElement* FindPredicate(const DOMElement* rule) {
-  DOMElement* predicate = nullptr;
-  for (DOMElement* child : ChildElements(rule)) {
-    if (!IsPredicate(child)) continue;
-    if (predicate != nullptr) {
-      FailAt(child, KestrelException::kStructure,
-             "<" + Narrow(rule->getTagName()) + "> has more than one predicate!");
-    }
-    predicate = child;
-  }
-  if (predicate == nullptr) {
-    FailAt(rule, KestrelException::kMissingElement, "<" + Narrow(rule->getTagName()) + "> has no predicate!");
-  }
-  return predicate;
 }
 
 }  // namespace
@@ -87,6 +43,7 @@ void RuleSetReader::Read(DOMElement* element) {
     rule_set_.default_distribution = ReadDistribution(element);
   }
   rule_set_.rules.Seal();
+  rule_set_.distributions.Seal();
 }
 
 void RuleSetReader::ReadSelection(const DOMElement* element) {
@@ -98,7 +55,7 @@ void RuleSetReader::ReadSelection(const DOMElement* element) {
   const std::string criterion =
       Narrow(BaseTranslator::GetAttributeForced(method, PMMLModelTags::XML_ATT_RULESET_RULESELECMETHOD));
   if (!FindRuleSelection(criterion, rule_set_.selection)) {
-    FailAt(method, KestrelException::kInvalidDocument, "invalid criterion -- " + criterion);
+    FailOnAttribute(method, Tags::XML_ATT_RULESET_RULESELECMETHOD, criterion);
   }
 }
 
@@ -159,14 +116,8 @@ int RuleSetReader::FindScore(const DOMElement* element, const char16_t* attribut
 }
 
 int RuleSetReader::AddRule(DOMElement* predicate, const RuleTable::Rule& rule, const std::string& id) {
-  const std::unique_ptr<ScorePredicate> read = ReadPredicate(predicate, dictionary_);
-  try {
-    return rule_set_.rules.Add(read.get(), inputs_, rule, id);
-  } catch (const KestrelException& fault) {
-    // Compiling knows variables, not elements.
-    FailAt(predicate, static_cast<KestrelException::ExceptionCode>(fault.GetErrorCode()),
-           fault.GetErrorMessage());
-  }
+  return rule_set_.rules.Add(ReadCondition(predicate, dictionary_, inputs_, rule_set_.rules.GetConditions()),
+                             rule, id);
 }
 
 void RuleSetReader::ReadDefault(DOMElement* element) {

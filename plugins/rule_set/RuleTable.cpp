@@ -1,12 +1,9 @@
 #include "plugins/rule_set/RuleTable.h"
 
-#include "plugins/support/PredicateInputs.h"
-
 namespace MCKestrel_800 {
 
-int RuleTable::Add(const ScorePredicate* predicate, PredicateInputs& inputs, const Rule& rule,
-                   std::string_view id) {
-  conditions_.push_back(parts_.Compile(predicate, inputs));
+int RuleTable::Add(const Condition& condition, const Rule& rule, std::string_view id) {
+  conditions_.push_back(condition);
   rules_.push_back(rule);
   conditions_.back().next = GetCount();
   if (rule.score != kNone) {

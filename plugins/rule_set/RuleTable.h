@@ -14,8 +14,6 @@
 
 namespace MCKestrel_800 {
 
-class PredicateInputs;
-
 /// Each `SimpleRule` and `CompoundRule` is one entry; the rules inside a compound follow it. An entry's
 /// condition knows the entry behind all that is inside, which is the next one to ask when it is not true.
 ///
@@ -34,10 +32,13 @@ class RuleTable {
     int distribution = DistributionTable::kNone;
   };
 
+  /// What the rules' conditions are compiled with.
+  ConditionTable& GetConditions() { return parts_; }
+
   /// Appends a rule and returns its number. What is added until a compound rule is closed is inside it.
-  /// predicate  may be null, which never fires; not kept. It is compiled with `inputs`.
+  /// condition  of this table's GetConditions().
   /// id         of a rule that predicts; empty: it is called "#" and its number among those, from 1.
-  int Add(const ScorePredicate* predicate, PredicateInputs& inputs, const Rule& rule, std::string_view id);
+  int Add(const Condition& condition, const Rule& rule, std::string_view id);
   void Close(int compound) { conditions_[compound].next = GetCount(); }
 
   void SetDistribution(int rule, int distribution) { rules_[rule].distribution = distribution; }

@@ -2,13 +2,13 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <memory>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
-#include "kestrel/dictionary/DictVar.h"
+#include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/dictionary/ValueProbability.h"
 #include "kestrel/dictionary/ValueProbabilitySet.h"

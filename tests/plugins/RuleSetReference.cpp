@@ -2,7 +2,7 @@
 
 #include <algorithm>
 #include <cstdio>
-#include <iterator>
+#include <initializer_list>
 
 namespace kestrel_tests {
 namespace {
