@@ -47,6 +47,8 @@
 #include "kestrel/foundation/PliantTranscoder.h"
 #include "kestrel/foundation/ScoreValue.h"
 #include "kestrel/foundation/StringValue.h"
+#include "kestrel/math/MCDistFun.h"
+#include "kestrel/math/MCPower.h"
 #include "kestrel/model/BaseModel.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ModelFinder.h"
