@@ -38,7 +38,7 @@ void CodeMap::InsertRun(int first, int last, int child) {
   while (next <= last) {
     const auto below = RunBelow(next);
     if (below != runs_.end() && next <= below->second.last) {
-      next = std::floor(below->second.last) + 1;
+      next = below->second.last + 1;
       continue;
     }
     const bool isTop = below == runs_.begin();

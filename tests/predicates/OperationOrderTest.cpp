@@ -4,6 +4,8 @@
 
 #include <vector>
 
+#include "kestrel/predicates/ScorePredicate.h"
+#include "kestrel/predicates/ScoreSplitVar.h"
 #include "kestrel/predicates/ScoreValueRange.h"
 #include "tests/support/OperationNumber.h"
 
@@ -30,6 +32,44 @@ TEST(OperationOrder, OfRanges) {
       OperationNumber(&ScoreValueRange::GetHighEnd),
       OperationNumber(&ScoreValueRange::GetLowEnd),
       OperationNumber(&ScoreValueRange::Display),
+  };
+  EXPECT_EQ(numbers, InOrder(numbers.size()));
+}
+
+TEST(OperationOrder, OfSplits) {
+  using OfNumber = int (ScoreSplitVar::*)(double) const;
+  using OfValue = int (ScoreSplitVar::*)(const ScoreValue*) const;
+  const std::vector<long> numbers = {
+      OperationNumber(&ScoreSplitVar::Clone),
+      OperationNumber(&ScoreSplitVar::SetSplitVar),
+      OperationNumber(&ScoreSplitVar::SetMissvalMap),
+      OperationNumber(&ScoreSplitVar::GetSplitVar),
+      OperationNumber(&ScoreSplitVar::GetSplitName),
+      OperationNumber(&ScoreSplitVar::GetSplitLabel),
+      OperationNumber(&ScoreSplitVar::GetSplitType),
+      OperationNumber(&ScoreSplitVar::GetSplitVarType),
+      OperationNumber(&ScoreSplitVar::GetSplitMLevel),
+      OperationNumber(&ScoreSplitVar::GetMissvalMap),
+      OperationNumber(static_cast<OfNumber>(&ScoreSplitVar::GetSplitChildIndex)),
+      OperationNumber(static_cast<OfValue>(&ScoreSplitVar::GetSplitChildIndex)),
+      OperationNumber(&ScoreSplitVar::Display),
+  };
+  EXPECT_EQ(numbers, InOrder(numbers.size()));
+}
+
+TEST(OperationOrder, OfPredicates) {
+  using Result = ScorePredicate::PredicateResult;
+  using OfVector = Result (ScorePredicate::*)(const std::vector<double>&) const;
+  using OfRecords = Result (ScorePredicate::*)(const ScoreCaseRecord*, const ScoreCaseRecord*) const;
+  const std::vector<long> numbers = {
+      OperationNumber(&ScorePredicate::Clone),
+      OperationNumber(static_cast<OfVector>(&ScorePredicate::Evaluate)),
+      OperationNumber(static_cast<OfRecords>(&ScorePredicate::Evaluate)),
+      OperationNumber(&ScorePredicate::GetPredType),
+      OperationNumber(&ScorePredicate::IsDerivedPredictor),
+      OperationNumber(&ScorePredicate::SetSplit),
+      OperationNumber(&ScorePredicate::GetSplit),
+      OperationNumber(&ScorePredicate::Display),
   };
   EXPECT_EQ(numbers, InOrder(numbers.size()));
 }

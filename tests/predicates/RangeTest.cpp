@@ -104,6 +104,7 @@ TEST(Range, TakesAMissingMinimumButNotMaximumForAnInfinity) {
   EXPECT_EQ(range.GetMax()->GetDouble(), kSysmis);
   EXPECT_FALSE(range.IsInRange(0.0));
   EXPECT_FALSE(range.IsInRange(-1e307)) << "nothing lies below a missing maximum";
+  EXPECT_FALSE(range.IsInRange(kSysmis)) << "nor is it inside, though its end is included";
 }
 
 TEST(Range, OneMissingObjectForBothEndsHoldsNothing) {
