@@ -1,18 +1,29 @@
 #include "plugins/tree/TreeWalker.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace MCKestrel_800 {
 
+namespace {
+
 using Result = ScorePredicate::PredicateResult;
+
+/// Whether shares can be taken of a sum of record counts.
+bool IsWeight(double total) {
+  return total > 0.0 && std::isfinite(total);
+}
+
+}  // namespace
 
 TreeWalker::TreeWalker(const Tree& tree)
     : tree_(tree), is_root_true_(tree.table.GetCondition(0).kind == Condition::kAlways) {
   const std::size_t votes =
       tree.options.is_classification ? static_cast<std::size_t>(tree.categories.GetCount()) : 1;
   votes_.resize(votes);
-  const auto depth = static_cast<std::size_t>(tree.table.GetDepth());
-  if (tree.options.strategy == MissingValueStrategy::kWeightedConfidence) room_.resize(votes * depth);
+  if (tree.options.strategy == MissingValueStrategy::kWeightedConfidence) {
+    branches_.reserve(static_cast<std::size_t>(tree.table.GetCount()));
+  }
 }
 
 TreeWalker::End TreeWalker::Walk(const double* values) {
@@ -47,17 +58,20 @@ TreeWalker::End TreeWalker::Start(const double* values) {
   }
   // The substitutes on the single branches are not counted.
   const int substitutions = substitutions_;
+  std::fill(votes_.begin(), votes_.end(), 0.0);
   bool has_votes = false;
   if (tree_.options.strategy == MissingValueStrategy::kWeightedConfidence) {
-    has_votes = WeighChildren<kNotesPath>(node_, values, votes_.data(), room_.data());
+    branches_.assign(1, {kFork, 0, 1.0, 0.0});
+    has_votes = WeighChildren<kNotesPath>(node_, values, 0);
+    if (has_votes) AddBranches();
   } else {
-    std::fill(votes_.begin(), votes_.end(), 0.0);
     records_ = 0.0;
     AggregateChildren<kNotesPath>(node_, values);
     has_votes = ShareOut();
   }
   substitutions_ = substitutions;
-  return has_votes ? End::kSeveral : End::kNoPrediction;
+  // A mean of numbers may be too large for one.
+  return has_votes && std::isfinite(votes_[0]) ? End::kSeveral : End::kNoPrediction;
 }
 
 /// Takes a case from a node that it has come to as far down as one node after the other applies.
@@ -95,51 +109,60 @@ TreeWalker::Stop TreeWalker::Follow(int& node, const double* values) {
   }
 }
 
-/// The votes of a subtree; false when it has no prediction. `room` is for the levels below.
+/// Follows a branch to what predicts; false when nothing does.
 template <bool kNotesPath>
-bool TreeWalker::Weigh(int node, const double* values, double* votes, double* room) {
+bool TreeWalker::Weigh(int node, const double* values, std::size_t branch) {
   switch (Follow<kNotesPath>(node, values)) {
     case Stop::kPredicts:
-      if (!tree_.scores.HasScore(node)) return false;
-      SetVotes(node, votes);
-      return true;
+      branches_[branch].node = node;
+      return tree_.scores.HasScore(node);
     case Stop::kNothing:
       return false;
     default:
-      return WeighChildren<kNotesPath>(node, values, votes, room);
+      return WeighChildren<kNotesPath>(node, values, branch);
   }
 }
 
+/// Makes branches of the children that are not false and predict; false when these have no weight together.
 template <bool kNotesPath>
-bool TreeWalker::WeighChildren(int node, const double* values, double* votes, double* room) {
+bool TreeWalker::WeighChildren(int node, const double* values, std::size_t fork) {
   const TreeTable& table = tree_.table;
-  const std::size_t count = votes_.size();
-  std::fill_n(votes, count, 0.0);
   double total = 0.0;
   for (int child = table.FirstChild(node); child != table.NodeAfter(node); child = table.NodeAfter(child)) {
     if (Test(child, values) == ScorePredicate::PredFalse) continue;
-    if (!Weigh<kNotesPath>(child, values, room, room + count)) continue;
+    const std::size_t branch = branches_.size();
     const double weight = tree_.scores.GetRecordCount(child);
-    total += weight;
-    for (std::size_t i = 0; i < count; ++i)
-      votes[i] += weight * room[i];
+    branches_.push_back({kFork, static_cast<std::uint32_t>(fork), weight, 0.0});
+    if (Weigh<kNotesPath>(child, values, branch)) {
+      total += weight;
+    } else {
+      branches_.resize(branch);
+    }
   }
-  if (!(total > 0.0)) return false;
-  for (std::size_t i = 0; i < count; ++i)
-    votes[i] /= total;
-  return true;
+  branches_[fork].total = total;
+  return IsWeight(total);
 }
 
-void TreeWalker::SetVotes(int node, double* votes) const {
+/// Adds up the votes. Only here is it known what each fork weighs in all, and every branch stands behind its
+/// fork, so one look at each is enough, however deep they lie.
+void TreeWalker::AddBranches() {
+  for (std::size_t i = 1; i < branches_.size(); ++i) {
+    Branch& branch = branches_[i];
+    const Branch& fork = branches_[branch.fork];
+    branch.weight = branch.weight / fork.total * fork.weight;
+    if (branch.node != kFork) AddVotes(branch.node, branch.weight);
+  }
+}
+
+void TreeWalker::AddVotes(int node, double weight) {
   const NodeScores& scores = tree_.scores;
   if (!tree_.options.is_classification) {
-    votes[0] = scores.GetNumber(node);
+    votes_[0] += weight * scores.GetNumber(node);
     return;
   }
-  std::fill_n(votes, votes_.size(), 0.0);
-  if (!scores.HasDistribution(node)) votes[scores.GetWinner(node)] = 1.0;
+  if (!scores.HasDistribution(node)) votes_[static_cast<std::size_t>(scores.GetWinner(node))] += weight;
   for (const CategoryShare* share = scores.FirstShare(node); share != scores.EndOfShares(node); ++share)
-    votes[share->category] = share->confidence;
+    votes_[static_cast<std::size_t>(share->category)] += weight * share->confidence;
 }
 
 template <bool kNotesPath>
@@ -176,9 +199,9 @@ void TreeWalker::AddRecords(int node) {
   }
 }
 
-/// Turns counted records into shares; false when there are none.
+/// Turns counted records into shares; false when there are none, or more than a number holds.
 bool TreeWalker::ShareOut() {
-  if (!(records_ > 0.0)) return false;
+  if (!IsWeight(records_)) return false;
   for (double& vote : votes_)
     vote /= records_;
   return true;

@@ -3,6 +3,8 @@
 #ifndef KESTREL_PLUGINS_TREE_TREEWALKER_H
 #define KESTREL_PLUGINS_TREE_TREEWALKER_H
 
+#include <cstddef>
+#include <cstdint>
 #include <vector>
 
 #include "kestrel/predicates/ScorePredicate.h"
@@ -46,6 +48,15 @@ class TreeWalker {
     kFork       ///< all children that are not false are to be followed
   };
 
+  /// A child that has a say in a prediction of weighted confidences.
+  struct Branch {
+    int node;            ///< that predicts; kFork when further branches predict in its place
+    std::uint32_t fork;  ///< the branch that this one is a part of
+    double weight;       ///< its record count, and in the end its part of the whole
+    double total;        ///< of a fork: the record counts of its branches
+  };
+  static constexpr int kFork = -1;
+
   ScorePredicate::PredicateResult Test(int node, const double* values) const {
     return tree_.conditions.Evaluate(tree_.table.GetCondition(node), values);
   }
@@ -54,15 +65,16 @@ class TreeWalker {
   template <bool kNotesPath>
   Stop Follow(int& node, const double* values);
   template <bool kNotesPath>
-  bool Weigh(int node, const double* values, double* votes, double* room);
+  bool Weigh(int node, const double* values, std::size_t branch);
   template <bool kNotesPath>
-  bool WeighChildren(int node, const double* values, double* votes, double* room);
+  bool WeighChildren(int node, const double* values, std::size_t fork);
+  void AddBranches();
   template <bool kNotesPath>
   void Aggregate(int node, const double* values);
   template <bool kNotesPath>
   void AggregateChildren(int node, const double* values);
   bool ShareOut();
-  void SetVotes(int node, double* votes) const;
+  void AddVotes(int node, double weight);
   void AddRecords(int node);
 
   const Tree& tree_;
@@ -70,8 +82,9 @@ class TreeWalker {
   int node_ = 0;
   int substitutions_ = 0;
   std::vector<double> votes_;
-  double records_ = 0.0;      ///< that aggregated nodes have together
-  std::vector<double> room_;  ///< for weighted confidences: as many votes for each level of the tree
+  double records_ = 0.0;  ///< that aggregated nodes have together
+  /// What predicts below a fork, in document order, with the forks in between; the first one is all of it.
+  std::vector<Branch> branches_;
   std::vector<int> path_;
 };
 
