@@ -23,8 +23,7 @@
 #include "plugins/support/CaseVector.h"
 #include "plugins/support/MiningSchema.h"
 #include "plugins/support/PredicateInputs.h"
-#include "plugins/support/PredicateReader.h"
-#include "tests/support/DictionaryText.h"
+#include "tests/plugins/TreePredicates.h"
 #include "tests/support/ExpectFault.h"
 
 namespace kestrel_tests {
@@ -71,7 +70,7 @@ class Inputs {
   }
 
   std::unique_ptr<ScorePredicate> Read(const std::string& text) const {
-    return ReadPredicate(kestrel_test::ReadTree(text)->GetRoot(), *dictionary_);
+    return ReadAnyPredicate(kestrel_test::ReadTree(text)->GetRoot(), *dictionary_);
   }
   Condition Compile(const ScorePredicate* predicate) { return table.Compile(predicate, *inputs_); }
   const ScoreDictVar& Variable(const std::string& name) const { return *dictionary_->GetVar(name); }

@@ -255,6 +255,27 @@ TEST(TreeMissing, JoinedNumbersAreWeightedMeans) {
   }
 }
 
+TEST(TreeMissing, JoinedNumbersThatNoNumberHoldsAreNone) {
+  const struct {
+    const char* why;
+    const char* strategy;
+    const char* leaf;  ///< the attributes of each of two
+    const char* want;
+  } kRows[] = {
+      {"record counts whose sum is too large", "weightedConfidence", "score='1' recordCount='1e308'",
+       "90027"},
+      {"the same, added up", "aggregateNodes", "score='1' recordCount='1e308'", "90027"},
+      {"a product that is too large", "aggregateNodes", "score='1e200' recordCount='1e200'", "90027"},
+      {"a mean needs no such product", "weightedConfidence", "score='1e200' recordCount='1e200'", "1e+200 -"},
+  };
+  for (const auto& row : kRows) {
+    const auto model =
+        BuildEstimator(std::string("missingValueStrategy='") + row.strategy + "'",
+                       Node("", "<True/>" + Node(row.leaf, Is("g", "a")) + Node(row.leaf, Is("g", "b"))));
+    EXPECT_EQ(ScoreOf(*model, {}), row.want) << row.why;
+  }
+}
+
 // ---- The penalty.
 
 /// A split on x with z standing in for it.

@@ -14,6 +14,7 @@
 
 #include "kestrel/dictionary/ScoreDictionary.h"
 #include "plugins/support/PredicateReader.h"
+#include "tests/plugins/TreePredicates.h"
 #include "tests/plugins/TreeText.h"
 
 namespace kestrel_tests {
@@ -185,7 +186,7 @@ PlainNode ReadPlainNode(xercesc::DOMElement* element, const ScoreDictionary& dic
   node.default_child = AttributeOf(element, u"defaultChild");
   for (xercesc::DOMElement* child : ChildElements(element)) {
     if (IsPredicate(child)) {
-      node.predicate = ReadPredicate(child, dictionary);
+      node.predicate = ReadAnyPredicate(child, dictionary);
     } else {
       node.children.push_back(ReadPlainNode(child, dictionary));
     }
