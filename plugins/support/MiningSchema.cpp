@@ -10,6 +10,7 @@
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
+#include "plugins/support/Attributes.h"
 
 namespace MCKestrel_800 {
 namespace {
@@ -19,13 +20,6 @@ using Tags = PMMLTagText;
 
 // The attributes that the table of names does not list.
 constexpr char16_t kInvalidValueReplacement[] = u"invalidValueReplacement";
-
-/// One word of a vocabulary with its meaning.
-template <typename T>
-struct Word {
-  const char* text;
-  T meaning;
-};
 
 constexpr Word<ScoreModel::VarRole> kUsageTypes[] = {
     {"active", ScoreModel::kPredictor},
@@ -98,13 +92,9 @@ class FieldReader {
     const XMLCh* found = FindAttribute(element_, attribute);
     if (found == nullptr) return;
     const std::string text = Narrow(found);
-    for (const Word<T>& word : vocabulary) {
-      if (text == word.text) {
-        meaning = word.meaning;
-        return;
-      }
-    }
-    Refuse(KestrelException::kInvalidDocument, attribute, text);
+    const Word<T>* const word = FindWord(vocabulary, text);
+    if (word == nullptr) Refuse(KestrelException::kInvalidDocument, attribute, text);
+    meaning = word->meaning;
   }
 
   [[noreturn]] void Refuse(KestrelException::ExceptionCode code, const char16_t* attribute,

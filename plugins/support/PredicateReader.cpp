@@ -2,9 +2,14 @@
 
 #include <xercesc/dom/DOMElement.hpp>
 
+#include <memory>
+#include <string>
+
+#include "kestrel/foundation/KestrelException.h"
 #include "kestrel/predicates/ConstantPredicates.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
+#include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
 
 namespace MCKestrel_800 {
@@ -52,8 +57,33 @@ bool IsPredicate(const DOMElement* element) {
   return FindKind(element) != nullptr;
 }
 
-std::unique_ptr<ScorePredicate> ReadPredicate(DOMElement* element, const ScoreDictionary& dictionary) {
-  return std::unique_ptr<ScorePredicate>(FindKind(element)->read(element, &dictionary));
+DOMElement* FindPredicate(const DOMElement* element) {
+  DOMElement* predicate = nullptr;
+  for (DOMElement* child : ChildElements(element)) {
+    if (!IsPredicate(child)) continue;
+    if (predicate != nullptr) {
+      FailAt(child, KestrelException::kStructure,
+             "<" + Narrow(element->getTagName()) + "> has more than one predicate!");
+    }
+    predicate = child;
+  }
+  if (predicate == nullptr) {
+    FailAt(element, KestrelException::kMissingElement,
+           "<" + Narrow(element->getTagName()) + "> has no predicate!");
+  }
+  return predicate;
+}
+
+Condition ReadCondition(DOMElement* predicate, const ScoreDictionary& dictionary, PredicateInputs& inputs,
+                        ConditionTable& conditions) {
+  const std::unique_ptr<ScorePredicate> object(FindKind(predicate)->read(predicate, &dictionary));
+  try {
+    return conditions.Compile(object.get(), inputs);
+  } catch (const KestrelException& fault) {
+    // Compiling knows variables, not elements.
+    FailAt(predicate, static_cast<KestrelException::ExceptionCode>(fault.GetErrorCode()),
+           fault.GetErrorMessage());
+  }
 }
 
 }  // namespace MCKestrel_800

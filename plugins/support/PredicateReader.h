@@ -1,13 +1,11 @@
-// The predicate child of a tree's node or a rule.
+// The predicate of a tree's node or a rule.
 
 #ifndef KESTREL_PLUGINS_SUPPORT_PREDICATEREADER_H
 #define KESTREL_PLUGINS_SUPPORT_PREDICATEREADER_H
 
 #include <xercesc/util/XercesDefs.hpp>
 
-#include <memory>
-
-#include "kestrel/predicates/ScorePredicate.h"
+#include "plugins/support/ConditionTable.h"
 
 XERCES_CPP_NAMESPACE_BEGIN
 class DOMElement;
@@ -15,15 +13,21 @@ XERCES_CPP_NAMESPACE_END
 
 namespace MCKestrel_800 {
 
+class PredicateInputs;
 class ScoreDictionary;
 
 /// Whether the element is one of the five predicates.
 bool IsPredicate(const xercesc::DOMElement* element);
 
-/// Reads a predicate element; ordinal numbers are compared by the positions of their categories. Null for a
-/// compound of nothing. Errors: those of PMMLTranslator's readers.
-std::unique_ptr<ScorePredicate> ReadPredicate(xercesc::DOMElement* element,
-                                              const ScoreDictionary& dictionary);
+/// The one predicate among the children of an element. Errors: code 1, at the second one, when there are two;
+/// code 4 when there is none.
+xercesc::DOMElement* FindPredicate(const xercesc::DOMElement* element);
+
+/// Reads a predicate element and compiles it; ordinal numbers are compared by the positions of their
+/// categories. Errors: those of PMMLTranslator's predicate readers, and code 8, at the predicate, for a field
+/// that is not an active field of the mining schema.
+Condition ReadCondition(xercesc::DOMElement* predicate, const ScoreDictionary& dictionary,
+                        PredicateInputs& inputs, ConditionTable& conditions);
 
 }  // namespace MCKestrel_800
 

@@ -3,7 +3,6 @@
 #include <xercesc/dom/DOMElement.hpp>
 
 #include <algorithm>
-#include <cmath>
 
 #include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
@@ -11,6 +10,7 @@
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
+#include "plugins/support/Attributes.h"
 #include "plugins/support/PredicateReader.h"
 
 namespace MCKestrel_800 {
@@ -21,65 +21,29 @@ using Tags = PMMLTagText;
 
 constexpr double kNoNumber = NumericValue::gSysmisValue;
 
-/// A finite number, or system-missing when the attribute is absent or empty.
-double ReadNumber(const DOMElement* element, const char16_t* attribute) {
-  const XMLCh* text = FindAttribute(element, attribute);
-  if (IsEmpty(text)) return kNoNumber;
-  double number = 0.0;
-  try {
-    number = BaseTranslator::VerifyDouble(text);
-  } catch (const KestrelException& fault) {
-    // The same words, with the place that the conversion does not know.
-    FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
-  }
-  if (!std::isfinite(number)) {
-    FailAt(element, KestrelException::kInvalidDocument,
-           "invalid " + Narrow(ToXMLCh(attribute)) + " -- " + Narrow(text));
-  }
-  return number;
-}
-
 double ReadRecordCount(const DOMElement* element) {
-  const double count = ReadNumber(element, Tags::XML_ATT_RECORDCOUNT);
+  const double count = ReadNumberOr(element, Tags::XML_ATT_RECORDCOUNT, kNoNumber);
   if (count < 0.0 && count != kNoNumber) {
-    FailAt(element, KestrelException::kInvalidDocument,
-           "invalid recordCount -- " + AttributeText(element, Tags::XML_ATT_RECORDCOUNT));
+    FailOnAttribute(element, Tags::XML_ATT_RECORDCOUNT, AttributeText(element, Tags::XML_ATT_RECORDCOUNT));
   }
   return count;
-}
-
-/// Elements that producers add for themselves.
-bool IsExtension(const DOMElement* element) {
-  const XMLCh* name = element->getTagName();
-  return ElementIs(element, Tags::XML_ELE_EXTENSION) ||
-         ((name[0] == u'X' || name[0] == u'x') && name[1] == u'-');
 }
 
 bool IsEmbeddedModel(const DOMElement* element) {
   return ElementIs(element, Tags::XML_ELE_REGRESSION) || ElementIs(element, Tags::XML_ELE_DECISIONTREE);
 }
 
-/// The predicate of a node, after a look at all of its children.
-DOMElement* FindPredicate(const DOMElement* element) {
-  DOMElement* predicate = nullptr;
+void CheckChildren(const DOMElement* element) {
   for (DOMElement* child : ChildElements(element)) {
     if (ElementIs(child, Tags::XML_ELE_NODE) || ElementIs(child, Tags::XML_ELE_SCOREDISTRIBUTION)) continue;
-    if (IsPredicate(child)) {
-      if (predicate != nullptr) {
-        FailAt(child, KestrelException::kStructure, "<Node> has more than one predicate!");
-      }
-      predicate = child;
-    } else if (IsEmbeddedModel(child)) {
+    if (IsEmbeddedModel(child)) {
       FailAt(child, KestrelException::kUnsupported,
              Narrow(child->getTagName()) + " in <Node>: Not supported!");
-    } else if (!IsExtension(child) && !ElementIs(child, Tags::XML_ELE_PARTITION)) {
+    }
+    if (!IsPredicate(child) && !IsExtension(child) && !ElementIs(child, Tags::XML_ELE_PARTITION)) {
       FailAt(child, KestrelException::kStructure, Narrow(child->getTagName()) + ": Invalid element!");
     }
   }
-  if (predicate == nullptr) {
-    FailAt(element, KestrelException::kMissingElement, "<Node> has no predicate!");
-  }
-  return predicate;
 }
 
 [[noreturn]] void FailOnMissing(const DOMElement* element, const char* what, const TreeOptions& options) {
@@ -111,7 +75,8 @@ void NodeReader::Read(DOMElement* root) {
 }
 
 int NodeReader::OpenNode(DOMElement* element) {
-  const Condition condition = CompilePredicate(element, FindPredicate(element));
+  CheckChildren(element);
+  const Condition condition = ReadCondition(FindPredicate(element), dictionary_, inputs_, tree_.conditions);
   NodeScores::Node node;
   const std::string id = AttributeText(element, Tags::XML_VAL_NAME_ID);
   node.id = id;
@@ -122,20 +87,10 @@ int NodeReader::OpenNode(DOMElement* element) {
     const XMLCh* score = FindAttribute(element, Tags::XML_ATT_SCORE);
     if (score != nullptr) node.winner = tree_.categories.Find(element, Narrow(score));
   } else {
-    node.number = ReadNumber(element, Tags::XML_ATT_SCORE);
+    node.number = ReadNumberOr(element, Tags::XML_ATT_SCORE, kNoNumber);
   }
   tree_.scores.Add(node, shares_);
   return tree_.table.Open(condition);
-}
-
-Condition NodeReader::CompilePredicate(DOMElement* element, DOMElement* predicate) {
-  const std::unique_ptr<ScorePredicate> object = ReadPredicate(predicate, dictionary_);
-  try {
-    return tree_.conditions.Compile(object.get(), inputs_);
-  } catch (const KestrelException& fault) {
-    FailAt(predicate != nullptr ? predicate : element,
-           static_cast<KestrelException::ExceptionCode>(fault.GetErrorCode()), fault.GetErrorMessage());
-  }
 }
 
 // The winner is the category with the most records, the first among equals.

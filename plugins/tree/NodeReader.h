@@ -46,7 +46,6 @@ class NodeReader {
  private:
   int OpenNode(xercesc::DOMElement* element);
   void CloseNode(xercesc::DOMElement* element, int node);
-  Condition CompilePredicate(xercesc::DOMElement* element, xercesc::DOMElement* predicate);
   void ReadDistribution(xercesc::DOMElement* element, NodeScores::Node& node);
   void SortDistribution(const xercesc::DOMElement* element);
   void CheckLeaf(const xercesc::DOMElement* element, int node) const;

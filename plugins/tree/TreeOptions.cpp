@@ -2,13 +2,9 @@
 
 #include <xercesc/dom/DOMElement.hpp>
 
-#include <string>
-
-#include "kestrel/foundation/KestrelException.h"
-#include "kestrel/translate/BaseTranslator.h"
 #include "kestrel/translate/PMMLModelTags.h"
-#include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
+#include "plugins/support/Attributes.h"
 
 namespace MCKestrel_800 {
 namespace {
@@ -19,12 +15,6 @@ using Tags = PMMLTagText;
 
 // The attribute that the table of names does not list.
 constexpr char16_t kSplitCharacteristic[] = u"splitCharacteristic";
-
-template <typename T>
-struct Word {
-  const char* text;
-  T meaning;
-};
 
 // In the order of the enumeration.
 constexpr Word<MissingValueStrategy> kStrategies[] = {
@@ -50,29 +40,16 @@ void ReadWord(const DOMElement* element, const char16_t* attribute, const Word<T
               T& meaning) {
   const XMLCh* found = FindAttribute(element, attribute);
   if (found == nullptr) return;
-  const std::string text = Narrow(found);
-  for (const Word<T>& word : vocabulary) {
-    if (text == word.text) {
-      meaning = word.meaning;
-      return;
-    }
-  }
-  FailAt(element, KestrelException::kInvalidDocument,
-         "invalid " + Narrow(ToXMLCh(attribute)) + " -- " + text);
+  const Word<T>* const word = FindWord(vocabulary, Narrow(found));
+  if (word == nullptr) FailOnAttribute(element, attribute, Narrow(found));
+  meaning = word->meaning;
 }
 
 double ReadPenalty(const DOMElement* element) {
-  const XMLCh* text = FindAttribute(element, Tags::XML_ATT_MISSINGVALUEPENALTY);
-  if (IsEmpty(text)) return 1.0;
-  double penalty = 1.0;
-  try {
-    penalty = BaseTranslator::VerifyDouble(text);
-  } catch (const KestrelException& fault) {
-    // The same words, with the place that the conversion does not know.
-    FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
-  }
+  const double penalty = ReadNumberOr(element, Tags::XML_ATT_MISSINGVALUEPENALTY, 1.0);
   if (!(penalty >= 0.0 && penalty <= 1.0)) {
-    FailAt(element, KestrelException::kInvalidDocument, "invalid missingValuePenalty -- " + Narrow(text));
+    FailOnAttribute(element, Tags::XML_ATT_MISSINGVALUEPENALTY,
+                    AttributeText(element, Tags::XML_ATT_MISSINGVALUEPENALTY));
   }
   return penalty;
 }
