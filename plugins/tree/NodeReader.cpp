@@ -46,7 +46,7 @@ void CheckChildren(const DOMElement* element) {
   }
 }
 
-[[noreturn]] void FailOnMissing(const DOMElement* element, const char* what, const TreeOptions& options) {
+[[noreturn]] void NodeLacks(const DOMElement* element, const char* what, const TreeOptions& options) {
   FailAt(element, KestrelException::kMissingElement,
          std::string(what) + " is required for missingValueStrategy " + options.GetStrategyText() + "!");
 }
@@ -134,7 +134,7 @@ void NodeReader::CloseNode(DOMElement* element, int node) {
   tree_.table.Close(node);
   const TreeOptions& options = tree_.options;
   if (Tree::NeedsRecordCounts(options) && tree_.scores.GetRecordCount(node) == kNoNumber && node != 0) {
-    FailOnMissing(element, "recordCount", options);
+    NodeLacks(element, "recordCount", options);
   }
   if (tree_.table.IsLeaf(node)) {
     CheckLeaf(element, node);
@@ -150,13 +150,13 @@ void NodeReader::CheckLeaf(const DOMElement* element, int node) const {
   const TreeOptions& options = tree_.options;
   if (options.strategy == MissingValueStrategy::kAggregateNodes && options.is_classification &&
       !tree_.scores.HasDistribution(node)) {
-    FailOnMissing(element, "ScoreDistribution", options);
+    NodeLacks(element, "ScoreDistribution", options);
   }
 }
 
 void NodeReader::FindDefaultChild(const DOMElement* element, int node) {
   const std::string wanted = AttributeText(element, Tags::XML_ATT_DEFAULTCHILD);
-  if (wanted.empty()) FailOnMissing(element, "defaultChild", tree_.options);
+  if (wanted.empty()) NodeLacks(element, "defaultChild", tree_.options);
   const TreeTable& table = tree_.table;
   for (int child = table.FirstChild(node); child != table.NodeAfter(node); child = table.NodeAfter(child)) {
     if (tree_.scores.GetId(child) != wanted) continue;
