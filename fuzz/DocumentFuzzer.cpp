@@ -1,6 +1,7 @@
 // Bytes as a whole document: either a proper refusal, or a model that scores.
 
 #include <cstdint>
+#include <iterator>
 #include <memory>
 #include <sstream>
 #include <string>
@@ -17,6 +18,7 @@
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
 #include "kestrel/model/ModelFactory.h"
+#include "kestrel/model/ResultEntities.h"
 #include "kestrel/model/ScoreModel.h"
 #include "kestrel/model/ScoreResult.h"
 
@@ -24,6 +26,8 @@ namespace {
 
 using namespace MCKestrel_800;
 using kestrel_fuzz::Check;
+
+const char* const kKinds[] = {"RegressionModel", "TreeModel", "RuleSetModel"};
 
 /// A new value of the variable's storage kind.
 ScoreValue* MakeValue(const ScoreDictVar& variable) {
@@ -58,6 +62,8 @@ std::string Answer(MCScore::MCStatus status, const ScoreResult& result) {
 void ScoreTwice(ScoreModel& model, const CaseRecord& record) {
   const std::unique_ptr<ScoreResult> result(model.MakeResult());
   Check(result != nullptr, "a model makes results");
+  ResultEntities* const entities = ResultEntities::Of(result.get());
+  if (entities != nullptr) entities->SetPathWanted(true);
   const MCScore::MCStatus first = model.Score(&record, result.get());
   const std::string answer = Answer(first, *result);
   const MCScore::MCStatus second = model.Score(&record, result.get());
@@ -69,7 +75,8 @@ void ScoreTwice(ScoreModel& model, const CaseRecord& record) {
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
   std::istringstream in(std::string(reinterpret_cast<const char*>(data), size));
   try {
-    const std::unique_ptr<ScoreModel> model(ModelFactory::MakeModelFromXML(in, {"RegressionModel"}, ""));
+    const std::unique_ptr<ScoreModel> model(
+        ModelFactory::MakeModelFromXML(in, {std::begin(kKinds), std::end(kKinds)}, ""));
     Check(model != nullptr, "a document that is not refused gives a model");
     ScoreTwice(*model, CaseRecord());
     for (const bool firstCategories : {false, true}) {
@@ -86,8 +93,11 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
   return 0;
 }
 
-/// Opens the model library before the first case: libFuzzer counts only code that is there when it starts.
+/// Opens the model libraries before the first case: libFuzzer counts only code that is there when it starts.
 extern "C" int LLVMFuzzerInitialize(int*, char***) {
-  const std::string document = "<PMML><RegressionModel/></PMML>";
-  return LLVMFuzzerTestOneInput(reinterpret_cast<const uint8_t*>(document.data()), document.size());
+  for (const char* kind : kKinds) {
+    const std::string document = "<PMML><" + std::string(kind) + "/></PMML>";
+    LLVMFuzzerTestOneInput(reinterpret_cast<const uint8_t*>(document.data()), document.size());
+  }
+  return 0;
 }
