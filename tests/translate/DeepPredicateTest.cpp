@@ -23,7 +23,8 @@ using kestrel_test::RunOnStack;
 using kestrel_tests::Repeat;
 using namespace MCKestrel_800;
 
-constexpr size_t kStacks[] = {size_t{1} << 20, size_t{8} << 20};
+// The first leaves each level one kilobyte, beside what lies below the predicate.
+constexpr size_t kStacks[] = {size_t{640} << 10, size_t{1} << 20, size_t{8} << 20};
 
 /// Predicates `depth` elements deep: compounds around a simple predicate on "num". With a neighbour at each
 /// level none of the compounds can be left out.
