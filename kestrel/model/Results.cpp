@@ -28,7 +28,9 @@ void ResultValue::Assign(const ScoreValue& value) {
     Assign(number->GetDouble());
   } else if (const StringValue* text = AsExactly<StringValue>(value)) {
     const auto* const held = std::get_if<StringValue>(&held_);
-    if (held == nullptr || held->GetText() != text->GetText()) held_ = *text;
+    const bool is_there =
+        held != nullptr && held->GetLength() == text->GetLength() && held->GetText() == text->GetText();
+    if (!is_there) held_ = *text;
   } else if (const DateTimeValue* moment = AsExactly<DateTimeValue>(value)) {
     held_ = *moment;
   } else {

@@ -53,8 +53,28 @@ TYPED_TEST(EntitiesOfResult, AreFoundFromTheInterface) {
 
 TYPED_TEST(EntitiesOfResult, AreNoneAtFirst) {
   EXPECT_FALSE(this->entities_.IsPathWanted());
+  EXPECT_FALSE(this->entities_.IsDecidingIdWanted());
   EXPECT_EQ(this->entities_.GetDecidingId(), "");
   EXPECT_EQ(this->entities_.GetPathLength(), 0u);
+}
+
+TYPED_TEST(EntitiesOfResult, AreToldOnRequest) {
+  const struct {
+    bool deciding_id_wanted, path_wanted, tells_deciding_id, tells_path;
+    const char* why;
+  } rows[] = {
+      {false, false, false, false, "names cost time"},
+      {true, false, true, false, "the deciding one alone"},
+      {false, true, true, true, "the deciding one is told with the path"},
+      {true, true, true, true, "both"},
+  };
+  for (const auto& row : rows) {
+    this->entities_.SetDecidingIdWanted(row.deciding_id_wanted);
+    this->entities_.SetPathWanted(row.path_wanted);
+    this->result_.Reset();
+    EXPECT_EQ(this->entities_.IsDecidingIdWanted(), row.tells_deciding_id) << row.why;
+    EXPECT_EQ(this->entities_.IsPathWanted(), row.tells_path) << row.why;
+  }
 }
 
 TYPED_TEST(EntitiesOfResult, AreForgottenByReset) {

@@ -77,6 +77,16 @@ TYPED_TEST(AnyResult, HoldsValuesOfEveryKindInTurn) {
   EXPECT_EQ(static_cast<const DateTimeValue*>(result.GetPrediction())->GetDateTimeType(), kTimeVal);
 }
 
+TYPED_TEST(AnyResult, TakesTheDeclaredWidthOfATextThatItHoldsAlready) {
+  auto& result = this->result_;
+  StringValue text("yes");
+  for (const int width : {3, 8, 0}) {
+    text.SetLength(width);
+    result.SetPrediction(&text);
+    EXPECT_EQ(static_cast<const StringValue*>(result.GetPrediction())->GetLength(), width);
+  }
+}
+
 TYPED_TEST(AnyResult, ClearsThePredictionForNull) {
   auto& result = this->result_;
   const StringValue text("yes");
@@ -120,6 +130,22 @@ TEST(ClsResult, IsOfKind0) {
 
 TEST(RegResult, IsOfKind1) {
   EXPECT_EQ(RegResult().GetResultKind(), 1);
+}
+
+TEST(RegResult, TakesANumberWithoutAValueObject) {
+  RegResult result;
+  const StringValue text("yes");
+  for (const double number : {2.5, -1.0, NumericValue::gSysmisValue}) {
+    result.SetNumber(number);
+    ASSERT_NE(result.GetPrediction(), nullptr);
+    EXPECT_EQ(result.GetPrediction()->GetType(), ScoreValue::kNumeric);
+    EXPECT_EQ(result.GetPrediction()->GetDouble(), number);
+    EXPECT_EQ(result.GetPrediction()->IsSystemMissingValue(), number == NumericValue::gSysmisValue);
+    result.SetPrediction(&text);
+    EXPECT_EQ(*result.GetPrediction(), text);
+    result.Reset();
+    EXPECT_EQ(result.GetPrediction(), nullptr);
+  }
 }
 
 TEST(RegResult, HoldsTheStandardErrorUntilReset) {
