@@ -176,9 +176,6 @@ bool TreeModel::SuppressCategoryProbabilities() const {
 
 void TreeModel::Display(std::ostream& out) const {
   const TreeOptions& options = tree_->options;
-  int leaves = 0;
-  for (int node = 0; node < tree_->table.GetCount(); ++node)
-    leaves += tree_->table.IsLeaf(node) ? 1 : 0;
   out << "Start TreeModel Display:\n";
   out << "Function = " << (options.is_classification ? "classification" : "regression");
   if (!GetTargetName().empty()) out << "; Target = " << GetTargetName();
@@ -186,7 +183,7 @@ void TreeModel::Display(std::ostream& out) const {
       << "; Penalty = " << FormatSixDigits(options.penalty) << "; No true child = "
       << (options.returns_last_prediction ? PMMLModelTags::XML_VAL_RETURNLASTPREDICTION
                                           : PMMLModelTags::XML_VAL_RETURNNULLPREDICTION)
-      << "\nNodes = " << tree_->table.GetCount() << "; Leaves = " << leaves
+      << "\nNodes = " << tree_->table.GetCount() << "; Leaves = " << tree_->table.CountLeaves()
       << "; Levels = " << tree_->table.GetDepth() << "\n";
   out << "End of TreeModel Display.\n\n";
 }

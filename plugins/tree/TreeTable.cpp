@@ -58,6 +58,13 @@ void TreeTable::Seal(const CaseVector& inputs) {
   nodes_.shrink_to_fit();
 }
 
+int TreeTable::CountLeaves() const {
+  int leaves = 0;
+  for (int node = 0; node < count_; ++node)
+    leaves += IsLeaf(node) ? 1 : 0;
+  return leaves;
+}
+
 int TreeTable::GetDepth() const {
   std::vector<int> ends;  // of the subtrees that the node lies in
   int depth = 0;

@@ -34,6 +34,7 @@ class TreeTable {
   int FirstChild(int node) const { return node + 1; }
   int NodeAfter(int node) const { return nodes_[At(node)].next; }
   const Condition& GetCondition(int node) const { return nodes_[At(node)]; }
+  int CountLeaves() const;
   /// The number of nodes on the longest way from the root to a leaf.
   int GetDepth() const;
 

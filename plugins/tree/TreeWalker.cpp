@@ -22,7 +22,9 @@ TreeWalker::TreeWalker(const Tree& tree)
       tree.options.is_classification ? static_cast<std::size_t>(tree.categories.GetCount()) : 1;
   votes_.resize(votes);
   if (tree.options.strategy == MissingValueStrategy::kWeightedConfidence) {
-    branches_.reserve(static_cast<std::size_t>(tree.table.GetCount()));
+    const auto leaves = static_cast<std::size_t>(tree.table.CountLeaves());
+    voters_.reserve(leaves);
+    shares_.reserve(leaves);
   }
 }
 
@@ -61,9 +63,11 @@ TreeWalker::End TreeWalker::Start(const double* values) {
   std::fill(votes_.begin(), votes_.end(), 0.0);
   bool has_votes = false;
   if (tree_.options.strategy == MissingValueStrategy::kWeightedConfidence) {
-    branches_.assign(1, {kFork, 0, 1.0, 0.0});
-    has_votes = WeighChildren<kNotesPath>(node_, values, 0);
-    if (has_votes) AddBranches();
+    voters_.clear();
+    shares_.clear();
+    has_votes = WeighChildren<kNotesPath>(node_, values);
+    for (std::size_t i = 0; i < voters_.size(); ++i)
+      AddVotes(voters_[i], shares_[i]);
   } else {
     records_ = 0.0;
     AggregateChildren<kNotesPath>(node_, values);
@@ -109,49 +113,48 @@ TreeWalker::Stop TreeWalker::Follow(int& node, const double* values) {
   }
 }
 
-/// Follows a branch to what predicts; false when nothing does.
+/// Adds the nodes that predict below a node, or itself, with shares that make up 1; false when there are
+/// none.
 template <bool kNotesPath>
-bool TreeWalker::Weigh(int node, const double* values, std::size_t branch) {
+bool TreeWalker::Weigh(int node, const double* values) {
   switch (Follow<kNotesPath>(node, values)) {
     case Stop::kPredicts:
-      branches_[branch].node = node;
-      return tree_.scores.HasScore(node);
+      if (!tree_.scores.HasScore(node)) return false;
+      voters_.push_back(node);
+      shares_.push_back(1.0);
+      return true;
     case Stop::kNothing:
       return false;
     default:
-      return WeighChildren<kNotesPath>(node, values, branch);
+      return WeighChildren<kNotesPath>(node, values);
   }
 }
 
-/// Makes branches of the children that are not false and predict; false when these have no weight together.
 template <bool kNotesPath>
-bool TreeWalker::WeighChildren(int node, const double* values, std::size_t fork) {
+bool TreeWalker::WeighChildren(int node, const double* values) {
   const TreeTable& table = tree_.table;
+  const std::size_t first = voters_.size();
   double total = 0.0;
   for (int child = table.FirstChild(node); child != table.NodeAfter(node); child = table.NodeAfter(child)) {
     if (Test(child, values) == ScorePredicate::PredFalse) continue;
-    const std::size_t branch = branches_.size();
+    const std::size_t first_of_child = voters_.size();
+    if (!Weigh<kNotesPath>(child, values)) continue;
     const double weight = tree_.scores.GetRecordCount(child);
-    branches_.push_back({kFork, static_cast<std::uint32_t>(fork), weight, 0.0});
-    if (Weigh<kNotesPath>(child, values, branch)) {
-      total += weight;
-    } else {
-      branches_.resize(branch);
-    }
+    total += weight;
+    ScaleVoters(first_of_child, weight, 1.0);
   }
-  branches_[fork].total = total;
-  return IsWeight(total);
+  if (IsWeight(total)) {
+    ScaleVoters(first, 1.0, total);
+    return true;
+  }
+  voters_.resize(first);
+  shares_.resize(first);
+  return false;
 }
 
-/// Adds up the votes. Only here is it known what each fork weighs in all, and every branch stands behind its
-/// fork, so one look at each is enough, however deep they lie.
-void TreeWalker::AddBranches() {
-  for (std::size_t i = 1; i < branches_.size(); ++i) {
-    Branch& branch = branches_[i];
-    const Branch& fork = branches_[branch.fork];
-    branch.weight = branch.weight / fork.total * fork.weight;
-    if (branch.node != kFork) AddVotes(branch.node, branch.weight);
-  }
+void TreeWalker::ScaleVoters(std::size_t first, double factor, double divisor) {
+  for (std::size_t i = first; i < shares_.size(); ++i)
+    shares_[i] = shares_[i] * factor / divisor;
 }
 
 void TreeWalker::AddVotes(int node, double weight) {

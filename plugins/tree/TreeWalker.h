@@ -48,15 +48,6 @@ class TreeWalker {
     kFork       ///< all children that are not false are to be followed
   };
 
-  /// A child that has a say in a prediction of weighted confidences.
-  struct Branch {
-    int node;            ///< that predicts; kFork when further branches predict in its place
-    std::uint32_t fork;  ///< the branch that this one is a part of
-    double weight;       ///< its record count, and in the end its part of the whole
-    double total;        ///< of a fork: the record counts of its branches
-  };
-  static constexpr int kFork = -1;
-
   ScorePredicate::PredicateResult Test(int node, const double* values) const {
     return tree_.conditions.Evaluate(tree_.table.GetCondition(node), values);
   }
@@ -65,10 +56,10 @@ class TreeWalker {
   template <bool kNotesPath>
   Stop Follow(int& node, const double* values);
   template <bool kNotesPath>
-  bool Weigh(int node, const double* values, std::size_t branch);
+  bool Weigh(int node, const double* values);
   template <bool kNotesPath>
-  bool WeighChildren(int node, const double* values, std::size_t fork);
-  void AddBranches();
+  bool WeighChildren(int node, const double* values);
+  void ScaleVoters(std::size_t first, double factor, double divisor);
   template <bool kNotesPath>
   void Aggregate(int node, const double* values);
   template <bool kNotesPath>
@@ -83,8 +74,9 @@ class TreeWalker {
   int substitutions_ = 0;
   std::vector<double> votes_;
   double records_ = 0.0;  ///< that aggregated nodes have together
-  /// What predicts below a fork, in document order, with the forks in between; the first one is all of it.
-  std::vector<Branch> branches_;
+  /// The nodes that predict below a fork of weighted confidences, in document order, and their shares in it.
+  std::vector<int> voters_;
+  std::vector<double> shares_;
   std::vector<int> path_;
 };
 
