@@ -5,15 +5,29 @@
 
 namespace MCMath_800 {
 
-// All for finite x > 0 and a > 0.
+// All for finite x > 0 and a > 0. deviation is x - a, for an x that is known with more digits than x has.
+
+/// 1 / Gamma(1 + a) for 0 <= a <= 1.
+double ReciprocalGamma1(double a);
+/// ln Gamma(a); infinite when it is too large.
+double LogGamma(double a);
+
+/// a * LogDeviance(x / a - 1), the exponent that x^a e^-x loses on its way from a.
+double GammaDeviance(double x, double deviation, double a);
 
 /// x^a e^-x / Gamma(a), the gamma density times x; a Poisson probability is this over a. 0 when it is too
 /// small.
 double GammaPower(double x, double a);
-/// The same where x is known with more digits than x has: deviation = x - a.
 double GammaPower(double x, double deviation, double a);
 
-/// P(a, x), the share of the gamma distribution below x, or the share above it.
+/// P(a, x), the share of the gamma distribution below x, or the share above it, with the power term beside
+/// it.
+struct GammaShare {
+  double ratio;
+  double power;
+};
+GammaShare FindGammaShare(double x, double deviation, double a, bool upper);
+
 double GammaRatio(double x, double a, bool upper);
 double GammaRatio(double x, double deviation, double a, bool upper);
 
