@@ -104,11 +104,20 @@ void NodeReader::ReadDistribution(DOMElement* element, NodeScores::Node& node) {
     has_probabilities &= entry.probability != kNoNumber;
   }
   double most = -1.0;
-  for (const LeafNodeStats& entry : stats_) {
+  const int number = tree_.table.GetCount();
+  auto next = stats_.begin();
+  for (const DOMElement* child : ChildElements(element, Tags::XML_ELE_SCOREDISTRIBUTION)) {
+    const LeafNodeStats& entry = *next++;
     const double share = total > 0.0 ? entry.record_count / total : 0.0;
     const double probability = has_probabilities ? entry.probability : share;
     const double confidence = entry.confidence != kNoNumber ? entry.confidence : probability;
-    const int category = tree_.categories.Find(element, entry.value);
+    const int category = tree_.categories.Find(child, entry.value);
+    const auto place = static_cast<std::size_t>(category);
+    if (last_nodes_.size() <= place) last_nodes_.resize(place + 1, -1);
+    if (last_nodes_[place] == number) {
+      FailAt(child, KestrelException::kStructure, "\"" + entry.value + "\": Duplicated Category Value!");
+    }
+    last_nodes_[place] = number;
     shares_.push_back({category, entry.record_count, probability, confidence});
     if (entry.record_count > most) {
       most = entry.record_count;
@@ -116,18 +125,8 @@ void NodeReader::ReadDistribution(DOMElement* element, NodeScores::Node& node) {
     }
   }
   if (node.record_count == kNoNumber) node.record_count = total;
-  SortDistribution(element);
-}
-
-void NodeReader::SortDistribution(const DOMElement* element) {
   std::sort(shares_.begin(), shares_.end(),
             [](const CategoryShare& a, const CategoryShare& b) { return a.category < b.category; });
-  const auto same = std::adjacent_find(
-      shares_.begin(), shares_.end(),
-      [](const CategoryShare& a, const CategoryShare& b) { return a.category == b.category; });
-  if (same == shares_.end()) return;
-  FailAt(element, KestrelException::kInvalidValue,
-         tree_.categories.Get(same->category).GetString() + ": Duplicated Category Value!");
 }
 
 void NodeReader::CloseNode(DOMElement* element, int node) {

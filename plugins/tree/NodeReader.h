@@ -24,15 +24,15 @@ class ScoreDictionary;
 /// compiled one by one and dropped.
 ///
 /// Errors, at the element, beside those of PMMLTranslator's predicate readers and SetLeafNodeStats:
-///   code 1  a second predicate in a node, or an element that does not belong there;
+///   code 1  a second predicate in a node, an element that does not belong there, or a category twice in a
+///           distribution;
 ///   code 3  a `recordCount` or a regression's `score` that is no number;
 ///   code 4  a node without predicate; a leaf that predicts nothing; what the strategy for missing values
-///   needs
-///           and the node does not have: `defaultChild`, `recordCount`, `ScoreDistribution`;
+///           needs of a node that lacks it: `defaultChild`, `recordCount`, `ScoreDistribution`;
 ///   code 5  an embedded model;
 ///   code 6  a negative or infinite `recordCount` or an infinite `score`, a `defaultChild` that is no child's
 ///           `id`;
-///   code 7  a score or distribution value that is no category of the target, or one twice in a distribution;
+///   code 7  a score or distribution value that is no category of the target;
 ///   code 8  a predicate's field that is not an active field of the mining schema.
 class NodeReader {
  public:
@@ -47,7 +47,6 @@ class NodeReader {
   int OpenNode(xercesc::DOMElement* element);
   void CloseNode(xercesc::DOMElement* element, int node);
   void ReadDistribution(xercesc::DOMElement* element, NodeScores::Node& node);
-  void SortDistribution(const xercesc::DOMElement* element);
   void CheckLeaf(const xercesc::DOMElement* element, int node) const;
   void FindDefaultChild(const xercesc::DOMElement* element, int node);
 
@@ -57,6 +56,7 @@ class NodeReader {
   // Kept from node to node.
   std::vector<LeafNodeStats> stats_;
   std::vector<CategoryShare> shares_;
+  std::vector<int> last_nodes_;  ///< by category: the last node whose distribution names it
 };
 
 }  // namespace MCKestrel_800

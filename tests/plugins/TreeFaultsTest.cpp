@@ -93,11 +93,11 @@ constexpr FaultRow kFaults[] = {
 
     // Distributions.
     {"a category that is none", "value=\"low\" recordCount=\"15\"", "value=\"none\" recordCount=\"15\"", 7,
-     "risk: invalid value!", 51},
-    {"a category twice", "value=\"high\" recordCount=\"5\"", "value=\"low\" recordCount=\"5\"", 7,
-     "low: Duplicated Category Value!", 51},
+     "risk: invalid value!", 55},
+    {"a category twice", "value=\"high\" recordCount=\"5\"", "value=\"low\" recordCount=\"5\"", 1,
+     "\"low\": Duplicated Category Value!", 56},
     {"a category twice, once with a blank", "value=\"high\" recordCount=\"5\"",
-     "value=\"low \" recordCount=\"5\"", 7, "low: Duplicated Category Value!", 51},
+     "value=\"low \" recordCount=\"5\"", 1, "\"low \": Duplicated Category Value!", 56},
     {"an entry without value", "value=\"low\" recordCount=\"15\"", "recordCount=\"15\"", 4,
      "Attribute value is missing from Node \"ScoreDistribution\"", 55},
     {"an entry without count", "value=\"low\" recordCount=\"15\"", "value=\"low\"", 4,
