@@ -255,6 +255,19 @@ TEST(TreeMissing, JoinedNumbersAreWeightedMeans) {
   }
 }
 
+TEST(TreeMissing, ANodeWithoutScoreHasNoPartInAMean) {
+  const std::string tree = Node(
+      "", "<True/>" + Node("score='10' recordCount='1'", Is("g", "a")) +
+              Node("recordCount='3'", Is("g", "b") + Node("score='20' recordCount='2'", AtMost("z", "5"))));
+  for (const char* strategy : {"weightedConfidence", "aggregateNodes"}) {
+    const auto model = BuildEstimator(
+        std::string("missingValueStrategy='") + strategy + "' noTrueChildStrategy='returnLastPrediction'",
+        tree);
+    EXPECT_EQ(ScoreOf(*model, {{"z", 9.0}}), "10 -") << strategy;
+    EXPECT_EQ(ScoreOf(*model, {{"g", "b"}, {"z", 9.0}}), "90027") << strategy;
+  }
+}
+
 TEST(TreeMissing, JoinedNumbersThatNoNumberHoldsAreNone) {
   const struct {
     const char* why;
