@@ -289,6 +289,18 @@ TEST(TreeMissing, JoinedNumbersThatNoNumberHoldsAreNone) {
   }
 }
 
+TEST(TreeMissing, ABranchOfSuchCountsHasNoPart) {
+  const std::string large = "score='1' recordCount='1e308'";
+  const auto model =
+      BuildEstimator("missingValueStrategy='weightedConfidence'",
+                     Node("", "<True/>" +
+                                  Node("recordCount='1'", Is("g", "a") + Node(large, AtMost("z", "5")) +
+                                                              Node(large, Above("z", "5"))) +
+                                  Node("recordCount='1' score='5'", Is("g", "b"))));
+  EXPECT_EQ(ScoreOf(*model, {}), "5 -");
+  EXPECT_EQ(ScoreOf(*model, {{"z", 1.0}}), "3 -");
+}
+
 // ---- The penalty.
 
 /// A split on x with z standing in for it.
