@@ -80,25 +80,19 @@ TreeWalker::End TreeModel::Walk(const double* values, ScoreResult& result) {
 
 void TreeModel::NameEntities(TreeWalker::End end, bool has_path, ResultEntities& entities) {
   if (has_path) {
-    for (const int node : walker_.GetPath()) {
-      NameNode(node);
-      entities.AddToPath(name_);
-    }
+    for (const int node : walker_.GetPath())
+      entities.AddToPath(NameOf(node));
   }
-  if (end != TreeWalker::End::kNode) return;
-  const std::string_view id = tree_->scores.GetId(walker_.GetNode());
-  if (!id.empty()) return entities.SetDecidingId(id);
-  NameNode(walker_.GetNode());
-  entities.SetDecidingId(name_);
+  if (end == TreeWalker::End::kNode) entities.SetDecidingId(NameOf(walker_.GetNode()));
 }
 
-void TreeModel::NameNode(int node) {
-  name_ = tree_->scores.GetId(node);
-  if (!name_.empty()) return;
+std::string_view TreeModel::NameOf(int node) {
+  const std::string_view id = tree_->scores.GetId(node);
+  if (!id.empty()) return id;
   char digits[16];
   const auto [end, failure] = std::to_chars(std::begin(digits), std::end(digits), node + 1);
   static_cast<void>(failure);
-  name_.assign(1, '#').append(digits, end);
+  return name_.assign(1, '#').append(digits, end);
 }
 
 double TreeModel::Penalize(double confidence) const {

@@ -5,6 +5,7 @@
 
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "kestrel/foundation/NumericValue.h"
@@ -55,7 +56,8 @@ class TreeModel : public BaseModel {
   MCScore::MCStatus ScoreAny(const double* values, ScoreResult& result);
   TreeWalker::End Walk(const double* values, ScoreResult& result);
   void NameEntities(TreeWalker::End end, bool has_path, ResultEntities& entities);
-  void NameNode(int node);
+  /// The node's identifier or number; valid until the next call.
+  std::string_view NameOf(int node);
   void Predict(ScoreResult& result);
   void PredictTogether(ScoreResult& result);
   double Penalize(double confidence) const;
