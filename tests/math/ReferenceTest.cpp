@@ -1,0 +1,52 @@
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <sstream>
+#include <string>
+#include <vector>
+
+#include "tests/math/ReferenceFunctions.h"
+
+namespace {
+
+using namespace kestrel_tests;
+
+/// One function and how its error looks over a part of its table.
+class ReferenceTest : public testing::TestWithParam<ReferenceFunction> {};
+
+std::string ArgumentsOf(const ReferencePoint& point) {
+  std::ostringstream text;
+  text.precision(17);
+  for (const double argument : point.arguments)
+    text << ' ' << argument;
+  return text.str();
+}
+
+// The whole tables, with Boost.Math beside, are what `./dev bench accuracy` judges.
+TEST_P(ReferenceTest, KeepsItsGoalAtEveryTwentiethPoint) {
+  const ReferenceFunction& function = GetParam();
+  const std::vector<ReferencePoint> points = ReadReferencePoints(function, 20);
+  ASSERT_GT(points.size(), 300u);
+  int failures = 0;
+  for (const ReferencePoint& point : points) {
+    const double value = function.call(point.arguments);
+    const double error = RelativeError(value, point);
+    const double allowed = std::fabs(point.value) >= kBodyFrom ? function.goal.body : function.goal.tail;
+    if (error <= allowed) continue;
+    // A fault of a whole region would print hundreds of lines.
+    if (++failures <= 5) {
+      ADD_FAILURE() << function.name << " at" << ArgumentsOf(point) << ": " << value << ", relative error "
+                    << error << ", allowed " << allowed;
+    }
+  }
+  EXPECT_EQ(failures, 0) << "of " << points.size() << " points";
+}
+
+std::string NameOf(const testing::TestParamInfo<ReferenceFunction>& info) {
+  const std::string name = info.param.name;
+  return name.substr(0, name.find('('));
+}
+
+INSTANTIATE_TEST_SUITE_P(DistFun, ReferenceTest, testing::ValuesIn(ReferenceFunctions()), NameOf);
+
+}  // namespace
