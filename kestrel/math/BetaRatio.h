@@ -13,10 +13,13 @@ struct BetaPoint {
   double deviation;  ///< b * x - a * y: 0 where x is the mean a / (a + b).
 };
 
-// All for finite a, b > 0 and 0 < x < 1.
+// All for finite a, b and a + b, a, b > 0 and 0 < x, y.
 
 /// The point of an x that is exact as it stands.
 BetaPoint MakeBetaPoint(double x, double a, double b);
+
+/// ln B(a, b).
+double LogBeta(double a, double b);
 
 /// x^a y^b / B(a, b), the beta density times x * y. 0 when it is too small.
 double BetaPower(const BetaPoint& point, double a, double b);

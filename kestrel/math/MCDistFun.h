@@ -78,8 +78,12 @@ class KESTREL_API MCDistFun {
   static double cdfbet(const double& x, const double& a, const double& b, long& err);
   static double betinv(const double& p, const double& a, const double& b, long& err);
 
+  /// P(T > size), size >= 0.
+  static double vexasigt(const double& size, const double& df, long& err);
   static double vexacdft(const double& x, const double& df, long& err);
   static double vexaidft(const double& p, const double& df, long& err);
+  /// The share of the F distribution below f, or above it.
+  static double vexaratf(const double& f, const double& df1, const double& df2, bool upper, long& err);
   static double vexacdff(const double& x, const double& df1, const double& df2, long& err);
   static double vexaidff(const double& p, const double& df1, const double& df2, long& err);
 };

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <limits>
 
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/math/ErrorFunction.h"
@@ -18,7 +17,6 @@ using MCCommon_800::MCMV;
 namespace {
 
 constexpr double kTwoPi = 6.28318530717958647693;
-constexpr double kInfinity = std::numeric_limits<double>::infinity();
 
 bool IsParameter(double value) {
   return value > 0.0 && std::isfinite(value);
@@ -87,28 +85,11 @@ double MCDistFun::vexaidfchi(const double& p, const double& df, long& err) {
   if (a == 0.0) return 0.0;
   const bool upper = p > 0.5;
   const double target = upper ? 1.0 - p : p;
-  const double reach = std::max(1.0, std::sqrt(a));
-  double low = 0.0;
-  double high = kInfinity;
-  double x = 0.5 * idfchb(p, df);
-  // So far down the leading power is all there is, or the quantile itself is 0.
-  if (x < 1e-290) return 2.0 * x;
-  for (int i = 0; i < kSearchLimit; ++i) {
-    const GammaShare share = FindGammaShare(x, x - a, a, upper);
-    if (share.ratio == target) break;
-    ((share.ratio < target) == upper ? high : low) = x;
-    const double step = FindStep(share.ratio, target, share.power, a - x, upper);
-    double next = x * std::exp(step);
-    if (std::fabs(step) * reach < kLastStep) {
-      x = next;
-      break;
-    }
-    if (!(next > low && next < high)) {
-      next = high == kInfinity ? 2.0 * x : low == 0.0 ? 0.5 * x : low + 0.5 * (high - low);
-    }
-    if (next == x || next == low || next == high) break;
-    x = next;
-  }
+  const double x =
+      SearchQuantile(0.5 * idfchb(p, df), target, std::max(1.0, std::sqrt(a)), upper, [&](double at) {
+        const GammaShare share = FindGammaShare(at, at - a, a, upper);
+        return QuantilePoint{share.ratio, share.power, a - at};
+      });
   const double quantile = 2.0 * x;
   if (!std::isfinite(quantile)) err = 1;
   return quantile;
