@@ -1,5 +1,6 @@
 #include "kestrel/predicates/Range.h"
 
+#include <algorithm>
 #include <cmath>
 #include <memory>
 #include <ostream>
@@ -27,12 +28,6 @@ ScoreValue* CloneOf(const ScoreValue* value) {
   return value == nullptr ? nullptr : value->Clone();
 }
 
-/// IsEqual, asked only of numbers that are near each other: most that are tested lie well outside, and the
-/// question costs more than all the rest.
-bool IsEnd(double x, double end) {
-  return std::fabs(x - end) <= std::fabs(end) * 1e-6 && NumericValue::IsEqual(x, end);
-}
-
 void DisplayEnd(std::ostream& out, const ScoreValue* value) {
   if (value == nullptr) {
     out << "NULL";
@@ -57,6 +52,7 @@ Range::Range(double min, double max, bool lowIncluded, bool highIncluded)
   UnboundBelow(low.get());
   max_ = new NumericValue(max);
   min_ = low.release();
+  NoteReach();
 }
 
 Range::Range(ScoreValue* min, ScoreValue* max, bool lowIncluded, bool highIncluded)
@@ -98,7 +94,9 @@ Range::Range(const Range& other)
       low_included_(other.low_included_),
       single_(other.single_),
       min_number_(other.min_number_),
-      max_number_(other.max_number_) {
+      max_number_(other.max_number_),
+      lowest_(other.lowest_),
+      highest_(other.highest_) {
   std::unique_ptr<ScoreValue> min(CloneOf(other.min_));
   max_ = CloneOf(other.max_);
   min_ = min.release();
@@ -116,6 +114,8 @@ Range& Range::operator=(const Range& other) {
   single_ = other.single_;
   min_number_ = other.min_number_;
   max_number_ = other.max_number_;
+  lowest_ = other.lowest_;
+  highest_ = other.highest_;
   return *this;
 }
 
@@ -131,10 +131,20 @@ void Range::DeleteEnds() {
 
 void Range::NoteMin() {
   if (IsNumber(min_)) min_number_ = min_->GetDouble();
+  NoteReach();
 }
 
 void Range::NoteMax() {
   if (IsNumber(max_)) max_number_ = max_->GetDouble();
+  NoteReach();
+}
+
+void Range::NoteReach() {
+  // Far more than the tolerance of an end. The ends may stand the wrong way round.
+  const auto slack = [](double end) { return std::fabs(end) * 1e-6; };
+  const double low = std::min(min_number_, max_number_), high = std::max(min_number_, max_number_);
+  lowest_ = low - slack(low);
+  highest_ = high + slack(high);
 }
 
 void Range::NoteSingle() {
@@ -142,7 +152,9 @@ void Range::NoteSingle() {
 }
 
 void Range::NoteSingleDate() {
-  if (single_ && min_->GetType() == ScoreValue::kDateTime) min_number_ = max_number_ = min_->GetDouble();
+  if (!single_ || min_->GetType() != ScoreValue::kDateTime) return;
+  min_number_ = max_number_ = min_->GetDouble();
+  NoteReach();
 }
 
 bool Range::operator==(const ScoreValueRange& other) const {
@@ -171,11 +183,11 @@ void Range::SetMax(ScoreValue* value) {
   NoteSingle();
 }
 
-bool Range::IsInRange(double x) const {
-  if (single_) return IsEnd(x, min_number_);
-  if (min_number_ < x && x < max_number_) return !NumericValue::IsSystemMissingValue(x);
+bool Range::IsAtEnd(double x) const {
+  if (single_) return NumericValue::IsEqual(x, min_number_);
   if (NumericValue::IsSystemMissingValue(x)) return false;
-  return (low_included_ && IsEnd(x, min_number_)) || (high_included_ && IsEnd(x, max_number_));
+  return (low_included_ && NumericValue::IsEqual(x, min_number_)) ||
+         (high_included_ && NumericValue::IsEqual(x, max_number_));
 }
 
 bool Range::IsInRange(const ScoreValue* value) const {

@@ -5,6 +5,7 @@
 
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/foundation/ScoreValue.h"
+#include "kestrel/predicates/Range.h"
 #include "kestrel/predicates/ScaleSplit.h"
 #include "kestrel/predicates/SplitInput.h"
 
@@ -55,7 +56,7 @@ ScorePredicate::PredicateResult SimplePredicate::Evaluate(const std::vector<doub
   if (variable == nullptr) return PredUnknown;
   const double x = FindNumber(*variable, values);
   if (IsMissingMarker(*variable, x)) return split_->GetMissvalMap() == -1 ? PredUnknown : PredTrue;
-  // ScaleSplit.h is included so that this is mostly no call.
+  // Range.h and ScaleSplit.h are included so that this is mostly no call.
   return ResultOfChild(split_->GetSplitChildIndex(x));
 }
 

@@ -3,8 +3,10 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <limits>
 #include <memory>
 #include <sstream>
+#include <vector>
 
 #include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/NumericValue.h"
@@ -60,6 +62,34 @@ TEST(Range, HoldsNumbersByItsEndsAndFlags) {
     EXPECT_EQ(range.IsInRange(row.x), row.inside) << row.why;
     const NumericValue value(row.x);
     EXPECT_EQ(range.IsInRange(&value), row.inside) << row.why;
+  }
+}
+
+TEST(Range, HoldsAnyNumbersByTheRule) {
+  // The test of a range takes short cuts around the tolerance of its ends; none may change the answer.
+  const double kMost = std::numeric_limits<double>::max(), kLeast = std::numeric_limits<double>::denorm_min();
+  std::vector<double> numbers = {-kInfinity, kInfinity, NAN,    kSysmis, kMost,
+                                 0,          -0.0,      kLeast, -kLeast, 1e-310};
+  for (const double number : {5.0, -5.0, 1e-300, 1e300, 10.0}) {
+    for (const double factor : {1.0, 1 + 1e-15, 1 - 1e-15, 1 + 1e-13, 1 + 1e-7, 1 + 1e-5, 1 - 1e-5})
+      numbers.push_back(number * factor);
+  }
+  for (const double min : numbers) {
+    for (const double max : numbers) {
+      for (const int flags : {0, 1, 2, 3}) {
+        const bool low = flags % 2 == 1, high = flags > 1;
+        const Range range(min, max, low, high);
+        const Range copy(range);
+        for (const double x : numbers) {
+          const bool atEnd =
+              (low && NumericValue::IsEqual(x, min)) || (high && NumericValue::IsEqual(x, max));
+          const bool inside =
+              min == max ? NumericValue::IsEqual(x, min) : x != kSysmis && (atEnd || (min < x && x < max));
+          ASSERT_EQ(range.IsInRange(x), inside) << x << " in " << min << ".." << max << ", flags " << flags;
+          ASSERT_EQ(copy.IsInRange(x), inside) << "copy: " << x << " in " << min << ".." << max;
+        }
+      }
+    }
   }
 }
 
