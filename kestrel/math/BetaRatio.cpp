@@ -22,6 +22,9 @@ constexpr double kPrecision = MCPower::gMachineEpsilon / 4.0;
 // Far more terms than any sum below needs where it is used; the limit is there for the reader's peace.
 constexpr int kTermLimit = 2000;
 
+// Up to here the continued fraction takes less time than the expansion's coefficients.
+constexpr double kNormalShape = 1000.0;
+
 // A point with its parameters, so that both can be turned round: I_x(a, b) = 1 - I_y(b, a).
 struct BetaCase {
   BetaPoint at;
@@ -291,7 +294,7 @@ double FindLargeShape(const BetaCase& c) {
     const BetaCase rest = {{c.at.x, c.at.y, c.at.deviation - steps * c.at.x}, c.a, c.b - steps};
     return sum + (c.at.x <= 0.7 ? ForwardSum(rest, kTermLimit) : ExpandLargeA(rest));
   }
-  if (small <= 100.0 || -c.at.deviation > 0.03 * small) return Fraction(c);
+  if (small <= kNormalShape || -c.at.deviation > 0.03 * small) return Fraction(c);
   return NormalExpansion(c);
 }
 

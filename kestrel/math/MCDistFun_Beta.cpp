@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/math/BetaRatio.h"
@@ -21,7 +22,12 @@ bool IsParameter(double value) {
 }
 
 double Finish(double value, long err) {
-  return err == 0 ? value : MCMV::gMissingValue;
+  return err == 0 && std::isfinite(value) ? value : MCMV::gMissingValue;
+}
+
+// Half of the degrees of freedom; above 0 also where the half of the smallest number is not.
+double HalfOf(double df) {
+  return std::max(0.5 * df, std::numeric_limits<double>::denorm_min());
 }
 
 // The point whose odds x / y are given, which have the digits of the smaller of x and y.
@@ -73,11 +79,34 @@ double StartOdds(double p, double q, double a, double b) {
   return (1.0 - y) / y;
 }
 
+// t^2 / df for the two-sided probability p of Student's t: G. W. Hill, "Algorithm 396: Student's
+// t-quantiles", Comm. ACM 13 (1970) 619-620, for df above 1. leading is the logarithm of the leading power,
+// which is where Hill starts, too.
+double HillSquare(double p, double df, double leading) {
+  const double a = 1.0 / (df - 0.5);
+  const double b = 48.0 / (a * a);
+  double c = ((20700.0 * a / b - 98.0) * a - 16.0) * a + 96.36;
+  const double d = ((94.5 / (b + c) - 3.0) / b + 1.0) * std::sqrt(0.5 * kPi * a) * df;
+  double y = std::exp(leading);
+  if (y > 0.05 + a) {
+    const double x = MCDistFun::IdfStdNorm(0.5 * p);
+    y = x * x;
+    if (df < 5.0) c += 0.3 * (df - 4.5) * (x + 0.6);
+    c += (((0.05 * d * x - 5.0) * x - 7.0) * x - 2.0) * x + b;
+    y = (((((0.4 * y + 6.3) * y + 36.0) * y + 94.5) / c - y - 3.0) / b + 1.0) * x;
+    return std::expm1(a * y * y);
+  }
+  return ((1.0 / (((df + 6.0) / (df * y) - 0.089 * d - 0.822) * (df + 2.0) * 3.0) + 0.5 / (df + 4.0)) * y -
+          1.0) *
+             (df + 1.0) / (df + 2.0) +
+         1.0 / y;
+}
+
 // The odds x / y at which I_x(a, b) = p; p + q = 1, and the smaller of them is exact.
-double FindOdds(double p, double q, double a, double b) {
+double FindOdds(double p, double q, double a, double b, double start) {
   const bool upper = q < p;
   const double reach = std::max(1.0, std::sqrt(a * (b / (a + b))));
-  return SearchQuantile(StartOdds(p, q, a, b), upper ? q : p, reach, upper, [&](double odds) {
+  return SearchQuantile(start, upper ? q : p, reach, upper, [&](double odds) {
     const BetaPoint point = PointOfOdds(odds, a, b);
     return QuantilePoint{BetaRatio(point, a, b, upper), BetaPower(point, a, b), -point.deviation};
   });
@@ -101,7 +130,7 @@ double MCDistFun::cdfbet(const double& x, const double& a, const double& b, long
 }
 
 double MCDistFun::betinv(const double& p, const double& a, const double& b, long& err) {
-  const double odds = FindOdds(p, 1.0 - p, a, b);
+  const double odds = FindOdds(p, 1.0 - p, a, b, StartOdds(p, 1.0 - p, a, b));
   err = std::isnan(odds) ? 1 : 0;
   return odds <= 1.0 ? odds / (1.0 + odds) : 1.0 / (1.0 + 1.0 / odds);
 }
@@ -111,7 +140,7 @@ double MCDistFun::betinv(const double& p, const double& a, const double& b, long
 double MCDistFun::vexasigt(const double& size, const double& df, long& err) {
   err = 0;
   if (df == 1.0) return std::atan2(1.0, size) / kPi;
-  const double a = 0.5 * df;
+  const double a = HalfOf(df);
   const double log_odds = 2.0 * (0.5 * std::log(df) - std::log(size));
   if (log_odds < kExtremeLogOdds) return 0.5 * std::exp(a * log_odds - std::log(a) - LogBeta(a, 0.5));
   const double square = size / std::sqrt(df) * (size / std::sqrt(df));
@@ -127,13 +156,18 @@ double MCDistFun::vexacdft(const double& x, const double& df, long& err) {
 
 double MCDistFun::vexaidft(const double& p, const double& df, long& err) {
   const double tail = p < 0.5 ? p : 1.0 - p;
+  const double a = HalfOf(df);
+  const double extreme = LeadingLogOdds(2.0 * tail, a, 0.5);
   double size;
   if (df == 1.0) {
     size = tail > 0.25 ? std::tan(kPi * (0.5 - tail)) : 1.0 / std::tan(kPi * tail);
+  } else if (extreme < kExtremeLogOdds) {
+    size = std::exp(0.5 * (std::log(df) - extreme));
   } else {
-    const double extreme = LeadingLogOdds(2.0 * tail, 0.5 * df, 0.5);
-    size = extreme < kExtremeLogOdds ? std::exp(0.5 * (std::log(df) - extreme))
-                                     : std::sqrt(df / FindOdds(2.0 * tail, 1.0 - 2.0 * tail, 0.5 * df, 0.5));
+    const double twice = 2.0 * tail;
+    const double square = df > 1.0 && df < 1e9 ? HillSquare(twice, df, extreme) : 0.0;
+    const double start = square > 0.0 ? 1.0 / square : StartOdds(twice, 1.0 - twice, a, 0.5);
+    size = std::sqrt(df / FindOdds(twice, 1.0 - twice, a, 0.5, start));
   }
   err = std::isfinite(size) ? 0 : 1;
   return p < 0.5 ? -size : size;
@@ -144,7 +178,7 @@ double MCDistFun::vexaratf(const double& f, const double& df1, const double& df2
   const double odds = f / df2 * df1;
   const double y = 1.0 / (1.0 + odds);
   const double x = odds <= 1.0 ? odds / (1.0 + odds) : 1.0 / (1.0 + 1.0 / odds);
-  return cbtaux(x, y, 0.5 * df1 * ((f - 1.0) * y), 0.5 * df1, 0.5 * df2, upper, err);
+  return cbtaux(x, y, 0.5 * df1 * ((f - 1.0) * y), HalfOf(df1), HalfOf(df2), upper, err);
 }
 
 double MCDistFun::vexacdff(const double& f, const double& df1, const double& df2, long& err) {
@@ -152,7 +186,9 @@ double MCDistFun::vexacdff(const double& f, const double& df1, const double& df2
 }
 
 double MCDistFun::vexaidff(const double& p, const double& df1, const double& df2, long& err) {
-  const double f = FindOdds(p, 1.0 - p, 0.5 * df1, 0.5 * df2) * df2 / df1;
+  const double a = HalfOf(df1);
+  const double b = HalfOf(df2);
+  const double f = FindOdds(p, 1.0 - p, a, b, StartOdds(p, 1.0 - p, a, b)) * df2 / df1;
   err = std::isfinite(f) ? 0 : 1;
   return f;
 }

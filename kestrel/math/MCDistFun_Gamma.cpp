@@ -31,7 +31,7 @@ double ShareOf(double x, double deviation, double shape, bool upper) {
 }
 
 double Finish(double value, long err) {
-  return err == 0 ? value : MCMV::gMissingValue;
+  return err == 0 && std::isfinite(value) ? value : MCMV::gMissingValue;
 }
 
 }  // namespace

@@ -151,6 +151,7 @@ double MCDistFun::derf(const double& x) {
 // As published the complement is exp(ln y - a^2), and 0 when that exponent is below -708. The split
 // exponential is the same number with more of its digits right in the tail, and needs no logarithm.
 double MCDistFun::derfc(const double& x) {
+  if (x == 0.0) return 1.0;
   const double a = std::fabs(x);
   const double tail = TailExponential(ScaledErfc(a), a, 1.0);
   return x < 0.0 ? 2.0 - tail : tail;
