@@ -69,7 +69,7 @@ struct Functions {
   static double NonCentralCdfChi(const double* a) { return cdf(ChiNc(a[1], a[2]), a[0]); }
   static double NonCentralCdfF(const double* a) { return cdf(FNc(a[1], a[2], a[3]), a[0]); }
   static double NonCentralCdfT(const double* a) { return cdf(TNc(a[1], a[2]), a[0]); }
-  static double FindNCParamChi(const double* a) { return ChiNc::find_non_centrality(a[2], a[1], a[0]); }
+  static double FindNCParamChi(const double* a) { return ChiNc::find_non_centrality(a[1], a[0], a[2]); }
 };
 
 // Some root finders throw in spite of the policy.

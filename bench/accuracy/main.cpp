@@ -38,9 +38,11 @@ constexpr Effort kSmoke = {100, 1, 0.001};
 /// A result that is rounded once can be off by this much; an error below it is as good as none.
 constexpr double kRounding = 0x1p-53;
 
-/// The shortest decimal that is this double.
+/// The shortest decimal that is this double; whole numbers without an exponent.
 std::string Shortest(double number) {
   char text[40];
+  std::snprintf(text, sizeof text, "%.0f", number);
+  if (std::fabs(number) < 1e9 && std::strtod(text, nullptr) == number) return text;
   for (int digits = 1; digits <= 17; ++digits) {
     std::snprintf(text, sizeof text, "%.*g", digits, number);
     if (std::strtod(text, nullptr) == number) break;

@@ -281,8 +281,8 @@ def lgamma_row(r):
     return ([x], [value]) if x not in (1.0, 2.0) else None
 
 
-# name of the table: arguments, values, rows, what makes a row. Those with quantiles have more rows, since some stay
-# without; those of noncentral_t take too long for as many.
+# name of the table: arguments, values, rows, what makes a row. Some rows stay without a quantile. Those of
+# noncentral_t are fewer because each takes many times as long.
 FAMILIES = {
     "normal": ("x", "cdf quantile", 13000, normal_row),
     "lgamma": ("x", "value", 10000, lgamma_row),
