@@ -136,8 +136,8 @@ double LogGamma(double a) {
       product *= a;
     }
     const double z = a - 2.0;
-    const double near = z * (1.0 + z) * (Polynomial(kLogGamma2, z) / Polynomial(kLogGamma2Divisor, z));
-    return product == 1.0 ? near : near + std::log(product);
+    const double core = z * (1.0 + z) * (Polynomial(kLogGamma2, z) / Polynomial(kLogGamma2Divisor, z));
+    return product == 1.0 ? core : core + std::log(product);
   }
   return (a - 0.5) * (std::log(a) - 1.0) + (kHalfLogTwoPi - 0.5 + StirlingError(a));
 }

@@ -5,7 +5,6 @@
 #ifndef KESTREL_MATH_QUANTILESEARCH_H
 #define KESTREL_MATH_QUANTILESEARCH_H
 
-#include <algorithm>
 #include <cmath>
 #include <limits>
 
