@@ -46,6 +46,58 @@ class KESTREL_API MCDistFun {
   static double CdfGam(double x, double shape, double rate);
   static double IdfGam(double p, double shape, double rate);
 
+  // --- Counts. n, total, successes and draws are whole numbers from 0 to 2^53, 0 <= prob <= 1. An infinite x
+  // is outside the domain here. err is 0, or 1 with the missing value: an argument outside the domain. ---
+  /// The probability of x successes in n trials; 0 for an x that is no count from 0 to n.
+  static double PdfBin(double x, double n, double prob, long& err);
+  /// Of at most x successes.
+  static double CdfBin(double x, double n, double prob, long& err);
+  /// The smallest count whose CdfBin reaches p, 0 <= p <= 1.
+  static double IdfBin(double p, double n, double prob, long& err);
+  /// Of at most x successes among `draws` out of `total` without replacement; successes, draws <= total.
+  static double CDFHyper(double x, double total, double successes, double draws, long& err);
+
+  // --- Non-central distributions. 0.01 <= df <= 1e10; 0 <= nc <= 1e9, for t from -3e4 to 3e4; x is finite,
+  // for t up to 1e140 either way. Everything else is missing. ---
+  static double NonCentralCdfT(double x, double df, double nc);
+  static double NonCentralCdfChi(double x, double df, double nc);
+  /// upper  gives the share above x, the power of an F test, with all its digits where it is small.
+  static double NonCentralCdfF(double x, double df1, double df2, double nc, bool upper = false);
+  /// The nc at which the distribution function at x is p, 0 < p < 1. Missing when there is none: chi-square
+  /// and F take only a p up to that of nc = 0. At most 100 steps.
+  static double FindNCParamT(double x, double df, double p);
+  static double FindNCParamChi(double x, double df, double p);
+  static double FindNCParamF(double x, double df1, double df2, double p);
+
+  /// How a percentile lies between the ordered values. Numbered as by R. J. Hyndman and Y. Fan, "Sample
+  /// quantiles in statistical packages" (1996). W is the sum of the weights, and a value of weight w stands
+  /// for w equal values.
+  enum PercentileMethod {
+    kEmpirical = 1,             ///< The first value whose cumulative weight reaches W p.
+    kEmpiricalAverage = 2,      ///< The same, but where it is reached exactly halfway to the next value.
+    kClosest = 3,               ///< The value closest to the position W p; of two, the one of even rank.
+    kWeightedAverage = 4,       ///< Between the values around the position W p.
+    kWeightedAverageHalf = 5,   ///< ... W p + 1/2.
+    kWeightedAveragePlus = 6,   ///< ... (W + 1) p.
+    kWeightedAverageMinus = 7,  ///< ... (W - 1) p + 1.
+    kMedianUnbiased = 8,        ///< ... (W + 1/3) p + 1/3.
+    kNormalUnbiased = 9,        ///< ... (W + 1/4) p + 3/8.
+    kTukeyHinges = 10           ///< J. W. Tukey's hinges and the median; p is 0.25, 0.5 or 0.75.
+  };
+
+  // --- Samples of n >= 1 values, sorted in place: asked again they cost one pass. Nothing is copied. Cases
+  // with the missing value do not count. A NaN or an infinity among them, or no case that counts, gives the
+  // missing value. ---
+  /// The percentile at the share p, 0 <= p <= 1.
+  /// weights  n numbers >= 0, moved along with their values; null: 1 each. A missing one does not count.
+  static double GPTile(long n, double* values, double* weights, double p,
+                       PercentileMethod method = kWeightedAveragePlus);
+  /// The confidence interval of the median that holds for any continuous distribution: from the r-th smallest
+  /// value to the r-th largest, r as large as the level allows. Returns the exact probability with which such
+  /// intervals hold the median, at least `level`, 0 < level < 1.
+  /// lower, upper  overwritten; missing, as is the result, when the sample is too small for the level.
+  static double Mednci(long n, double* values, double level, double& lower, double& upper);
+
   /// The logarithm of the gamma function at x > 0.
   static double vexadnlgam(double x);
 
@@ -77,6 +129,10 @@ class KESTREL_API MCDistFun {
                        const double& b, bool upper, long& err);
   static double cdfbet(const double& x, const double& a, const double& b, long& err);
   static double betinv(const double& p, const double& a, const double& b, long& err);
+
+  /// The non-central beta distribution at ratio / (1 + ratio), or above it; nc is the numerator's.
+  static double ncdbet(const double& ratio, const double& a, const double& b, const double& nc, bool upper,
+                       long& err);
 
   /// P(T > size), size >= 0.
   static double vexasigt(const double& size, const double& df, long& err);

@@ -1,0 +1,187 @@
+#include "kestrel/math/PointProbability.h"
+
+#include <algorithm>
+#include <cmath>
+
+#include "kestrel/math/MCPower.h"
+#include "kestrel/math/SaddlePoint.h"
+
+namespace MCMath_800 {
+
+namespace {
+
+constexpr double kTwoPi = 6.283185307179586;
+
+/// x ln(x / mean) + mean - x for x >= 0, mean > 0, where distance = mean - x is known better than the
+/// subtraction gives it (Loader 2000, "Fast and accurate computation of binomial probabilities").
+double Deviance(double x, double mean, double distance) {
+  if (x == 0.0) return mean;
+  // Close to the mean the logarithm and the distance cancel. Far below x the quotient would be rounded to -1.
+  if (distance > -0.5 * x) return x * LogDeviance(distance / x);
+  return x * std::log(x / mean) + distance;
+}
+
+/// A quotient of factorials by Stirling's formula, m! = m^m e^-m sqrt(2 pi m) e^StirlingError(m), without the
+/// powers, which the deviances hold. 0! is 1, and 0^0 e^-0 as well.
+class FactorialQuotient {
+ public:
+  void Multiply(double m) {
+    if (m == 0.0) return;
+    above_ *= kTwoPi * m;
+    error_ += StirlingError(m);
+  }
+  void Divide(double m) {
+    if (m == 0.0) return;
+    below_ *= kTwoPi * m;
+    error_ -= StirlingError(m);
+  }
+  /// The quotient times e^-deviance.
+  double Times(double deviance) const {
+    const double exponent = error_ - deviance;
+    return MCPower::ExpUnderflow(exponent) ? 0.0 : std::sqrt(above_ / below_) * std::exp(exponent);
+  }
+
+ private:
+  double above_ = 1.0;
+  double below_ = 1.0;
+  double error_ = 0.0;
+};
+
+/// The nodes above 0 and the weights of Gauss's quadrature with 32 points on [-1, 1].
+struct Node {
+  double at;
+  double weight;
+};
+constexpr Node kNodes[] = {
+    {0.04830766568773831623, 0.09654008851472780057}, {0.1444719615827964935, 0.09563872007927485942},
+    {0.2392873622521370745, 0.09384439908080456564},  {0.3318686022821276498, 0.09117387869576388471},
+    {0.4213512761306353454, 0.08765209300440381114},  {0.50689990893222939, 0.08331192422694675522},
+    {0.587715757240762329, 0.07819389578707030647},   {0.663044266930215201, 0.07234579410884850623},
+    {0.7321821187402896804, 0.06582222277636184684},  {0.794483795967942407, 0.05868409347853554715},
+    {0.8493676137325699701, 0.0509980592623761762},   {0.896321155766052124, 0.04283589802222668066},
+    {0.9349060759377396892, 0.0342738629130214331},   {0.9647622555875064308, 0.02539206530926205946},
+    {0.9856115115452683354, 0.01627439473090567061},  {0.9972638618494815635, 0.0070186100094700966},
+};
+
+/// The table with its margins and how far the drawn successes are above their mean, which has digits that
+/// the cells alone have lost.
+struct MarkedTable {
+  FourFold cells;
+  double deviation;
+};
+
+MarkedTable Mark(const FourFold& table) {
+  const double total = table.drawnSuccesses + table.leftSuccesses + table.drawnFailures + table.leftFailures;
+  const ExactProduct main = MultiplyExactly(table.drawnSuccesses, table.leftFailures);
+  const ExactProduct side = MultiplyExactly(table.leftSuccesses, table.drawnFailures);
+  return {table, ((main.high - side.high) + (main.low - side.low)) / total};
+}
+
+/// The table with `step` drawn successes fewer and the same margins.
+MarkedTable Below(const MarkedTable& table, double step) {
+  const FourFold& c = table.cells;
+  return {{c.drawnSuccesses - step, c.leftSuccesses + step, c.drawnFailures + step, c.leftFailures - step},
+          table.deviation - step};
+}
+
+double Probability(const MarkedTable& table) {
+  const FourFold& c = table.cells;
+  const double successes = c.drawnSuccesses + c.leftSuccesses;
+  const double failures = c.drawnFailures + c.leftFailures;
+  const double drawn = c.drawnSuccesses + c.drawnFailures;
+  const double left = c.leftSuccesses + c.leftFailures;
+  const double total = drawn + left;
+  FactorialQuotient factorials;
+  for (const double margin : {successes, failures, drawn, left})
+    factorials.Multiply(margin);
+  factorials.Divide(total);
+  for (const double cell : {c.drawnSuccesses, c.leftSuccesses, c.drawnFailures, c.leftFailures})
+    factorials.Divide(cell);
+  const double up = table.deviation;
+  return factorials.Times(Deviance(c.drawnSuccesses, successes * (drawn / total), -up) +
+                          Deviance(c.leftSuccesses, successes * (left / total), up) +
+                          Deviance(c.drawnFailures, failures * (drawn / total), up) +
+                          Deviance(c.leftFailures, failures * (left / total), -up));
+}
+
+/// Adds up the tail term by term; the quotients of neighbours are rational.
+double SumOfTerms(const FourFold& table, double first) {
+  double a = table.drawnSuccesses, b = table.leftSuccesses, c = table.drawnFailures, d = table.leftFailures;
+  double sum = 1.0, term = 1.0;
+  while (a > 0.0 && d > 0.0 && term > 1e-17 * sum) {
+    b += 1.0;
+    c += 1.0;
+    term *= a * d / (b * c);
+    sum += term;
+    a -= 1.0;
+    d -= 1.0;
+  }
+  return first * sum;
+}
+
+/// What the derivatives of the curve through the probabilities add to its integral to make the sum
+/// (Euler and Maclaurin), as a multiple of the probability at the end.
+double EndCorrection(const FourFold& table) {
+  double first = 0.0, second = 0.0, third = 0.0;  // derivatives of the curve's logarithm
+  const auto add = [&](double cell, double sign) {
+    const double middle = cell + 0.5;
+    first -= sign / (24.0 * middle * middle);
+    second -= 1.0 / middle;
+    third += sign / (middle * middle);
+  };
+  add(table.drawnSuccesses, 1.0);
+  add(table.leftSuccesses, -1.0);
+  add(table.drawnFailures, -1.0);
+  add(table.leftFailures, 1.0);
+  first += std::log((table.leftSuccesses + 0.5) / (table.drawnSuccesses + 0.5) *
+                    ((table.drawnFailures + 0.5) / (table.leftFailures + 0.5)));
+  const double square = first * first;
+  const double thirdOfCurve = first * (square + 3.0 * second) + third;
+  const double fifthOfCurve =
+      first * (square * (square + 10.0 * second) + 15.0 * second * second) + 10.0 * third * (square + second);
+  return 0.5 + first / 12.0 - thirdOfCurve / 720.0 + fifthOfCurve / 30240.0;
+}
+
+}  // namespace
+
+bool IsCount(double n) {
+  return n >= 0.0 && n <= kLargestCount && std::floor(n) == n;
+}
+
+double BinomialProbability(double k, double n, double prob) {
+  FactorialQuotient factorials;
+  factorials.Multiply(n);
+  factorials.Divide(k);
+  factorials.Divide(n - k);
+  const ExactProduct mean = MultiplyExactly(n, prob);
+  const double distance = (mean.high - k) + mean.low;
+  return factorials.Times(Deviance(k, mean.high, distance) + Deviance(n - k, n * (1.0 - prob), -distance));
+}
+
+double HypergeometricProbability(const FourFold& table) {
+  return Probability(Mark(table));
+}
+
+double HypergeometricLowerTail(const FourFold& table) {
+  const MarkedTable marked = Mark(table);
+  const double last = Probability(marked);
+  // How far down the terms matter: the logarithm falls by 40 with the slope and the curvature at the end.
+  const double b = table.leftSuccesses + 1.0, c = table.drawnFailures + 1.0;
+  const double a = table.drawnSuccesses + 1.0, d = table.leftFailures + 1.0;
+  const double slope = std::max(0.0, std::log(b / a * (c / d)));
+  const double curvature = 1.0 / a + 1.0 / b + 1.0 / c + 1.0 / d;
+  const double length = 80.0 / (slope + std::sqrt(slope * slope + 80.0 * curvature));
+  constexpr double kManyTerms = 800.0;
+  // Where a cell runs empty within that length there are too few terms to need anything else.
+  if (length < kManyTerms || std::min(a, d) < 1.05 * length + 100.0) return SumOfTerms(table, last);
+  const double half = 0.525 * length;
+  double integral = 0.0;
+  for (const Node& node : kNodes) {
+    const double step = half * node.at;
+    integral +=
+        node.weight * (Probability(Below(marked, half - step)) + Probability(Below(marked, half + step)));
+  }
+  return half * integral + last * EndCorrection(table);
+}
+
+}  // namespace MCMath_800

@@ -1,0 +1,186 @@
+// Non-central t, chi-square and F: edges, identities between them, and the search for the parameter. The
+// reference values are in tests/data/math/noncentral_*.csv.
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+
+#include "kestrel/foundation/MCMV.h"
+#include "kestrel/math/MCDistFun.h"
+#include "tests/dictionary/AllocationCounter.h"
+#include "tests/math/BitPatterns.h"
+
+namespace {
+
+using MCMath_800::MCDistFun;
+
+constexpr double kMissing = MCCommon_800::MCMV::gMissingValue;
+constexpr double kInfinity = std::numeric_limits<double>::infinity();
+constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
+
+TEST(NonCentral, GivesReferenceValues) {
+  struct Row {
+    const char* why;
+    double value, want, digits;
+  };
+  // mpmath, 25 digits.
+  const Row kRows[] = {
+      {"t, both signs alike", MCDistFun::NonCentralCdfT(3.02313, 33.5, 3.0803), 0.4698709742765841024412138,
+       1e-14},
+      {"t across zero", MCDistFun::NonCentralCdfT(-0.01231364, 5.95348, 0.012268),
+       1.0 - MCDistFun::NonCentralCdfT(0.01231364, 5.95348, -0.012268), 1e-12},
+      {"t below a negative parameter", MCDistFun::NonCentralCdfT(-1.455133, 16.3596, -1.9711),
+       0.6991600311918548094552705, 1e-14},
+      {"t above a negative parameter", MCDistFun::NonCentralCdfT(0.1949274, 48844.9, 0.14531),
+       0.519785958369346911703419, 1e-13},
+      {"t, far lower tail", MCDistFun::NonCentralCdfT(-21.41134, 24164.6, -0.017789),
+       6.60593821082961595655962e-101, 1e-10},
+      {"t, farther", MCDistFun::NonCentralCdfT(-61299930000.0, 20.8637, 0.86639),
+       6.441771815956448058451119e-215, 1e-10},
+      {"chi-square", MCDistFun::NonCentralCdfChi(741.0085, 678.769, 0.45426), 0.9500636557189442604615252,
+       1e-14},
+      {"chi-square, large parameters", MCDistFun::NonCentralCdfChi(109662.7, 100000.0, 9664.8),
+       0.4988735942824718082570681, 1e-12},
+      {"chi-square, far lower tail", MCDistFun::NonCentralCdfChi(25205.15, 32189.7, 1789.7),
+       2.815339300930645541028145e-286, 1e-10},
+      {"F", MCDistFun::NonCentralCdfF(1.238296, 2173.84, 30629.2, 517.78), 0.5045865352109125218038437,
+       1e-12},
+      {"F, many terms", MCDistFun::NonCentralCdfF(2.946115, 3945.23, 645.637, 7772.2),
+       0.4382980305089065957222037, 1e-12},
+      {"F, few degrees of freedom", MCDistFun::NonCentralCdfF(6231.493, 0.301546, 9.71155, 1339.1),
+       0.7085834053381466597485127, 1e-12},
+  };
+  for (const Row& row : kRows)
+    EXPECT_NEAR(row.value, row.want, row.digits * row.want) << row.why;
+}
+
+TEST(NonCentral, IsTheCentralDistributionAtZero) {
+  for (const double df : {0.5, 3.0, 250.0}) {
+    for (const double x : {0.1, 1.0, 7.0}) {
+      EXPECT_NEAR(MCDistFun::NonCentralCdfChi(x, df, 0.0), MCDistFun::CdfChi(x, df), 1e-15);
+      EXPECT_NEAR(MCDistFun::NonCentralCdfT(x, df, 0.0), MCDistFun::CdfT(x, df), 1e-15);
+      EXPECT_NEAR(MCDistFun::NonCentralCdfT(-x, df, 0.0), MCDistFun::CdfT(-x, df), 1e-15);
+      EXPECT_NEAR(MCDistFun::NonCentralCdfF(x, df, 8.0, 0.0), MCDistFun::CdfF(x, df, 8.0), 1e-15);
+      EXPECT_NEAR(MCDistFun::NonCentralCdfChi(x, df, 1e-300), MCDistFun::CdfChi(x, df), 1e-15);
+      EXPECT_NEAR(MCDistFun::NonCentralCdfT(x, df, 1e-300), MCDistFun::CdfT(x, df), 1e-15);
+    }
+  }
+}
+
+// With one degree of freedom chi-square is the square of a shifted normal number, and F that of a t.
+TEST(NonCentral, AgreesAcrossFamilies) {
+  for (const double nc : {0.01, 0.7, 3.0, 20.0, 300.0, 9000.0}) {
+    for (const double away : {-5.0, -1.0, 0.0, 2.0}) {
+      const double x = nc + away;
+      if (x <= 0.0) continue;
+      const double square = MCDistFun::NonCentralCdfChi(x * x, 1.0, nc * nc);
+      const double normal = MCDistFun::CdfStdNorm(x - nc) - MCDistFun::CdfStdNorm(-x - nc);
+      EXPECT_NEAR(square, normal, 1e-10 * normal) << nc << " " << away;
+      for (const double df : {0.3, 5.0, 80.0, 1e6}) {
+        const double t = MCDistFun::NonCentralCdfT(x, df, nc) - MCDistFun::NonCentralCdfT(-x, df, nc);
+        const double f = MCDistFun::NonCentralCdfF(x * x, 1.0, df, nc * nc);
+        EXPECT_NEAR(t, f, 1e-10) << nc << " " << away << " " << df;
+        const double above = MCDistFun::NonCentralCdfF(x * x, 1.0, df, nc * nc, true);
+        EXPECT_NEAR(f + above, 1.0, 1e-12) << nc << " " << away << " " << df;
+      }
+    }
+  }
+}
+
+TEST(NonCentral, RisesWithXAndFallsWithTheParameter) {
+  for (const double df : {0.1, 2.0, 40.0, 1e5}) {
+    for (const double nc : {0.5, 30.0, 1000.0, 2e5}) {
+      double before = 0.0;
+      for (double x = 0.25 * (df + nc); x < 4.0 * (df + nc); x *= 1.1) {
+        const double share = MCDistFun::NonCentralCdfChi(x, df, nc);
+        EXPECT_GE(share, before * (1.0 - 1e-11)) << x << " " << df << " " << nc;
+        EXPECT_LE(MCDistFun::NonCentralCdfChi(x, df, nc * 1.01), share * (1.0 + 1e-11))
+            << x << " " << df << " " << nc;
+        before = share;
+      }
+      EXPECT_GT(before, 0.5);
+    }
+  }
+}
+
+TEST(NonCentral, RefusesWhatIsOutsideTheDomain) {
+  struct Row {
+    const char* why;
+    double value;
+  };
+  const Row kRows[] = {
+      {"t: NaN as x", MCDistFun::NonCentralCdfT(kNaN, 3, 1)},
+      {"t: infinite x", MCDistFun::NonCentralCdfT(kInfinity, 3, 1)},
+      {"t: x past its limit", MCDistFun::NonCentralCdfT(1e141, 3, 1)},
+      {"t: no degree of freedom", MCDistFun::NonCentralCdfT(1, 0, 1)},
+      {"t: NaN as df", MCDistFun::NonCentralCdfT(1, kNaN, 1)},
+      {"t: too many degrees of freedom", MCDistFun::NonCentralCdfT(1, 1.1e10, 1)},
+      {"t: parameter past its limit", MCDistFun::NonCentralCdfT(1, 3, -3.1e4)},
+      {"t: NaN as parameter", MCDistFun::NonCentralCdfT(1, 3, kNaN)},
+      {"chi-square: negative parameter", MCDistFun::NonCentralCdfChi(1, 3, -1e-9)},
+      {"chi-square: parameter past its limit", MCDistFun::NonCentralCdfChi(1, 3, 1.1e9)},
+      {"chi-square: NaN as x", MCDistFun::NonCentralCdfChi(kNaN, 3, 1)},
+      {"chi-square: infinite df", MCDistFun::NonCentralCdfChi(1, kInfinity, 1)},
+      {"F: negative df1", MCDistFun::NonCentralCdfF(1, -3, 4, 1)},
+      {"F: no df2", MCDistFun::NonCentralCdfF(1, 3, 0, 1)},
+      {"F: NaN as parameter", MCDistFun::NonCentralCdfF(1, 3, 4, kNaN)},
+      {"F: infinite x", MCDistFun::NonCentralCdfF(kInfinity, 3, 4, 1)},
+      {"search t: p is 0", MCDistFun::FindNCParamT(1, 3, 0.0)},
+      {"search t: p is 1", MCDistFun::FindNCParamT(1, 3, 1.0)},
+      {"search t: out of reach", MCDistFun::FindNCParamT(1e10, 1e9, 0.5)},
+      {"search chi-square: p above the central one", MCDistFun::FindNCParamChi(1, 3, 0.9)},
+      {"search chi-square: x is 0", MCDistFun::FindNCParamChi(0, 3, 0.5)},
+      {"search chi-square: NaN as p", MCDistFun::FindNCParamChi(5, 3, kNaN)},
+      {"search F: p above the central one", MCDistFun::FindNCParamF(0.1, 3, 5, 0.9)},
+      {"search F: no df1", MCDistFun::FindNCParamF(2, 0, 5, 0.1)},
+  };
+  for (const Row& row : kRows)
+    EXPECT_EQ(row.value, kMissing) << row.why;
+  EXPECT_EQ(MCDistFun::NonCentralCdfChi(0, 3, 1), 0.0);
+  EXPECT_EQ(MCDistFun::NonCentralCdfF(-1, 3, 4, 1), 0.0);
+  EXPECT_EQ(MCDistFun::NonCentralCdfF(-1, 3, 4, 1, true), 1.0);
+}
+
+TEST(NonCentral, SearchTurnsTheProbabilityBack) {
+  for (const double df : {0.2, 3.0, 25.0, 4000.0}) {
+    for (const double x : {0.5, 4.0, 60.0}) {
+      const double central = MCDistFun::CdfChi(x, df);
+      const double centralF = MCDistFun::CdfF(x, df, 12.0);
+      for (const double share : {1e-9, 0.01, 0.2, 0.7, 0.999}) {
+        const double p = share * central;
+        if (p > 1e-290) {
+          const double nc = MCDistFun::FindNCParamChi(x, df, p);
+          EXPECT_NEAR(MCDistFun::NonCentralCdfChi(x, df, nc), p, 1e-12 * p) << x << " " << df << " " << p;
+        }
+        const double pF = share * centralF;
+        const double ncF = MCDistFun::FindNCParamF(x, df, 12.0, pF);
+        EXPECT_NEAR(MCDistFun::NonCentralCdfF(x, df, 12.0, ncF), pF, 1e-12 * pF) << x << " " << df;
+        for (const double sign : {-1.0, 1.0}) {
+          const double ncT = MCDistFun::FindNCParamT(sign * x, df, share);
+          EXPECT_NEAR(MCDistFun::NonCentralCdfT(sign * x, df, ncT), share, 2e-12 * share)
+              << sign * x << " " << df << " " << share;
+        }
+      }
+    }
+  }
+  EXPECT_EQ(MCDistFun::FindNCParamChi(4.0, 3.0, MCDistFun::NonCentralCdfChi(4.0, 3.0, 0.0)), 0.0);
+}
+
+TEST(NonCentral, NoBitPatternGivesInfinityOrNaNAndNothingAllocates) {
+  kestrel_tests::BitPatterns patterns(21);
+  const long before = MCKestrel_800::AllocationsSoFar();
+  for (int i = 0; i < 100000; ++i) {
+    const double a = patterns.Next(), b = patterns.Next(), c = patterns.Next(), d = patterns.Next();
+    ASSERT_TRUE(std::isfinite(MCDistFun::NonCentralCdfT(a, b, c))) << a << " " << b << " " << c;
+    ASSERT_TRUE(std::isfinite(MCDistFun::NonCentralCdfChi(a, b, c))) << a << " " << b << " " << c;
+    ASSERT_TRUE(std::isfinite(MCDistFun::NonCentralCdfF(a, b, c, d)))
+        << a << " " << b << " " << c << " " << d;
+    ASSERT_TRUE(std::isfinite(MCDistFun::FindNCParamT(a, b, c))) << a << " " << b << " " << c;
+    ASSERT_TRUE(std::isfinite(MCDistFun::FindNCParamChi(a, b, c))) << a << " " << b << " " << c;
+    ASSERT_TRUE(std::isfinite(MCDistFun::FindNCParamF(a, b, c, d))) << a << " " << b << " " << c << " " << d;
+  }
+  EXPECT_EQ(MCKestrel_800::AllocationsSoFar(), before);
+}
+
+}  // namespace
