@@ -131,15 +131,16 @@ double FindNonCentrality(double p, double low, double high, double start, double
   for (int step = 0; step < kStepLimit; ++step) {
     const double unit = 1.0 + std::fabs(target);
     if (std::fabs(away) <= 1e-15 * unit) return at;
-    // Below that the probability's own rounding would be searched.
-    if (std::fabs(away) <= 1e-11 * unit && std::fabs(away) > 0.5 * std::fabs(before)) return at;
     (away > 0.0 ? low : high) = at;
     double next = at - away / slope;
     const bool inside = next > low && next < high;
+    // The error after a secant step is about the product of the last two. So close, more steps would search
+    // in the probability's own rounding.
+    const bool close = std::fabs(away) <= 1e-10 * unit;
+    if (step > 0 && (close || (std::fabs(away * before) <= 1e-15 && std::fabs(away) <= 1e-6)))
+      return inside ? next : at;
     if (!inside) next = std::sinh(0.5 * (std::asinh(low) + std::asinh(high)));
     if (next == at || !(next > low && next < high)) break;
-    // The error after a secant step is about the product of the last two.
-    if (inside && step > 0 && std::fabs(away * before) <= 1e-15 && std::fabs(away) <= 1e-6) return next;
     before = away;
     const double moved = next - at;
     at = next;
