@@ -17,6 +17,22 @@ using MCMath_800::MCDistFun;
 
 constexpr AccuracyGoal kCentral = {1e-14, 1e-12};
 constexpr AccuracyGoal kInverse = {1e-12, 1e-12};
+constexpr AccuracyGoal kExact = {0.0, 0.0};
+constexpr AccuracyGoal kNonCentral = {1e-10, 1e-10};
+
+using BinomialFunction = double (*)(double x, double n, double prob, long& err);
+
+double Checked(BinomialFunction function, const double* a) {
+  long err = 0;
+  const double value = function(a[0], a[1], a[2], err);
+  return err == 0 ? value : std::numeric_limits<double>::quiet_NaN();
+}
+
+double CheckedHyper(const double* a) {
+  long err = 0;
+  const double value = MCDistFun::CDFHyper(a[0], a[1], a[2], a[3], err);
+  return err == 0 ? value : std::numeric_limits<double>::quiet_NaN();
+}
 
 // Halving and doubling are exact, so the tables of the gamma distribution serve for chi-square as well.
 const std::vector<ReferenceFunction> kFunctions = {
@@ -53,6 +69,26 @@ const std::vector<ReferenceFunction> kFunctions = {
      [](const double* a) { return MCDistFun::IdfBeta(a[0], a[1], a[2]); }, kInverse},
     {"vexadnlgam(x)", "lgamma", "x", "value", [](const double* a) { return MCDistFun::vexadnlgam(a[0]); },
      kCentral},
+    {"PdfBin(x, n, prob)", "binomial", "k n p", "pdf",
+     [](const double* a) { return Checked(MCDistFun::PdfBin, a); }, kCentral},
+    {"CdfBin(x, n, prob)", "binomial", "k n p", "cdf",
+     [](const double* a) { return Checked(MCDistFun::CdfBin, a); }, kCentral},
+    {"IdfBin(p, n, prob)", "binomial", "middle n p", "k",
+     [](const double* a) { return Checked(MCDistFun::IdfBin, a); }, kExact},
+    {"CDFHyper(x, total, successes, draws)", "hypergeometric", "k total successes draws", "cdf", CheckedHyper,
+     kCentral},
+    {"NonCentralCdfT(x, df, nc)", "noncentral_t", "x df nc", "cdf",
+     [](const double* a) { return MCDistFun::NonCentralCdfT(a[0], a[1], a[2]); }, kNonCentral},
+    {"NonCentralCdfChi(x, df, nc)", "noncentral_chi", "x df nc", "cdf",
+     [](const double* a) { return MCDistFun::NonCentralCdfChi(a[0], a[1], a[2]); }, kNonCentral},
+    {"NonCentralCdfF(x, df1, df2, nc)", "noncentral_f", "x df1 df2 nc", "cdf",
+     [](const double* a) { return MCDistFun::NonCentralCdfF(a[0], a[1], a[2], a[3]); }, kNonCentral},
+    {"FindNCParamT(x, df, p)", "noncentral_t", "x df cdf", "nc_root",
+     [](const double* a) { return MCDistFun::FindNCParamT(a[0], a[1], a[2]); }, kNonCentral},
+    {"FindNCParamChi(x, df, p)", "noncentral_chi", "x df cdf", "nc_root",
+     [](const double* a) { return MCDistFun::FindNCParamChi(a[0], a[1], a[2]); }, kNonCentral},
+    {"FindNCParamF(x, df1, df2, p)", "noncentral_f", "x df1 df2 cdf", "nc_root",
+     [](const double* a) { return MCDistFun::FindNCParamF(a[0], a[1], a[2], a[3]); }, kNonCentral},
 };
 
 size_t ColumnOf(const PlainTable& table, const std::string& name) {
