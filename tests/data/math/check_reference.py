@@ -35,7 +35,7 @@ def log_gamma(x):
 def gamma(x, a):
     if a > 3000 or a < 20 and x > 3000:
         # The density's logarithm, so that no power overflows.
-        if abs(x - a) > 12 * mp.sqrt(a):
+        if abs(x - a) > 6 * mp.sqrt(a):
             return None
         log_front = -mp.loggamma(a)
         value = integral(lambda t: mp.exp((a - 1) * mp.log(t) - t + log_front), mpf(0), x, a, mp.sqrt(a))
@@ -48,7 +48,7 @@ def incomplete_beta(a, b, x, y):
     """By hypergeometric series with whatever digits the tail asks for, or by quadrature."""
     if max(a, b) > 2000:
         mean, sd = a / (a + b), mp.sqrt(a * b / (a + b)) / (a + b)
-        if min(a, b) < 30 or abs(x - mean) > 12 * sd:
+        if min(a, b) < 30 or abs(x - mean) > 6 * sd:
             return None
         front = mp.loggamma(a + b) - mp.loggamma(a) - mp.loggamma(b)
         lower = integral(lambda t: mp.exp((a - 1) * mp.log(t) + (b - 1) * mp.log(1 - t) + front), mpf(0), x, mean, sd)
@@ -162,8 +162,8 @@ def main():
             rows = list(csv.DictReader(file))
         worst = {}
         for row in rows[::max(1, len(rows) // options.rows)]:
-            wanted = ("cdf", "sig", "pdf", "value", "quantile", "nc_root")
-            arguments = [mpf(float(text)) for column, text in row.items() if column not in wanted]
+            values = ("cdf", "sig", "pdf", "value", "quantile", "nc_root", "middle")
+            arguments = [mpf(float(text)) for column, text in row.items() if column not in values]
             for column, other in (method(*arguments) or {}).items():
                 difference = abs(mpf(row[column]) / other - 1)
                 count, largest, _ = worst.get(column, (0, mpf(-1), None))
