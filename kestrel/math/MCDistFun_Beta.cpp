@@ -51,7 +51,8 @@ double LeadingLogOdds(double p, double a, double b) {
 
 // After G. W. Cran, K. J. Martin and G. E. Thomas, "Remark AS R19 and algorithm AS 109", Applied Statistics
 // 26 (1977) 111-114: a normal approximation for shapes above 1, and the leading power of the nearer end for
-// others.
+// others. The approximation is kept inside what is searched: in far tails of shapes close to 1 it lies many
+// powers of ten outside, from where the search would not begin.
 double StartOdds(double p, double q, double a, double b) {
   if (a > 1.0 && b > 1.0) {
     const double z = p < q ? MCDistFun::IdfStdNorm(p) : -MCDistFun::IdfStdNorm(q);
@@ -61,7 +62,7 @@ double StartOdds(double p, double q, double a, double b) {
     const double h = 2.0 / (ra + rb);
     const double root = std::sqrt(std::max(0.0, h + lambda));
     const double w = z * root / h + (rb - ra) * (lambda + 5.0 / 6.0 - 2.0 / (3.0 * h));
-    return a / b * std::exp(2.0 * w);
+    return std::clamp(a / b * std::exp(2.0 * w), 1e-280, 1e280);
   }
   // The two halves of the distribution as if each were a power.
   const double left = std::exp(a * std::log(a / (a + b))) / a;

@@ -203,6 +203,26 @@ TEST(MCDistFun, InversesLeadBack) {
   }
 }
 
+// There the normal approximation that the search starts from lies hundreds of powers of ten away.
+TEST(MCDistFun, FindsQuantilesInTheFarTailsOfShapesCloseToOne) {
+  const struct {
+    double found, expected;
+    const char* why;
+  } rows[] = {
+      {MCDistFun::IdfBeta(1.7844122867831902e-259, 1.08855, 27.4173), 7.534422e-240, "beta"},
+      {MCDistFun::IdfBeta(2.398276742341017e-262, 1.13795, 4.33831), 2.991555e-231, "beta, small shapes"},
+      {MCDistFun::IdfF(1.2264911584754121e-296, 2.12627, 364817), 4.429916e-279, "F, many df"},
+      {MCDistFun::IdfF(7.672876663251049e-262, 2.02024, 21153), 3.151004e-259, "F"},
+  };
+  for (const auto& row : rows) {
+    // As many digits as the shapes are given with.
+    EXPECT_NEAR(row.found, row.expected, 2e-5 * row.expected) << row.why;
+  }
+  EXPECT_NEAR(MCDistFun::CdfBeta(MCDistFun::IdfBeta(1e-259, 1.08855, 27.4173), 1.08855, 27.4173), 1e-259,
+              1e-271);
+  EXPECT_NEAR(MCDistFun::CdfF(MCDistFun::IdfF(1e-296, 2.12627, 364817), 2.12627, 364817), 1e-296, 1e-308);
+}
+
 TEST(MCDistFun, TailQuantilesOfTheNormalLeadBack) {
   for (double log_p = -307.0; log_p < -0.31; log_p += 0.37) {
     const double p = std::pow(10.0, log_p);
