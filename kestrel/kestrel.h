@@ -77,6 +77,8 @@
 #include "kestrel/predicates/ScoreValueRange.h"
 #include "kestrel/predicates/SetPredicate.h"
 #include "kestrel/predicates/SimplePredicate.h"
+#include "kestrel/transform/BuiltinFunctions.h"
+#include "kestrel/transform/TransformFunction.h"
 #include "kestrel/transform/TransformationDictionary.h"
 #include "kestrel/translate/BaseTranslator.h"
 #include "kestrel/translate/DOMElemUtility.h"
