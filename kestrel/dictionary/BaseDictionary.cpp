@@ -3,13 +3,16 @@
 #include <ostream>
 #include <utility>
 
+#include "kestrel/dictionary/LayoutStamp.h"
+
 namespace MCKestrel_800 {
 
 ScoreDictionary::~ScoreDictionary() = default;
 
-BaseDictionary::BaseDictionary() = default;
+BaseDictionary::BaseDictionary() : stamp_(NewLayoutStamp()) {}
 
-BaseDictionary::BaseDictionary(const BaseDictionary& other) : ScoreDictionary(other), names_(other.names_) {
+BaseDictionary::BaseDictionary(const BaseDictionary& other)
+    : ScoreDictionary(other), names_(other.names_), stamp_(NewLayoutStamp()) {
   for (const auto& [name, var] : other.vars_) {
     vars_.emplace_hint(vars_.end(), name, std::unique_ptr<ScoreDictVar>(var->Clone()));
   }
@@ -20,6 +23,7 @@ BaseDictionary& BaseDictionary::operator=(const BaseDictionary& other) {
   BaseDictionary copy(other);
   vars_.swap(copy.vars_);
   names_.swap(copy.names_);
+  stamp_ = copy.stamp_;
   return *this;
 }
 
@@ -32,6 +36,7 @@ BaseDictionary* BaseDictionary::Clone() const {
 bool BaseDictionary::AddVar(const ScoreDictionary* other) {
   if (other == nullptr) return false;
   std::vector<std::string> names = other->GetVarNames();
+  stamp_ = NewLayoutStamp();
   for (const std::string& name : names) {
     // A name that was removed from the other dictionary is still listed there.
     const ScoreDictVar* var = other->GetVar(name);
@@ -48,11 +53,13 @@ bool BaseDictionary::AddVar(const std::string& name, ScoreDictVar* var) {
   // A refused variable is not deleted: its caller may still hold it, and may have added the same object
   // before.
   if (vars_.count(name) == 0) vars_.emplace(name, std::unique_ptr<ScoreDictVar>(var));
+  stamp_ = NewLayoutStamp();
   return true;
 }
 
 bool BaseDictionary::RemoveVar(const std::string& name) {
   if (name.empty()) return false;
+  stamp_ = NewLayoutStamp();
   return vars_.erase(name) != 0;
 }
 
@@ -87,6 +94,10 @@ void BaseDictionary::Display(std::ostream& os) const {
   for (const auto& [name, var] : vars_)
     var->Display(os);
   os << "End Of ScoreDictionary display.\n\n";
+}
+
+unsigned long long BaseDictionary::GetLayoutStamp() const {
+  return stamp_;
 }
 
 }  // namespace MCKestrel_800

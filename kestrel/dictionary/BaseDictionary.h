@@ -30,10 +30,12 @@ class KESTREL_API BaseDictionary : public ScoreDictionary {
   std::vector<ScoreDictVar*> GetScoreDictVars() const override;
   std::vector<std::string> GetVarNames() const override;
   void Display(std::ostream& os) const override;
+  unsigned long long GetLayoutStamp() const override;
 
  private:
   std::map<std::string, std::unique_ptr<ScoreDictVar>> vars_;
   std::vector<std::string> names_;
+  unsigned long long stamp_;
 };
 
 }  // namespace MCKestrel_800

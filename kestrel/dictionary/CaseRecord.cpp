@@ -1,11 +1,11 @@
 #include "kestrel/dictionary/CaseRecord.h"
 
 #include <algorithm>
-#include <atomic>
 #include <memory>
 #include <ostream>
 #include <typeinfo>
 
+#include "kestrel/dictionary/LayoutStamp.h"
 #include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
@@ -18,19 +18,11 @@ namespace {
 // memory.
 constexpr std::size_t kMaxReserve = 65536;
 
-// Drawn from a counter. A hash of the names would be cheaper to share between records filled alike, but two
-// layouts could have the same one, and a model would then silently read the wrong columns; the counter cannot
-// repeat within a process. 64 bits last for centuries of adding a name each nanosecond.
-unsigned long long NewStamp() {
-  static std::atomic<unsigned long long> next{1};
-  return next.fetch_add(1, std::memory_order_relaxed);
-}
-
 }  // namespace
 
 ScoreCaseRecord::~ScoreCaseRecord() = default;
 
-CaseRecord::CaseRecord(int n) : stamp_(NewStamp()) {
+CaseRecord::CaseRecord(int n) : stamp_(NewLayoutStamp()) {
   if (n <= 0) return;
   const std::size_t room = std::min(static_cast<std::size_t>(n), kMaxReserve);
   values_.reserve(room);
@@ -83,7 +75,7 @@ void CaseRecord::Add(const std::string& name, ScoreValue* value) {
     values_.push_back(nullptr);
     numbers_.push_back(nullptr);
     size_ = values_.size();
-    stamp_ = NewStamp();
+    stamp_ = NewLayoutStamp();
   }
   Put(static_cast<std::size_t>(it->second), value);
 }

@@ -44,6 +44,12 @@ class KESTREL_API ScoreDictionary {
   /// The names in the order in which they were added, repeated and removed ones included.
   virtual std::vector<std::string> GetVarNames() const = 0;
   virtual void Display(std::ostream& os) const = 0;
+
+  /// As long as a dictionary gives the same stamp, other than 0, it holds the same variables, and no other
+  /// dictionary gives it. Derived fields keep the variables that they looked up for a stamp and ask again
+  /// only when they meet another one. 0 says that nothing is promised and variables are looked up for each
+  /// case.
+  virtual unsigned long long GetLayoutStamp() const { return 0; }
 };
 
 }  // namespace MCKestrel_800

@@ -1,0 +1,75 @@
+// Lays a function tree out as instructions.
+
+#ifndef KESTREL_TRANSFORM_APPLYCOMPILER_H
+#define KESTREL_TRANSFORM_APPLYCOMPILER_H
+
+#include <string>
+#include <vector>
+
+#include "kestrel/transform/ApplyProgram.h"
+#include "kestrel/transform/ApplySteps.h"
+#include "kestrel/transform/BuiltinFunctions.h"
+#include "kestrel/transform/FunctionTree.h"
+
+namespace MCKestrel_800 {
+
+class ScoreValue;
+
+/// Fills one program. Each operation gives the place where a node's value will stand, as the kind that is
+/// asked for; where the node is of another kind, that of a missing value.
+class ApplyCompiler {
+ public:
+  ApplyCompiler(ApplyProgram& program, const ApplyProgram::FindSource& find)
+      : program_(program), find_(find) {}
+
+  /// Numbers, and the seconds of dates and times.
+  const double* Number(const FunctionTree* node);
+  ApplyText Text(const FunctionTree* node);
+  bool IsTooDeep() const { return is_too_deep_; }
+
+ private:
+  using Kind = FunctionValueKind;
+  using Node = const FunctionTree&;
+  class Level;
+
+  const double* Seconds(const FunctionTree* node);
+  Kind KindOf(const FunctionTree* node) const;
+
+  const double* NumberOfReference(Node node);
+  const double* NumberOfFunction(Node node, const BuiltinFunction& function);
+  const double* NumberOfSpecial(Node node, TransformFunction function);
+  const double* NumberOfScalar(Node node);
+  const double* NumberOfList(Node node);
+  const double* NumberOfComparison(Node node);
+  const double* NumberOfValueList(Node node);
+  const double* NumberOfMissingTest(Node node);
+  const double* NumberOfOutlier(Node node);
+  const double* NumberOfIf(Node node);
+  const double* NumberOfImputation(Node node);
+  const double* MethodOfOutliers(const FunctionTree* node);
+  const double* Replaced(Node node, const double* result);
+
+  ApplyText TextOfReference(Node node);
+  ApplyText TextOfFunction(Node node, const BuiltinFunction& function);
+  ApplyText TextOfIf(Node node);
+  ApplyText TextOfImputation(Node node);
+  bool ReadImputation(Node node, ApplyDetail& detail);
+
+  const double* NewConstant(double number);
+  const double* MissingNumber();
+  ApplyText NewConstant(const StringValue& text);
+  ApplyText EmptyText();
+  ApplyDetail& NewDetail();
+  ApplyInstruction& Emit(ApplyInstruction::Run run, TransformFunction function = kNoFunction);
+  const double* EmitNumber(ApplyInstruction::Run run, TransformFunction function, const double* x,
+                           const double* y = nullptr, ApplyDetail* detail = nullptr);
+
+  ApplyProgram& program_;
+  const ApplyProgram::FindSource& find_;
+  int depth_ = 0;
+  bool is_too_deep_ = false;
+};
+
+}  // namespace MCKestrel_800
+
+#endif  // KESTREL_TRANSFORM_APPLYCOMPILER_H

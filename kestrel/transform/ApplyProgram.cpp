@@ -1,0 +1,37 @@
+#include "kestrel/transform/ApplyProgram.h"
+
+#include "kestrel/foundation/NumericValue.h"
+#include "kestrel/transform/ApplyCompiler.h"
+#include "kestrel/transform/ApplySteps.h"
+#include "kestrel/transform/FunctionTree.h"
+
+namespace MCKestrel_800 {
+
+ApplyProgram::ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find) {
+  numbers_.push_back(NumericValue::gSysmisValue);
+  texts_.emplace_back();
+  text_places_.push_back(&texts_.back());
+  const double* const missing = &numbers_.back();
+  const ApplyText empty = &text_places_.back();
+  number_ = missing;
+  text_ = empty;
+  ApplyCompiler compiler(*this, find);
+  if (wants_text) {
+    text_ = compiler.Text(&root);
+  } else {
+    number_ = compiler.Number(&root);
+  }
+  if (!compiler.IsTooDeep()) return;
+  code_.clear();
+  number_ = missing;
+  text_ = empty;
+}
+
+ApplyProgram::~ApplyProgram() = default;
+
+bool ApplyProgram::IsReference(const FunctionTree& node) {
+  const ApplyNodeStats& stats = node.GetNodeStats();
+  return stats.GetTransFunction() == kNoFunction && !stats.IsConstNode();
+}
+
+}  // namespace MCKestrel_800

@@ -1,0 +1,86 @@
+// A function tree laid out as a list of instructions.
+
+#ifndef KESTREL_TRANSFORM_APPLYPROGRAM_H
+#define KESTREL_TRANSFORM_APPLYPROGRAM_H
+
+#include <cstddef>
+#include <deque>
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "kestrel/foundation/StringValue.h"
+#include "kestrel/transform/TransformFunction.h"
+
+namespace MCKestrel_800 {
+
+class FunctionTree;
+class SourceField;
+struct ApplyDetail;
+
+/// One step of a program. What it reads and writes are places that stay where they are from case to case:
+/// views of the fields, constants, and results of steps before it.
+struct ApplyInstruction {
+  /// Does the step and says how many of those behind it are left out.
+  using Run = std::size_t (*)(const ApplyInstruction& step);
+
+  Run run = nullptr;
+  const double* x = nullptr;
+  const double* y = nullptr;
+  double* out = nullptr;
+  ApplyDetail* detail = nullptr;  ///< what steps on texts, lists and fields need beside that
+  TransformFunction function = kNoFunction;
+  std::size_t skip = 0;  ///< for jumps
+};
+
+/// A text that a step reads: a place that holds the address of the text.
+using ApplyText = const StringValue* const*;
+
+/// Computes the value of a tree for the case that its source fields hold.
+///
+/// Every node is, by what it is and not by the case, a number, a text or a date/time (held as the number of
+/// its seconds); `if` and the imputation are what their chosen argument is. Where another kind is needed than
+/// a node is, it counts as missing, but that a date/time is a number where one is needed.
+///
+/// Nothing is allocated from the second case on, but for texts that are longer than all before.
+class ApplyProgram {
+ public:
+  using FindSource = std::function<const SourceField&(const std::string& name)>;
+
+  /// Deeper trees have no value.
+  static constexpr int kMaxDepth = 512;
+
+  /// find  gives the field of a name that the tree refers to, which must outlive the program. The tree is not
+  ///       needed afterwards, but for the variables of its fields.
+  ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find);
+  ApplyProgram(const ApplyProgram&) = delete;
+  ApplyProgram& operator=(const ApplyProgram&) = delete;
+  ~ApplyProgram();
+
+  /// Whether a node is a reference to a field.
+  static bool IsReference(const FunctionTree& node);
+
+  void Run() {
+    const std::size_t end = code_.size();
+    for (std::size_t at = 0; at < end; ++at)
+      at += code_[at].run(code_[at]);
+  }
+  double GetNumber() const { return *number_; }
+  const StringValue& GetText() const { return **text_; }
+
+ private:
+  friend class ApplyCompiler;
+
+  std::vector<ApplyInstruction> code_;
+  const double* number_;
+  ApplyText text_;
+  // Deques, because addresses must stay.
+  std::deque<double> numbers_;
+  std::deque<StringValue> texts_;
+  std::deque<const StringValue*> text_places_;
+  std::deque<ApplyDetail> details_;
+};
+
+}  // namespace MCKestrel_800
+
+#endif  // KESTREL_TRANSFORM_APPLYPROGRAM_H

@@ -1,0 +1,198 @@
+#include "kestrel/transform/ApplySteps.h"
+
+#include <algorithm>
+#include <string_view>
+
+#include "kestrel/foundation/NumericValue.h"
+#include "kestrel/transform/FunctionEvaluation.h"
+#include "kestrel/transform/SourceField.h"
+
+namespace MCKestrel_800 {
+namespace ApplySteps {
+namespace {
+
+constexpr std::size_t kNext = 0;
+
+std::size_t Give(Step step, double result) {
+  *step.out = result;
+  return kNext;
+}
+
+// The result of a test, or of its opposite.
+std::size_t GiveTest(Step step, bool holds, TransformFunction opposite) {
+  return Give(step, holds != (step.function == opposite) ? 1.0 : 0.0);
+}
+
+const StringValue& TextOf(Step step, std::size_t index = 0) {
+  return **step.detail->texts[index];
+}
+
+}  // namespace
+
+std::size_t Add(Step step) {
+  return Give(step, PlusNumbers(*step.x, *step.y));
+}
+
+std::size_t Subtract(Step step) {
+  return Give(step, MinusNumbers(*step.x, *step.y));
+}
+
+std::size_t Multiply(Step step) {
+  return Give(step, MultiplyNumbers(*step.x, *step.y));
+}
+
+std::size_t Divide(Step step) {
+  return Give(step, DivideNumbers(*step.x, *step.y));
+}
+
+std::size_t Scalar(Step step) {
+  return Give(step, ApplyTransFunction(*step.x, *step.y, step.function));
+}
+
+std::size_t List(Step step) {
+  ApplyDetail& detail = *step.detail;
+  for (std::size_t i = 0; i < detail.values.size(); ++i)
+    detail.values[i] = *detail.numbers[i];
+  return Give(step, ApplyAccumulateFunction(detail.values.data(), detail.values.size(), step.function,
+                                            detail.scratch));
+}
+
+std::size_t DateTime(Step step) {
+  return Give(step, ApplyDateTimeFunction(*step.x, *step.y, step.function));
+}
+
+std::size_t Outlier(Step step) {
+  const std::vector<const double*>& from = step.detail->numbers;
+  const double method = *from[1];
+  return Give(step,
+              HandleOutlier(*from[0], NumericValue(method).GetInt(), *from[2], *from[3], *from[4], *from[5]));
+}
+
+std::size_t ChangeText(Step step) {
+  std::int32_t length = 0;
+  ApplyDetail& detail = *step.detail;
+  ApplyTextFunction(TextOf(step), step.function, detail.text, length);
+  detail.text_out->SetString(detail.text);
+  detail.text_out->SetLength(length);
+  return kNext;
+}
+
+std::size_t Substring(Step step) {
+  std::int32_t length = 0;
+  ApplyDetail& detail = *step.detail;
+  ApplySubstring(TextOf(step), *step.x, detail.text, length);
+  detail.text_out->SetString(detail.text);
+  detail.text_out->SetLength(length);
+  return kNext;
+}
+
+std::size_t Concat(Step step) {
+  std::int32_t length = 0;
+  ApplyDetail& detail = *step.detail;
+  detail.text.clear();
+  for (const ApplyText text : detail.texts)
+    AppendText(**text, detail.text, length);
+  detail.text_out->SetString(detail.text);
+  detail.text_out->SetLength(length);
+  return kNext;
+}
+
+std::size_t CompareNumbers(Step step) {
+  return GiveTest(step, NumericValue::IsEqual(*step.x, *step.y), kNotEqualFunction);
+}
+
+std::size_t CompareTexts(Step step) {
+  const bool are_equal =
+      WithoutTrailingBlanks(TextOf(step).GetText()) == WithoutTrailingBlanks(TextOf(step, 1).GetText());
+  return GiveTest(step, are_equal, kNotEqualFunction);
+}
+
+// What equals a number lies next to where it would stand itself.
+std::size_t FindNumber(Step step) {
+  const std::vector<double>& listed = step.detail->listed_numbers;
+  const double x = *step.x;
+  const auto above = std::lower_bound(listed.begin(), listed.end(), x);
+  const bool is_listed = (above != listed.end() && NumericValue::IsEqual(*above, x)) ||
+                         (above != listed.begin() && NumericValue::IsEqual(*(above - 1), x));
+  return GiveTest(step, is_listed, kIsNotInFunction);
+}
+
+std::size_t FindText(Step step) {
+  const std::vector<std::string>& listed = step.detail->listed_texts;
+  const std::string_view text = WithoutTrailingBlanks(TextOf(step).GetText());
+  const auto found = std::lower_bound(listed.begin(), listed.end(), text);
+  return GiveTest(step, found != listed.end() && *found == text, kIsNotInFunction);
+}
+
+std::size_t TestMissing(Step step) {
+  return GiveTest(step, step.detail->source->IsMissing(), kIsNotMissingFunction);
+}
+
+std::size_t TestSysmis(Step step) {
+  return GiveTest(step, IsMissingNumber(*step.x), kIsNotMissingFunction);
+}
+
+std::size_t Length(Step step) {
+  return Give(step, LengthOf(TextOf(step)));
+}
+
+std::size_t ReadText(Step step) {
+  return Give(step, NumberIn(TextOf(step).GetText()));
+}
+
+std::size_t ImputeNumber(Step step) {
+  const ApplyDetail& detail = *step.detail;
+  if (!detail.source->IsMissing()) return Give(step, *step.x);
+  if (IsMissingNumber(*step.y)) return Give(step, NumericValue::gSysmisValue);
+  const std::size_t nearest =
+      NearestMean(*step.y, detail.values.data(), detail.variances.data(), detail.values.size());
+  return Give(step, detail.category_numbers[nearest]);
+}
+
+std::size_t ImputeText(Step step) {
+  const ApplyDetail& detail = *step.detail;
+  static const StringValue kEmpty;
+  // The empty text is what a record's missing text holds, whatever the field's rules say.
+  if (!detail.source->IsMissing() && !TextOf(step).GetText().empty()) {
+    *detail.place_out = &TextOf(step);
+  } else if (IsMissingNumber(*step.y)) {
+    *detail.place_out = &kEmpty;
+  } else {
+    *detail.place_out = &detail.category_texts[NearestMean(*step.y, detail.values.data(),
+                                                           detail.variances.data(), detail.values.size())];
+  }
+  return kNext;
+}
+
+std::size_t ReplaceSysmis(Step step) {
+  return Give(step, IsMissingNumber(*step.x) ? *step.y : *step.x);
+}
+
+std::size_t ReplaceMissingNumber(Step step) {
+  return Give(step, step.detail->source->IsMissing() ? *step.y : *step.x);
+}
+
+std::size_t ReplaceMissingText(Step step) {
+  *step.detail->place_out = &TextOf(step, step.detail->source->IsMissing() ? 1 : 0);
+  return kNext;
+}
+
+std::size_t Copy(Step step) {
+  return Give(step, *step.x);
+}
+
+std::size_t CopyText(Step step) {
+  *step.detail->place_out = &TextOf(step);
+  return kNext;
+}
+
+std::size_t SkipUnlessOne(Step step) {
+  return IsTrueCondition(*step.x) ? kNext : step.skip;
+}
+
+std::size_t Skip(Step step) {
+  return step.skip;
+}
+
+}  // namespace ApplySteps
+}  // namespace MCKestrel_800

@@ -1,0 +1,85 @@
+#include "kestrel/transform/BinTable.h"
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <typeinfo>
+
+#include "kestrel/foundation/NumericValue.h"
+#include "kestrel/predicates/Range.h"
+
+namespace MCKestrel_800 {
+namespace {
+
+constexpr std::size_t kWalked = 2;
+constexpr std::size_t kCounted = 24;
+
+// An end of a range as a number; an absent one is an infinity. False when it is another value.
+bool ReadEnd(const ScoreValue* end, double infinity, double& number) {
+  number = infinity;
+  if (end == nullptr) return true;
+  if (typeid(*end) != typeid(NumericValue)) return false;
+  number = end->GetDouble();
+  if (NumericValue::IsSystemMissingValue(number)) number = infinity;
+  return !std::isnan(number);
+}
+
+// Twice the tolerance of NumericValue::IsEqual: how far an end that is included may reach.
+double Tolerance(double end) {
+  return std::isinf(end) ? 0.0 : std::fabs(end) * 2 * NumericValue::fEpsilon;
+}
+
+}  // namespace
+
+BinTable::BinTable(const std::vector<TransformVar::Bin>& bins) : bins_(bins) {
+  if (bins.size() <= kWalked) return;
+  constexpr double kInfinity = std::numeric_limits<double>::infinity();
+  std::vector<Reach> reaches;
+  reaches.reserve(bins.size());
+  for (std::size_t bin = 0; bin < bins.size(); ++bin) {
+    const ScoreValueRange* const range = bins[bin].range.get();
+    if (range == nullptr || typeid(*range) != typeid(Range)) return;
+    double low, high;
+    if (!ReadEnd(range->GetMin(), -kInfinity, low) || !ReadEnd(range->GetMax(), kInfinity, high)) return;
+    if (low > high) continue;  // holds nothing
+    reaches.push_back({low - Tolerance(low), high + Tolerance(high), static_cast<const Range*>(range), bin});
+  }
+  std::sort(reaches.begin(), reaches.end(),
+            [](const Reach& a, const Reach& b) { return a.low != b.low ? a.low < b.low : a.high < b.high; });
+  std::vector<double> highs;
+  highs.reserve(reaches.size());
+  for (const Reach& reach : reaches) {
+    // A bin within another one: the list is no row of neighbours.
+    if (!highs.empty() && reach.high < highs.back()) return;
+    highs.push_back(reach.high);
+  }
+  reaches_ = std::move(reaches);
+  highs_ = std::move(highs);
+}
+
+std::size_t BinTable::Walk(double number) const {
+  for (std::size_t bin = 0; bin < bins_.size(); ++bin) {
+    const ScoreValueRange* const range = bins_[bin].range.get();
+    if (range != nullptr && range->IsInRange(number)) return bin;
+  }
+  return kNone;
+}
+
+std::size_t BinTable::Find(double number) const {
+  if (reaches_.empty()) return Walk(number);
+  const double* const highs = highs_.data();
+  std::size_t at = 0;
+  if (highs_.size() <= kCounted) {
+    for (std::size_t i = 0; i < highs_.size(); ++i)
+      at += highs[i] < number;
+  } else {
+    at = static_cast<std::size_t>(std::lower_bound(highs_.begin(), highs_.end(), number) - highs_.begin());
+  }
+  std::size_t first = kNone;
+  for (; at < reaches_.size() && reaches_[at].low <= number; ++at) {
+    if (reaches_[at].bin < first && reaches_[at].range->Range::IsInRange(number)) first = reaches_[at].bin;
+  }
+  return first;
+}
+
+}  // namespace MCKestrel_800

@@ -1,0 +1,104 @@
+// The order in which derived fields are computed, with everything looked up that does not depend on the case.
+
+#ifndef KESTREL_TRANSFORM_DERIVATIONPLAN_H
+#define KESTREL_TRANSFORM_DERIVATIONPLAN_H
+
+#include <cstddef>
+#include <memory>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+#include "kestrel/transform/SourceField.h"
+
+namespace MCKestrel_800 {
+
+class ApplyProgram;
+class FieldEvaluation;
+class FunctionTree;
+class ScoreCaseRecord;
+class ScoreDictionary;
+class TransformVar;
+class TransformationDictionary;
+
+/// A list of derived fields, each behind those that it reads. A case is computed by one walk over the list:
+/// neither chains nor cycles of fields cost stack, and a field that many others read is computed once. The
+/// results are those of the fields' own evaluations.
+///
+/// A field is read by its name: from the case; where the case has no value and the name is that of a derived
+/// field, that field's result. Names are looked up in the data dictionary first.
+class DerivationPlan {
+ public:
+  /// Plans the fields and all derived fields that they depend on. Dictionaries may be null. All must outlive
+  /// the plan, or make it stale.
+  DerivationPlan(const std::vector<const TransformVar*>& fields, const ScoreDictionary* dictionary,
+                 const TransformationDictionary* transformations);
+  DerivationPlan(const DerivationPlan&) = delete;
+  DerivationPlan& operator=(const DerivationPlan&) = delete;
+  ~DerivationPlan();
+
+  /// Whether the plan still stands for these dictionaries and the fields as they are.
+  bool IsFor(const ScoreDictionary* dictionary, const TransformationDictionary* transformations) const;
+
+  /// Chooses what Compute computes: these fields and what they depend on. At first nothing is chosen.
+  void Choose(const std::vector<const TransformVar*>& fields);
+  /// Computes the chosen fields for a case; null is a case without values.
+  void Compute(const ScoreCaseRecord* record);
+  /// Computes one field and what it depends on.
+  void ComputeOnly(const TransformVar& field, const ScoreCaseRecord* record);
+
+ private:
+  static constexpr int kNone = -1;
+
+  struct Source {
+    std::string name;
+    std::unique_ptr<SourceField> field;
+    int step = kNone;         ///< the derived field of that name
+    int position = kNone;     ///< in the record
+    bool is_in_case = false;  ///< whether the case has a value of that name
+  };
+  struct Step {
+    const TransformVar* field;
+    FieldEvaluation* evaluation;
+    unsigned long long definition_stamp;
+    bool is_circular = false;
+    int source = kNone;     ///< what it reads, unless it is a function tree
+    int as_source = kNone;  ///< itself as what others read
+    std::unique_ptr<ApplyProgram> program;
+    std::vector<int> reads;  ///< all sources
+  };
+
+  int AddStep(const TransformVar& field);
+  int AddSource(const std::string& name, const ScoreDictVar* known);
+  void AddReads(int step);
+  std::vector<int> AddTreeReads(const FunctionTree& root);
+  void Order();
+  void Prepare();
+  /// Steps to run, in order, with the sources that they read.
+  struct Work {
+    std::vector<int> steps;
+    std::vector<int> sources;
+  };
+  void AddNeeds(const std::vector<const TransformVar*>& fields, Work& work) const;
+  void Run(const Work& work, const ScoreCaseRecord* record);
+  void TakeCase(const Work& work, const ScoreCaseRecord& record);
+  void LookUpPositions(const ScoreCaseRecord& record);
+  void RunStep(Step& step);
+
+  const ScoreDictionary* dictionary_;
+  const TransformationDictionary* transformations_;
+  unsigned long long dictionary_stamp_;
+  unsigned long long transformations_stamp_;
+  std::vector<Source> sources_;
+  std::vector<Step> steps_;
+  Work chosen_;
+  SourceField nothing_{nullptr};  ///< what a field reads that names none
+  std::unordered_map<std::string, int> source_numbers_;
+  std::unordered_map<const TransformVar*, int> step_numbers_;
+  unsigned long long record_stamp_ = 0;
+  std::size_t positions_end_ = 0;
+};
+
+}  // namespace MCKestrel_800
+
+#endif  // KESTREL_TRANSFORM_DERIVATIONPLAN_H

@@ -1,0 +1,82 @@
+#include "kestrel/transform/NormCurve.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace MCKestrel_800 {
+namespace {
+
+// Up to this many points, counting those below a number costs less than halving the list.
+constexpr std::size_t kCounted = 24;
+
+}  // namespace
+
+NormCurve::NormCurve(const std::vector<double>& orig, const std::vector<double>& norm,
+                     const std::vector<double>& slopes, const std::vector<double>& intercepts,
+                     ScoreDictVar::OutlierHandleMethod outliers)
+    : orig_(orig),
+      norm_(norm),
+      has_range_(orig.size() >= 2),
+      is_ascending_(std::is_sorted(orig.begin(), orig.end())),
+      outliers_(outliers) {
+  // Lists that do not belong together are no segments.
+  if (slopes.size() == intercepts.size() && !orig.empty()) {
+    lines_.reserve(slopes.size());
+    for (std::size_t i = 0; i < slopes.size(); ++i)
+      lines_.push_back({slopes[i], intercepts[i]});
+  }
+  if (orig.empty()) return;
+  const auto [lowest, highest] = std::minmax_element(orig.begin(), orig.end());
+  lowest_ = *lowest;
+  highest_ = *highest;
+}
+
+double NormCurve::Compute(double x) const {
+  if (!IsOutOfContRange(x)) return CalculateNormValue(x);
+  // Outliers treated as missing go on as those left as they are.
+  return outliers_ == ScoreDictVar::kAsExtremeValues ? CalculateNormAsExtremeValues(x) : CalculateNormAsIs(x);
+}
+
+double NormCurve::CalculateNormValue(double x) const {
+  if (lines_.empty()) return x;
+  std::size_t segment = 0;
+  if (orig_.size() >= 2 && lines_.size() >= 2) segment = FindSegment(x);
+  return segment < lines_.size() ? lines_[segment].At(x) : x;
+}
+
+// The first segment that holds x with both its ends; the number of segments when there is none.
+std::size_t NormCurve::FindSegment(double x) const {
+  const std::size_t segments = orig_.size() - 1;
+  const double* const orig = orig_.data();
+  if (!is_ascending_) {
+    std::size_t i = 0;
+    while (i < segments && !(orig[i] <= x && x <= orig[i + 1]))
+      ++i;
+    return i;
+  }
+  // In ascending points it ends at the first point, but the very first, that is not below x.
+  std::size_t i = 0;
+  if (segments <= kCounted) {
+    for (std::size_t point = 1; point < segments; ++point)
+      i += orig[point] < x;
+  } else {
+    i = static_cast<std::size_t>(std::lower_bound(orig + 1, orig + segments, x) - (orig + 1));
+  }
+  return orig[i] <= x && x <= orig[i + 1] ? i : segments;
+}
+
+bool NormCurve::IsNearerToLowest(double x) const {
+  return std::fabs(x - lowest_) <= std::fabs(x - highest_);
+}
+
+double NormCurve::CalculateNormAsIs(double x) const {
+  if (orig_.size() < 2 || lines_.size() < 2) return x;
+  return (IsNearerToLowest(x) ? lines_.front() : lines_.back()).At(x);
+}
+
+double NormCurve::CalculateNormAsExtremeValues(double x) const {
+  if (orig_.empty() || orig_.size() != norm_.size()) return x;
+  return IsNearerToLowest(x) ? norm_.front() : norm_.back();
+}
+
+}  // namespace MCKestrel_800

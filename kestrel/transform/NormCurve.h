@@ -1,0 +1,49 @@
+// The piecewise linear function of a NormContinuous field, laid out for computing.
+
+#ifndef KESTREL_TRANSFORM_NORMCURVE_H
+#define KESTREL_TRANSFORM_NORMCURVE_H
+
+#include <cstddef>
+#include <vector>
+
+#include "kestrel/dictionary/ScoreDictVar.h"
+
+namespace MCKestrel_800 {
+
+/// Points, segments and outlier treatment as a document gives them; incomplete ones leave numbers as they
+/// are.
+class NormCurve {
+ public:
+  NormCurve(const std::vector<double>& orig, const std::vector<double>& norm,
+            const std::vector<double>& slopes, const std::vector<double>& intercepts,
+            ScoreDictVar::OutlierHandleMethod outliers);
+
+  double Compute(double x) const;
+
+ private:
+  bool IsOutOfContRange(double x) const { return has_range_ && (x > highest_ || x < lowest_); }
+  double CalculateNormValue(double x) const;
+  double CalculateNormAsIs(double x) const;
+  double CalculateNormAsExtremeValues(double x) const;
+  std::size_t FindSegment(double x) const;
+  bool IsNearerToLowest(double x) const;
+
+  struct Line {
+    double slope;
+    double intercept;
+    double At(double x) const { return x * slope + intercept; }
+  };
+
+  std::vector<double> orig_;
+  std::vector<double> norm_;
+  std::vector<Line> lines_;
+  bool has_range_;
+  bool is_ascending_;
+  double lowest_ = 0.0;
+  double highest_ = 0.0;
+  ScoreDictVar::OutlierHandleMethod outliers_;
+};
+
+}  // namespace MCKestrel_800
+
+#endif  // KESTREL_TRANSFORM_NORMCURVE_H
