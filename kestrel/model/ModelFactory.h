@@ -14,6 +14,7 @@ namespace MCKestrel_800 {
 
 class ScoreDictionary;
 class ScoreModel;
+class TransformationDictionary;
 
 /// Makes models from documents. All operations are static.
 ///
@@ -75,6 +76,20 @@ class KESTREL_API ModelFactory {
   /// model's, such as the element that holds the dictionary.
   static ScoreModel* MakeModelFromXML(void* modelElement, const std::vector<std::string>& modelNames,
                                       void* otherElement, const std::string& arg = std::string());
+
+  /// Reads the data dictionary and the derived fields of a document, and no model: what a host needs that
+  /// computes derived fields alone. No model library is looked for.
+  /// dictionaryOut  set to the data dictionary, which the caller deletes, after the derived fields, since
+  ///                these refer to its fields; null after a failure.
+  /// reserved       without meaning; pass an empty text.
+  /// Returns the derived fields, which the caller deletes, set up for their first case. A document without a
+  /// `TransformationDictionary` element has none: the dictionary is empty. The root must be "PMML".
+  static TransformationDictionary* GetTransformationDictionaryFromXML(std::istream& in,
+                                                                      ScoreDictionary*& dictionaryOut,
+                                                                      const std::string& reserved);
+  static TransformationDictionary* GetTransformationDictionaryFromXML(const std::string& fileName,
+                                                                      ScoreDictionary*& dictionaryOut,
+                                                                      const std::string& reserved);
 
   /// Why the last load on the calling thread could not use a model library, in the system's words; empty when
   /// it could, or did not get that far.

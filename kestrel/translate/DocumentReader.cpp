@@ -151,4 +151,8 @@ std::unique_ptr<ParsedDocument> ReadDocument(std::istream& in) {
   return ReadDocument(in, DocumentLimits());
 }
 
+bool IsWithoutRoot(const KestrelException& fault) {
+  return fault.GetErrorCode() == KestrelException::kMissingElement && fault.GetErrorMessage() == kNoRoot;
+}
+
 }  // namespace MCKestrel_800

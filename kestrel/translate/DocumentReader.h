@@ -18,6 +18,8 @@ XERCES_CPP_NAMESPACE_END
 
 namespace MCKestrel_800 {
 
+class KestrelException;
+
 /// What a document may ask for before it is refused. The defaults are far above what honest documents need.
 struct DocumentLimits {
   size_t maxInputBytes = size_t{256} << 20;   ///< of the document itself
@@ -67,6 +69,9 @@ class KESTREL_API ParsedDocument {
 /// Threads: any number of calls at once, the process's first ones included.
 KESTREL_API std::unique_ptr<ParsedDocument> ReadDocument(std::istream& in, const DocumentLimits& limits);
 KESTREL_API std::unique_ptr<ParsedDocument> ReadDocument(std::istream& in);
+
+/// Whether ReadDocument threw this because the document has no root element, which loaders word differently.
+KESTREL_API bool IsWithoutRoot(const KestrelException& fault);
 
 }  // namespace MCKestrel_800
 

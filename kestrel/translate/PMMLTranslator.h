@@ -11,6 +11,7 @@
 
 #include "kestrel/foundation/DateTimeType.h"
 #include "kestrel/platform/Export.h"
+#include "kestrel/transform/TransformFunction.h"
 #include "kestrel/translate/BaseTranslator.h"
 
 XERCES_CPP_NAMESPACE_BEGIN
@@ -21,12 +22,16 @@ XERCES_CPP_NAMESPACE_END
 namespace MCKestrel_800 {
 
 class DiscreteSplit;
+class FunctionTree;
 class ScoreDictVar;
 class ScoreDictionary;
 class ScoreMissingValueSet;
 class ScorePredicate;
 class ScoreSplitVar;
 class ScoreValue;
+class ScoreValueRange;
+class TransformVar;
+class TransformationDictionary;
 struct LeafNodeStats;
 
 /// The readers of PMML elements.
@@ -85,6 +90,65 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   /// Gives a nominal or ordinal variable its category encoder, unless it has one, and encodes its value
   /// labels in their order. Returns false, doing nothing, for null and for a continuous variable.
   static bool SetupCatEncoder(ScoreDictVar* variable);
+
+  // ---- Derived fields. `variable` is the derived field that is being read; its name, type and level are
+  // set. A field that an expression refers to is looked up in `dictionary` and then in `derived`; either may
+  // be null. The readers of expressions return the name of that field. (The spelling of some names is part of
+  // the interface.)
+
+  /// Reads the `DerivedField` children of a `TransformationDictionary` or `LocalTransformations` element; a
+  /// null element has none. An expression may refer to data fields and to derived fields that stand before.
+  /// into  what the fields are added to; null for a new one. After a fault it holds the fields before the
+  ///       one at fault.
+  /// Returns `into`, or the new one, which the caller deletes. References in it point at variables of
+  /// `dictionary`, which must outlive it.
+  static TransformationDictionary* HandleTransformationDictionary(xercesc::DOMElement* element,
+                                                                  const ScoreDictionary* dictionary,
+                                                                  TransformationDictionary* into);
+
+  static std::string HandleNormContinuous(xercesc::DOMElement* element, TransformVar* variable,
+                                          const ScoreDictionary* dictionary, const ScoreDictionary* derived);
+  static std::string HandleNormDiscrete(xercesc::DOMElement* element, TransformVar* variable,
+                                        const ScoreDictionary* dictionary, const ScoreDictionary* derived);
+  static std::string HandleMapValues(xercesc::DOMElement* element, TransformVar* variable,
+                                     const ScoreDictionary* dictionary, const ScoreDictionary* derived);
+  static std::string HandleDiscritize(xercesc::DOMElement* element, TransformVar* variable,
+                                      const ScoreDictionary* dictionary, const ScoreDictionary* derived);
+  static std::string HandleFieldRef(xercesc::DOMElement* element, TransformVar* variable,
+                                    const ScoreDictionary* dictionary, const ScoreDictionary* derived);
+
+  /// The range of an `Interval`, which the caller deletes. Margins are numbers; of a date/time its seconds.
+  static ScoreValueRange* HandleDiscretizeBinInterVal(const xercesc::DOMElement* interval);
+
+  /// A `Constant`: as a value of its `dataType` that the caller deletes (what is no number is the missing
+  /// one), or as the text that stands there.
+  static ScoreValue* HandelConstant(const xercesc::DOMElement* element);
+  static void HandelConstant(const xercesc::DOMElement* element, std::string& text);
+
+  /// An `Apply` with all that is in it, as a tree that the caller deletes. Depth costs no stack.
+  static FunctionTree* HandleApply(const xercesc::DOMElement* element, const TransformVar* variable,
+                                   const ScoreDictionary* dictionary, const ScoreDictionary* derived);
+
+  /// Adds the `Value` children of an element to the variable's labels and missing values.
+  static void HandleValueList(const xercesc::DOMElement* parent, ScoreDictVar* variable);
+  /// Adds the values and the invalid range in an element to the variable's missing values.
+  static void handleDerivedVarMissingValue(const xercesc::DOMElement* parent, ScoreDictVar* variable);
+  /// Reads an `Extension` that says what becomes of missing and unmatched values; others are ignored.
+  static void HandleVEXAExtensions(const xercesc::DOMElement* extension, TransformVar* variable);
+
+  /// Prepares the look-up of function names, which the first look-up does otherwise.
+  static void InitFunctionMap();
+  /// The code of a name, which counts exactly as it stands; kNoFunction for every other text.
+  static TransformFunction GetTransFunction(const std::string& name);
+  /// Whether a function counts as one of numbers (of texts) when it stands inside another.
+  static bool IsNumericFunction(TransformFunction function);
+  static bool IsStringFunction(TransformFunction function);
+  /// Code 6 when a function does not fit into another; when a field or constant is no number (no text).
+  static void VerifyParentAndChildFunction(const xercesc::DOMElement* element, TransformFunction parent,
+                                           TransformFunction child);
+  static void VerifyOneElem(const xercesc::DOMElement* element, const FunctionTree& argument, bool isNumeric);
+  /// Code 6 when the arguments of a node do not fit its function. The node's fields have their variables.
+  static void VerifyApplyFunction(const xercesc::DOMElement* element, const FunctionTree& node);
 
   // ---- Predicates. What they give back belongs to the caller; the variables of the dictionaries must
   // outlive it. A field is looked up in `dictionary` and then, unless it is null, in `derivedDictionary`.

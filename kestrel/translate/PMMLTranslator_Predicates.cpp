@@ -5,12 +5,12 @@
 #include <vector>
 
 #include "kestrel/dictionary/DictVar.h"
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/predicates/CompoundPredicate.h"
 #include "kestrel/predicates/ConstantPredicates.h"
 #include "kestrel/predicates/ScaleSplit.h"
 #include "kestrel/predicates/SetPredicate.h"
 #include "kestrel/predicates/SimplePredicate.h"
+#include "kestrel/translate/DerivedValues.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -30,14 +30,6 @@ struct Fields {
   const ScoreDictionary* derivedDictionary;
   bool ordinalAsScale;
 };
-
-/// Null when there is no such field.
-const ScoreDictVar* FindField(const ScoreDictionary* dictionary, const ScoreDictionary* derivedDictionary,
-                              const std::string& name) {
-  const ScoreDictVar* variable = dictionary != nullptr ? dictionary->GetVar(name) : nullptr;
-  if (variable == nullptr && derivedDictionary != nullptr) variable = derivedDictionary->GetVar(name);
-  return variable;
-}
 
 bool IsComparedByNumber(const ScoreDictVar& variable, bool ordinalAsScale) {
   if (variable.GetMLevel() == ScoreDictVar::kContinuous) return true;
