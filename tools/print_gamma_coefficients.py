@@ -141,6 +141,8 @@ def main():
     show_fit("kReciprocalGamma", "1 / Gamma(1 + a), 0 <= a <= 1", lambda a: 1 / gamma(1 + a), 0, 1, 16)
     print("\n// Stirling's series, B_2k / (2k (2k - 1)), in 1/a^2 after 1/a.")
     show("kStirlingSeries", [bernoulli(2 * k) / (2 * k * (2 * k - 1)) for k in range(1, 10)])
+    print("\n// StirlingError of the counts from 0 on, where that of 0 is 0.")
+    show("kStirlingOfCount", [mpf(0)] + [stirling_error(mpf(m)) for m in range(1, 16)])
     show_temme()
     print(f"\nconstexpr double kTemmeReach = {TEMME_REACH};\n\n}}  // namespace MCMath_800\n\n#endif  // KESTREL_MATH_GAMMACOEFFICIENTS_H")
 

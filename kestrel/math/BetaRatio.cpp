@@ -35,9 +35,9 @@ struct BetaCase {
   double Power() const { return BetaPower(at, a, b); }
 };
 
-// The logarithm of at.x when at.y may be small, from whichever has the digits.
-double LogOf(double x, double y) {
-  return y < 0.375 ? std::log1p(-y) : std::log(x);
+// The logarithm of x when y = 1 - x may be small, from whichever has the digits.
+DoubleDouble LogOf(DoubleDouble x, DoubleDouble y) {
+  return y.high < 0.375 ? LogOfOnePlus(-y) : Log(x);
 }
 
 // (a + b - 1/2) ln(1 + a / b) - a + StirlingError(a + b) - StirlingError(b), which is ln(Gamma(a + b) /
@@ -46,9 +46,9 @@ double LogGammaGrowth(double a, double b) {
   return (a + b - 0.5) * std::log1p(a / b) - a + (StirlingError(a + b) - StirlingError(b));
 }
 
-double PowerOfSmallA(double x, double y, double a, double b) {
-  return a * ReciprocalGamma1(a) * std::pow(b * x, a) *
-         GuardedExpMinus(-LogGammaGrowth(a, b) - b * LogOf(y, x));
+double PowerOfSmallA(DoubleDouble x, DoubleDouble y, double a, double b) {
+  return a * ReciprocalGamma1(a) * std::pow(b * x.high, a) *
+         GuardedExpMinus(-(LogOf(y, x) * b + LogGammaGrowth(a, b)));
 }
 
 double PowerOfSmallBoth(double x, double y, double a, double b) {
@@ -58,18 +58,46 @@ double PowerOfSmallBoth(double x, double y, double a, double b) {
          std::pow(y, b);
 }
 
+// What x^a y^b loses on its way from the mean, as a logarithm.
+DoubleDouble BetaDeviance(const BetaPoint& point, double a, double b) {
+  return Deviance([&] { return point.x * AddExactly(a, b); }, point.deviation, a) +
+         Deviance([&] { return point.y * AddExactly(a, b); }, -point.deviation, b);
+}
+
+// 1 + t_1 + t_1 t_2 + ..., summed with what the additions round off. Every factor t has the same number in
+// it: what that has beyond a double moves the n-th product by n times as much.
+class PowerSum {
+ public:
+  explicit PowerSum(DoubleDouble common) : excess_(common.low / common.high) {}
+
+  bool Counts() const { return term_ > kPrecision * sum_.high; }
+  void Add(double factor) {
+    term_ *= factor;
+    index_ += 1.0;
+    const DoubleDouble sum = AddExactly(sum_.high, term_);
+    sum_ = {sum.high, sum_.low + sum.low};
+    moment_ += index_ * term_;
+  }
+  double Value() const { return sum_.high + (sum_.low + excess_ * moment_); }
+
+ private:
+  double excess_;
+  double term_ = 1.0;
+  double index_ = 0.0;
+  double moment_ = 0.0;
+  DoubleDouble sum_ = 1.0;
+};
+
 // I_x(a, b) - I_x(a + count, b), from the recurrence in a; with enough terms it is I_x(a, b) itself. For b <=
 // 1, or x below the mean.
 double ForwardSum(const BetaCase& c, int count) {
-  double term = 1.0;
-  double sum = 1.0;
+  PowerSum sum(c.at.x);
   double n = c.a;
-  for (int i = 1; i < count && term > kPrecision * sum; ++i) {
-    term *= c.at.x * ((n + c.b) / (n + 1.0));
+  for (int i = 1; i < count && sum.Counts(); ++i) {
+    sum.Add(c.at.x.high * ((n + c.b) / (n + 1.0)));
     n += 1.0;
-    sum += term;
   }
-  return c.Power() / c.a * sum;
+  return c.Power() / c.a * sum.Value();
 }
 
 // I_x(a, b) - I_x(a, b - count), from the recurrence in b. Taken from the far end, where the terms are
@@ -77,28 +105,32 @@ double ForwardSum(const BetaCase& c, int count) {
 double BackwardSum(const BetaCase& c, int count) {
   double b = c.b - 1.0;
   const BetaPoint last = {c.at.x, c.at.y, c.at.deviation - c.at.x};
-  double term = 1.0;
-  double sum = 1.0;
-  for (int i = 1; i < count && term > kPrecision * sum; ++i) {
-    term *= b / ((c.a + b - 1.0) * c.at.y);
+  const DoubleDouble inverse = DoubleDouble(1.0) / c.at.y;
+  PowerSum sum(inverse);
+  for (int i = 1; i < count && sum.Counts(); ++i) {
+    sum.Add(inverse.high * (b / (c.a + b - 1.0)));
     b -= 1.0;
-    sum += term;
   }
-  return BetaPower(last, c.a, c.b - 1.0) / (c.b - 1.0) * sum;
+  return BetaPower(last, c.a, c.b - 1.0) / (c.b - 1.0) * sum.Value();
 }
 
-// The expansion for a > b, b <= 1, a >= 15 in incomplete gamma functions, section 9 of the paper.
-double LargeAExpansion(const BetaCase& c) {
+// I_x(a + steps, b) by the expansion for a > b, b <= 1, a >= 15 in incomplete gamma functions, section 9 of
+// the paper.
+double LargeAExpansion(const BetaCase& c, int steps) {
   constexpr int kTerms = 30;
-  const double a = c.a;
+  const double a = c.a + steps;
   const double b = c.b;
-  const double nu = a + 0.5 * (b - 1.0);
-  const double log_x = LogOf(c.at.x, c.at.y);
-  const double z = -nu * log_x;
+  const DoubleDouble shift = AddExactly(b, -1.0) * 0.5;
+  const DoubleDouble exact_nu = AddExactly(c.a, steps) + shift;
+  const DoubleDouble exact_log = LogOf(c.at.x, c.at.y);
+  const DoubleDouble exact_z = -(exact_log * exact_nu);
+  const double nu = exact_nu.high;
+  const double log_x = exact_log.high;
+  const double z = exact_z.high;
   if (!(z > 0.0)) return 1.0;
-  const GammaShare gamma = FindGammaShare(z, z - b, b, true);
+  const GammaShare gamma = FindGammaShare(exact_z, b, true);
   if (gamma.power == 0.0) return 0.0;
-  const double scale = gamma.power * std::exp(LogGammaGrowth(b, a) - b * std::log1p(0.5 * (b - 1.0) / a));
+  const double scale = gamma.power * std::exp(LogGammaGrowth(b, a) - b * std::log1p(shift.high / a));
   const double v = 0.25 / nu / nu;
   const double square = 0.25 * log_x * log_x;
   double coefficients[kTerms];
@@ -130,8 +162,8 @@ double Fraction(const BetaCase& c) {
   if (power == 0.0) return 0.0;
   const double a = c.a;
   const double b = c.b;
-  const double x = c.at.x;
-  const double first = 1.0 - c.at.deviation;
+  const double x = c.at.x.high;
+  const double first = 1.0 - c.at.deviation.high;
   double inverse = 1.0 / (a + 1.0);
   double above = 0.0, below = 1.0;
   double next_above = 1.0, next_below = a * first * inverse;
@@ -140,7 +172,7 @@ double Fraction(const BetaCase& c) {
     const double step = n * ((b - n) * x) * inverse;
     const double alpha = (a + n - 1.0) * inverse * ((a + b + n - 1.0) * x) * step;
     inverse = 1.0 / (a + 2.0 * n + 1.0);
-    const double beta = n + step + (a + n) * inverse * (first + n * (1.0 + c.at.y));
+    const double beta = n + step + (a + n) * inverse * (first + n * (1.0 + c.at.y.high));
     const double new_above = alpha * above + beta * next_above;
     const double new_below = alpha * below + beta * next_below;
     // Two convergents agree when their cross products do; a division only when the numbers grow.
@@ -223,8 +255,8 @@ double NormalExpansion(const BetaCase& c) {
   constexpr double kStep = 0.35355339059327376220;  // 2^(-3/2)
   const double a = c.a;
   const double b = c.b;
-  const double deviance = GammaDeviance((a + b) * c.at.x, c.at.deviation, a) +
-                          GammaDeviance((a + b) * c.at.y, -c.at.deviation, b);
+  const DoubleDouble exact_deviance = BetaDeviance(c.at, a, b);
+  const double deviance = exact_deviance.high;
   const double correction = StirlingError(a) + StirlingError(b) - StirlingError(a + b);
   const double z = std::sqrt(deviance);
   const double width = std::sqrt(std::max(a, b) / std::min(a, b) / (a + b));
@@ -249,17 +281,14 @@ double NormalExpansion(const BetaCase& c) {
     sum += first + second;
     if (std::fabs(first) + std::fabs(second) <= kPrecision * sum) break;
   }
-  return kTwoOverSqrtPi * GuardedExpMinus(deviance + correction) * sum;
+  return kTwoOverSqrtPi * GuardedExpMinus(exact_deviance + correction) * sum;
 }
 
 // The expansion for large a after as many steps of the recurrence as it takes to get there.
-double ExpandLargeA(BetaCase c) {
-  if (c.a > 15.0) return LargeAExpansion(c);
+double ExpandLargeA(const BetaCase& c) {
+  if (c.a > 15.0) return LargeAExpansion(c, 0);
   constexpr int kSteps = 20;
-  const double sum = ForwardSum(c, kSteps);
-  c.at.deviation -= kSteps * c.at.y;
-  c.a += kSteps;
-  return sum + LargeAExpansion(c);
+  return ForwardSum(c, kSteps) + LargeAExpansion(c, kSteps);
 }
 
 struct Tail {
@@ -271,15 +300,16 @@ struct Tail {
 Tail FindSmallShape(const BetaCase& c) {
   if (c.a > 1.0 || c.b > 1.0) {
     if (c.b <= 1.0) return {ForwardSum(c, kTermLimit), false};
-    if (c.at.x >= 0.29) return {ForwardSum(c.Reflected(), kTermLimit), true};
+    if (c.at.x.high >= 0.29) return {ForwardSum(c.Reflected(), kTermLimit), true};
     // With x so small the sum in x is short, and its result is not so close to 1 that the rest would be lost.
-    if (c.at.x < 0.1 && c.b * c.at.x <= 0.7 && std::pow(c.at.x * c.b, c.a) <= 0.7) {
+    if (c.at.x.high < 0.1 && c.b * c.at.x.high <= 0.7 && std::pow(c.at.x.high * c.b, c.a) <= 0.7) {
       return {ForwardSum(c, kTermLimit), false};
     }
     return {ExpandLargeA(c.Reflected()), true};
   }
-  if (c.a >= std::min(0.2, c.b) || std::pow(c.at.x, c.a) <= 0.9) return {ForwardSum(c, kTermLimit), false};
-  if (c.at.x >= 0.3) return {ForwardSum(c.Reflected(), kTermLimit), true};
+  if (c.a >= std::min(0.2, c.b) || std::pow(c.at.x.high, c.a) <= 0.9)
+    return {ForwardSum(c, kTermLimit), false};
+  if (c.at.x.high >= 0.3) return {ForwardSum(c.Reflected(), kTermLimit), true};
   return {ExpandLargeA(c.Reflected()), true};
 }
 
@@ -287,45 +317,31 @@ Tail FindSmallShape(const BetaCase& c) {
 double FindLargeShape(const BetaCase& c) {
   const double small = std::min(c.a, c.b);
   if (c.b < 40.0) {
-    if (c.b * c.at.x <= 0.7) return ForwardSum(c, kTermLimit);
+    if (c.b * c.at.x.high <= 0.7) return ForwardSum(c, kTermLimit);
     // Down to the last part of b that is above 0.
     const int steps = static_cast<int>(std::ceil(c.b)) - 1;
     const double sum = BackwardSum(c, steps);
-    const BetaCase rest = {{c.at.x, c.at.y, c.at.deviation - steps * c.at.x}, c.a, c.b - steps};
-    return sum + (c.at.x <= 0.7 ? ForwardSum(rest, kTermLimit) : ExpandLargeA(rest));
+    const BetaCase rest = {{c.at.x, c.at.y, c.at.deviation - c.at.x * steps}, c.a, c.b - steps};
+    return sum + (c.at.x.high <= 0.7 ? ForwardSum(rest, kTermLimit) : ExpandLargeA(rest));
   }
-  if (small <= kNormalShape || -c.at.deviation > 0.03 * small) return Fraction(c);
+  if (small <= kNormalShape || -c.at.deviation.high > 0.03 * small) return Fraction(c);
   return NormalExpansion(c);
 }
 
 Tail FindTail(const BetaCase& c) {
   if (std::min(c.a, c.b) > 1.0) {
-    return c.at.deviation <= 0.0 ? Tail{FindLargeShape(c), false} : Tail{FindLargeShape(c.Reflected()), true};
+    return c.at.deviation.high <= 0.0 ? Tail{FindLargeShape(c), false}
+                                      : Tail{FindLargeShape(c.Reflected()), true};
   }
-  if (c.at.x <= 0.5) return FindSmallShape(c);
+  if (c.at.x.high <= 0.5) return FindSmallShape(c);
   const Tail tail = FindSmallShape(c.Reflected());
   return {tail.ratio, !tail.is_upper};
-}
-
-struct ExactSum {
-  double high;
-  double low;
-};
-
-ExactSum AddExactly(double a, double b) {
-  const double high = a + b;
-  const double part = high - a;
-  return {high, (a - (high - part)) + (b - part)};
 }
 
 }  // namespace
 
 BetaPoint MakeBetaPoint(double x, double a, double b) {
-  const ExactProduct ax = MultiplyExactly(a, x);
-  const ExactProduct bx = MultiplyExactly(b, x);
-  const ExactSum below = AddExactly(ax.high, -a);
-  const ExactSum sum = AddExactly(below.high, bx.high);
-  return {x, 1.0 - x, sum.high + (sum.low + below.low + (ax.low + bx.low))};
+  return {x, AddExactly(1.0, -x), MultiplyExactly(a, x) - a + MultiplyExactly(b, x)};
 }
 
 double LogBeta(double a, double b) {
@@ -336,13 +352,11 @@ double LogBeta(double a, double b) {
 }
 
 double BetaPower(const BetaPoint& point, double a, double b) {
-  if (a < 1.0 && b < 1.0) return PowerOfSmallBoth(point.x, point.y, a, b);
+  if (a < 1.0 && b < 1.0) return PowerOfSmallBoth(point.x.high, point.y.high, a, b);
   if (a < 1.0) return PowerOfSmallA(point.x, point.y, a, b);
   if (b < 1.0) return PowerOfSmallA(point.y, point.x, b, a);
-  const double deviance = GammaDeviance((a + b) * point.x, point.deviation, a) +
-                          GammaDeviance((a + b) * point.y, -point.deviation, b);
   const double correction = StirlingError(a) + StirlingError(b) - StirlingError(a + b);
-  return std::sqrt(a / (a + b) * (b / kTwoPi)) * GuardedExpMinus(deviance + correction);
+  return std::sqrt(a / (a + b) * (b / kTwoPi)) * GuardedExpMinus(BetaDeviance(point, a, b) + correction);
 }
 
 double BetaRatio(const BetaPoint& point, double a, double b, bool upper) {

@@ -3,14 +3,16 @@
 #ifndef KESTREL_MATH_BETARATIO_H
 #define KESTREL_MATH_BETARATIO_H
 
+#include "kestrel/math/DoubleDouble.h"
+
 namespace MCMath_800 {
 
 /// Where a beta distribution is asked, with more digits than x alone can carry: near x = 1 the distance y
-/// counts, and for large a and b the distance from the mean.
+/// counts, for large a and b the distance from the mean, and in far tails the last digits of all three.
 struct BetaPoint {
-  double x;          ///< Above 0 and below 1 unless rounded to it.
-  double y;          ///< 1 - x.
-  double deviation;  ///< b * x - a * y: 0 where x is the mean a / (a + b).
+  DoubleDouble x;          ///< Above 0 and below 1 unless rounded to it.
+  DoubleDouble y;          ///< 1 - x.
+  DoubleDouble deviation;  ///< b * x - a * y: 0 where x is the mean a / (a + b).
 };
 
 // All for finite a, b and a + b, a, b > 0 and 0 < x, y.

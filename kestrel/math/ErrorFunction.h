@@ -8,9 +8,6 @@ namespace MCMath_800 {
 /// exp(a^2) erfc(a) for a >= 0, to a few units in the last place.
 double ScaledErfc(double a);
 
-/// exp(-x), 0 when x is past the exponential's limit (or no number). x > -709.
-double GuardedExpMinus(double x);
-
 }  // namespace MCMath_800
 
 #endif  // KESTREL_MATH_ERRORFUNCTION_H

@@ -157,6 +157,28 @@ constexpr double kStirlingSeries[] = {
 };
 // clang-format on
 
+// StirlingError of the counts from 0 on, where that of 0 is 0.
+// clang-format off
+constexpr double kStirlingOfCount[] = {
+    0.0,
+    0.081061466795327258,
+    0.041340695955409294,
+    0.027677925684998339,
+    0.020790672103765093,
+    0.016644691189821192,
+    0.013876128823070748,
+    0.01189670994589177,
+    0.010411265261972096,
+    0.0092554621827127329,
+    0.0083305634333628713,
+    0.0075736754879518408,
+    0.0069428401072095299,
+    0.0064089941880042071,
+    0.0059513701127588477,
+    0.0055547335519628014,
+};
+// clang-format on
+
 // C_k(eta) of Temme's uniform expansion, |eta| <= 0.8; in brackets the absolute errors.
 // k = 0 (4.1e-20)
 // clang-format off

@@ -109,12 +109,12 @@ double Choose(double ratio, bool is_upper, bool upper) {
 }
 
 // Both tails have the exponential as a factor, so that small ones keep their digits.
-GammaShare ShareByTemme(double deviation, double a, double deviance, bool upper) {
-  const double eta = std::copysign(std::sqrt(2.0 * deviance / a), deviation);
+GammaShare ShareByTemme(double deviation, double a, DoubleDouble deviance, bool upper) {
+  const double eta = std::copysign(std::sqrt(2.0 * deviance.high / a), deviation);
   const double exponential = GuardedExpMinus(deviance);
   const double scale = std::sqrt(kTwoPi * a);
   const double sum = TemmeSum(eta, a) / scale;
-  const double half = 0.5 * ScaledErfc(std::sqrt(deviance));
+  const double half = 0.5 * ScaledErfc(std::sqrt(deviance.high));
   const bool above = deviation > 0.0;
   const double tail = exponential * (above ? half + sum : half - sum);
   return {Choose(tail, above, upper), exponential * a / scale * std::exp(-StirlingError(a))};
@@ -142,42 +142,30 @@ double LogGamma(double a) {
   return (a - 0.5) * (std::log(a) - 1.0) + (kHalfLogTwoPi - 0.5 + StirlingError(a));
 }
 
-double GammaDeviance(double x, double deviation, double a) {
-  const double u = deviation / a;
-  // Far below a, 1 + u has lost the digits of x.
-  return u < -0.5 ? deviation - a * std::log(x / a) : a * LogDeviance(u);
+double GammaPower(DoubleDouble x, double a) {
+  if (a < 1.0) return a * ReciprocalGamma1(a) * std::pow(x.high, a) * GuardedExpMinus(x);
+  return std::sqrt(a / kTwoPi) * GuardedExpMinus(Deviance([&] { return x; }, x - a, a) + StirlingError(a));
 }
 
-double GammaPower(double x, double a) {
-  return GammaPower(x, x - a, a);
-}
-
-double GammaPower(double x, double deviation, double a) {
-  if (a < 1.0) return a * ReciprocalGamma1(a) * std::pow(x, a) * GuardedExpMinus(x);
-  const double exponent = GammaDeviance(x, deviation, a) + StirlingError(a);
-  return std::sqrt(a / kTwoPi) * GuardedExpMinus(exponent);
-}
-
-GammaShare FindGammaShare(double x, double deviation, double a, bool upper) {
+GammaShare FindGammaShare(DoubleDouble x, double a, bool upper) {
   if (a >= kTemmeShape) {
-    const double deviance = GammaDeviance(x, deviation, a);
-    if (deviance <= 0.5 * kTemmeReach * kTemmeReach * a) return ShareByTemme(deviation, a, deviance, upper);
+    const DoubleDouble deviation = x - a;
+    const DoubleDouble deviance = Deviance([&] { return x; }, deviation, a);
+    if (deviance.high <= 0.5 * kTemmeReach * kTemmeReach * a)
+      return ShareByTemme(deviation.high, a, deviance, upper);
   }
-  const double power = GammaPower(x, deviation, a);
-  if (a < 1.0 && x < kSmallX && upper) return {std::max(0.0, UpperOfSmallShape(x, a)), power};
-  if (a == 0.5 && upper) return {GuardedExpMinus(x) * ScaledErfc(std::sqrt(x)), power};
-  if (x < std::max(a, kSmallX))
-    return {Choose(std::min(1.0, power * LowerSeries(x, a)), false, upper), power};
+  const double power = GammaPower(x, a);
+  const double at = x.high;
+  if (a < 1.0 && at < kSmallX && upper) return {std::max(0.0, UpperOfSmallShape(at, a)), power};
+  if (a == 0.5 && upper) return {GuardedExpMinus(x) * ScaledErfc(std::sqrt(at)), power};
+  if (at < std::max(a, kSmallX))
+    return {Choose(std::min(1.0, power * LowerSeries(at, a)), false, upper), power};
   if (power == 0.0) return {upper ? 0.0 : 1.0, power};
-  return {Choose(power * UpperFraction(x, a), true, upper), power};
+  return {Choose(power * UpperFraction(at, a), true, upper), power};
 }
 
-double GammaRatio(double x, double a, bool upper) {
-  return FindGammaShare(x, x - a, a, upper).ratio;
-}
-
-double GammaRatio(double x, double deviation, double a, bool upper) {
-  return FindGammaShare(x, deviation, a, upper).ratio;
+double GammaRatio(DoubleDouble x, double a, bool upper) {
+  return FindGammaShare(x, a, upper).ratio;
 }
 
 }  // namespace MCMath_800

@@ -3,22 +3,20 @@
 #ifndef KESTREL_MATH_GAMMARATIO_H
 #define KESTREL_MATH_GAMMARATIO_H
 
+#include "kestrel/math/DoubleDouble.h"
+
 namespace MCMath_800 {
 
-// All for finite x > 0 and a > 0. deviation is x - a, for an x that is known with more digits than x has.
+// All for finite x > 0 and a > 0.
 
 /// 1 / Gamma(1 + a) for 0 <= a <= 1.
 double ReciprocalGamma1(double a);
 /// ln Gamma(a); infinite when it is too large.
 double LogGamma(double a);
 
-/// a * LogDeviance(x / a - 1), the exponent that x^a e^-x loses on its way from a.
-double GammaDeviance(double x, double deviation, double a);
-
 /// x^a e^-x / Gamma(a), the gamma density times x; a Poisson probability is this over a. 0 when it is too
 /// small.
-double GammaPower(double x, double a);
-double GammaPower(double x, double deviation, double a);
+double GammaPower(DoubleDouble x, double a);
 
 /// P(a, x), the share of the gamma distribution below x, or the share above it, with the power term beside
 /// it.
@@ -26,10 +24,9 @@ struct GammaShare {
   double ratio;
   double power;
 };
-GammaShare FindGammaShare(double x, double deviation, double a, bool upper);
+GammaShare FindGammaShare(DoubleDouble x, double a, bool upper);
 
-double GammaRatio(double x, double a, bool upper);
-double GammaRatio(double x, double deviation, double a, bool upper);
+double GammaRatio(DoubleDouble x, double a, bool upper);
 
 }  // namespace MCMath_800
 

@@ -7,6 +7,8 @@
 
 namespace MCMath_800 {
 
+struct BetaPoint;
+
 /// Cumulative distribution functions (Cdf), their inverses (Idf) and upper-tail significances (Sig).
 ///
 /// Every function gives a finite double for any arguments. Arguments outside the domain that stand with each
@@ -123,10 +125,8 @@ class KESTREL_API MCDistFun {
   static double idfchb(const double& p, const double& df);
   static double vexaidfchi(const double& p, const double& df, long& err);
 
-  /// The incomplete beta ratio I_x(a, b), or its complement. x + y = 1, deviation = b * x - a * y: the caller
-  /// has them with more digits than x alone can carry.
-  static double cbtaux(const double& x, const double& y, const double& deviation, const double& a,
-                       const double& b, bool upper, long& err);
+  /// The incomplete beta ratio I_x(a, b), or its complement.
+  static double cbtaux(const BetaPoint& point, const double& a, const double& b, bool upper, long& err);
   static double cdfbet(const double& x, const double& a, const double& b, long& err);
   static double betinv(const double& p, const double& a, const double& b, long& err);
 

@@ -31,14 +31,9 @@ double HalfOf(double df) {
 }
 
 // The point whose odds x / y are given, which have the digits of the smaller of x and y.
-BetaPoint PointOfOdds(double odds, double a, double b) {
-  if (odds <= 1.0) {
-    BetaPoint point = MakeBetaPoint(odds / (1.0 + odds), a, b);
-    point.y = 1.0 / (1.0 + odds);
-    return point;
-  }
-  const BetaPoint turned = MakeBetaPoint(1.0 / (1.0 + odds), b, a);
-  return {1.0 / (1.0 + 1.0 / odds), turned.x, -turned.deviation};
+BetaPoint PointOfOdds(DoubleDouble odds, double a, double b) {
+  const DoubleDouble y = DoubleDouble(1.0) / (odds + 1.0);
+  return {odds * y, y, (odds * b - a) * y};
 }
 
 // Beyond this logarithm of the odds the leading power of that end is all there is to the beta distribution.
@@ -109,25 +104,23 @@ double FindOdds(double p, double q, double a, double b, double start) {
   const double reach = std::max(1.0, std::sqrt(a * (b / (a + b))));
   return SearchQuantile(start, upper ? q : p, reach, upper, [&](double odds) {
     const BetaPoint point = PointOfOdds(odds, a, b);
-    return QuantilePoint{BetaRatio(point, a, b, upper), BetaPower(point, a, b), -point.deviation};
+    return QuantilePoint{BetaRatio(point, a, b, upper), BetaPower(point, a, b), -point.deviation.high};
   });
 }
 
 }  // namespace
 
-double MCDistFun::cbtaux(const double& x, const double& y, const double& deviation, const double& a,
-                         const double& b, bool upper, long& err) {
+double MCDistFun::cbtaux(const BetaPoint& point, const double& a, const double& b, bool upper, long& err) {
   err = 0;
-  if (x <= 0.0) return upper ? 1.0 : 0.0;
-  if (y <= 0.0) return upper ? 0.0 : 1.0;
-  const double ratio = BetaRatio({x, y, deviation}, a, b, upper);
+  if (point.x.high <= 0.0) return upper ? 1.0 : 0.0;
+  if (point.y.high <= 0.0) return upper ? 0.0 : 1.0;
+  const double ratio = BetaRatio(point, a, b, upper);
   if (!std::isfinite(ratio)) err = 1;
   return ratio;
 }
 
 double MCDistFun::cdfbet(const double& x, const double& a, const double& b, long& err) {
-  const BetaPoint point = MakeBetaPoint(x, a, b);
-  return cbtaux(point.x, point.y, point.deviation, a, b, false, err);
+  return cbtaux(MakeBetaPoint(x, a, b), a, b, false, err);
 }
 
 double MCDistFun::betinv(const double& p, const double& a, const double& b, long& err) {
@@ -143,11 +136,17 @@ double MCDistFun::vexasigt(const double& size, const double& df, long& err) {
   if (df == 1.0) return std::atan2(1.0, size) / kPi;
   const double a = HalfOf(df);
   const double log_odds = 2.0 * (0.5 * std::log(df) - std::log(size));
-  if (log_odds < kExtremeLogOdds) return 0.5 * std::exp(a * log_odds - std::log(a) - LogBeta(a, 0.5));
-  const double square = size / std::sqrt(df) * (size / std::sqrt(df));
-  const double w = 1.0 / (1.0 + square);
-  const double y = square <= 1.0 ? square / (1.0 + square) : 1.0 / (1.0 + 1.0 / square);
-  return 0.5 * cbtaux(w, y, 0.5 * w * (1.0 - size) * (1.0 + size), a, 0.5, false, err);
+  if (log_odds < kExtremeLogOdds) {
+    // The leading power (df / size^2)^a / (a B(a, 1/2)); of many df it is too small for a double.
+    const double power = std::pow(size, -df);
+    return power == 0.0 ? 0.0 : 0.5 * power * std::pow(df, a) * (BetaPower({1.0, 1.0, 0.0}, a, 0.5) / a);
+  }
+  // Whichever way round nothing is too large or too small before it has to be.
+  const DoubleDouble square =
+      size > 1e100 ? DoubleDouble(size) / df * size : MultiplyExactly(size, size) / df;
+  const DoubleDouble w = DoubleDouble(1.0) / (square + 1.0);
+  const DoubleDouble above = AddExactly(1.0, -size) * AddExactly(1.0, size);
+  return 0.5 * cbtaux({w, w * square, above * w * 0.5}, a, 0.5, false, err);
 }
 
 double MCDistFun::vexacdft(const double& x, const double& df, long& err) {
@@ -176,10 +175,9 @@ double MCDistFun::vexaidft(const double& p, const double& df, long& err) {
 
 // Of x = df1 f / (df1 f + df2) the distance from the mean is formed of f - 1, which near the mean is exact.
 double MCDistFun::vexaratf(const double& f, const double& df1, const double& df2, bool upper, long& err) {
-  const double odds = f / df2 * df1;
-  const double y = 1.0 / (1.0 + odds);
-  const double x = odds <= 1.0 ? odds / (1.0 + odds) : 1.0 / (1.0 + 1.0 / odds);
-  return cbtaux(x, y, 0.5 * df1 * ((f - 1.0) * y), HalfOf(df1), HalfOf(df2), upper, err);
+  const DoubleDouble odds = DoubleDouble(f) / df2 * df1;
+  const DoubleDouble y = DoubleDouble(1.0) / (odds + 1.0);
+  return cbtaux({odds * y, y, y * AddExactly(f, -1.0) * (0.5 * df1)}, HalfOf(df1), HalfOf(df2), upper, err);
 }
 
 double MCDistFun::vexacdff(const double& f, const double& df1, const double& df2, long& err) {

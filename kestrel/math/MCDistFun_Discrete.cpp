@@ -83,7 +83,7 @@ double SmallestCount(double p, double n, double prob) {
 double MCDistFun::PdfBin(double x, double n, double prob, long& err) {
   err = 0;
   if (!IsBinomial(n, prob) || !std::isfinite(x)) return Refuse(err);
-  if (x < 0.0 || x > n || std::floor(x) != x) return 0.0;
+  if (x > n || !IsCount(x)) return 0.0;
   if (prob == 0.0) return x == 0.0 ? 1.0 : 0.0;
   if (prob == 1.0) return x == n ? 1.0 : 0.0;
   return BinomialProbability(x, n, prob);

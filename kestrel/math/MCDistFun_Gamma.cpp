@@ -24,11 +24,11 @@ bool IsParameter(double value) {
 }
 
 // The share of the gamma distribution below x, or above it, with the limits at both ends.
-double ShareOf(double x, double deviation, double shape, bool upper) {
+double ShareOf(DoubleDouble x, double shape, bool upper) {
   // Halves of the smallest numbers are 0: then all the mass is at 0.
-  if (x == 0.0 && shape > 0.0) return upper ? 1.0 : 0.0;
-  if (shape == 0.0 || std::isinf(x)) return upper ? 0.0 : 1.0;
-  return GammaRatio(x, deviation, shape, upper);
+  if (x.high == 0.0 && shape > 0.0) return upper ? 1.0 : 0.0;
+  if (shape == 0.0 || std::isinf(x.high)) return upper ? 0.0 : 1.0;
+  return GammaRatio(x, shape, upper);
 }
 
 // H. Goldberg and H. Levine, "Approximate formulas for the percentage points and normalization of t and
@@ -71,7 +71,7 @@ double MCDistFun::dnlbnc(const double& n, const double& k, long& err) {
 }
 
 double MCDistFun::gammad(const double& x, const double& shape, bool upper, long& err) {
-  const double share = ShareOf(x, x - shape, shape, upper);
+  const double share = ShareOf(x, shape, upper);
   err = std::isfinite(share) ? 0 : 1;
   return share;
 }
@@ -105,7 +105,7 @@ double MCDistFun::vexaidfchi(const double& p, const double& df, long& err) {
   const double target = upper ? 1.0 - p : p;
   const double x =
       SearchQuantile(0.5 * idfchb(p, df), target, std::max(1.0, std::sqrt(a)), upper, [&](double at) {
-        const GammaShare share = FindGammaShare(at, at - a, a, upper);
+        const GammaShare share = FindGammaShare(at, a, upper);
         return QuantilePoint{share.ratio, share.power, a - at};
       });
   const double quantile = 2.0 * x;
@@ -145,10 +145,8 @@ double MCDistFun::CdfGam(double x, double shape, double rate) {
     const double p = cdfexp(x, rate, err);
     return Finish(p, err);
   }
-  // For a large shape the product's rounding would show: its rest goes into the distance from the mean.
-  const ExactProduct product = MultiplyExactly(x, rate);
-  if (std::isinf(product.high)) return 1.0;
-  const double p = ShareOf(product.high, (product.high - shape) + product.low, shape, false);
+  // For a large shape the product's rounding would show.
+  const double p = ShareOf(MultiplyExactly(x, rate), shape, false);
   return Finish(p, std::isfinite(p) ? 0 : 1);
 }
 

@@ -120,10 +120,6 @@ double TailExponential(double y, double base, double factor) {
 
 }  // namespace
 
-double GuardedExpMinus(double x) {
-  return x <= -MCPower::gMachineMinExp ? std::exp(-x) : 0.0;
-}
-
 double ScaledErfc(double a) {
   const double t = kErfcScale / (a + kErfcScale);
   return Polynomial(kScaledErfc, t - 0.5) * t;

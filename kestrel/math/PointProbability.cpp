@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
 
 #include "kestrel/math/MCPower.h"
 #include "kestrel/math/SaddlePoint.h"
@@ -12,36 +13,28 @@ namespace {
 
 constexpr double kTwoPi = 6.283185307179586;
 
-/// x ln(x / mean) + mean - x for x >= 0, mean > 0, where distance = mean - x is known better than the
-/// subtraction gives it (Loader 2000, "Fast and accurate computation of binomial probabilities").
-double Deviance(double x, double mean, double distance) {
-  if (x == 0.0) return mean;
-  // Close to the mean the logarithm and the distance cancel. Far below x the quotient would be rounded to -1.
-  if (distance > -0.5 * x) return x * LogDeviance(distance / x);
-  return x * std::log(x / mean) + distance;
-}
-
 /// A quotient of factorials by Stirling's formula, m! = m^m e^-m sqrt(2 pi m) e^StirlingError(m), without the
 /// powers, which the deviances hold. 0! is 1, and 0^0 e^-0 as well.
 class FactorialQuotient {
  public:
   void Multiply(double m) {
-    if (m == 0.0) return;
-    above_ *= kTwoPi * m;
-    error_ += StirlingError(m);
+    above_ *= TwoPiTimes(m);
+    error_ += StirlingErrorOfCount(m);
   }
   void Divide(double m) {
-    if (m == 0.0) return;
-    below_ *= kTwoPi * m;
-    error_ -= StirlingError(m);
+    below_ *= TwoPiTimes(m);
+    error_ -= StirlingErrorOfCount(m);
   }
-  /// The quotient times e^-deviance.
-  double Times(double deviance) const {
-    const double exponent = error_ - deviance;
-    return MCPower::ExpUnderflow(exponent) ? 0.0 : std::sqrt(above_ / below_) * std::exp(exponent);
+  /// The quotient times e^-(a + b), a and b deviances.
+  double Times(DoubleDouble a, DoubleDouble b) const {
+    const DoubleDouble sum = AddExactly(a.high, b.high);
+    return std::sqrt(above_ / below_) *
+           GuardedExpMinus(AddExactly(sum.high, sum.low + (a.low + b.low) - error_));
   }
 
  private:
+  static double TwoPiTimes(double m) { return m == 0.0 ? 1.0 : kTwoPi * m; }
+
   double above_ = 1.0;
   double below_ = 1.0;
   double error_ = 0.0;
@@ -66,42 +59,50 @@ constexpr Node kNodes[] = {
 /// The table with its margins and how far the drawn successes are above their mean, which has digits that
 /// the cells alone have lost.
 struct MarkedTable {
-  FourFold cells;
-  double deviation;
+  DoubleDouble drawnSuccesses;
+  DoubleDouble leftSuccesses;
+  DoubleDouble drawnFailures;
+  DoubleDouble leftFailures;
+  DoubleDouble deviation;
 };
 
 MarkedTable Mark(const FourFold& table) {
   const double total = table.drawnSuccesses + table.leftSuccesses + table.drawnFailures + table.leftFailures;
-  const ExactProduct main = MultiplyExactly(table.drawnSuccesses, table.leftFailures);
-  const ExactProduct side = MultiplyExactly(table.leftSuccesses, table.drawnFailures);
-  return {table, ((main.high - side.high) + (main.low - side.low)) / total};
+  const DoubleDouble main = MultiplyExactly(table.drawnSuccesses, table.leftFailures);
+  const DoubleDouble side = MultiplyExactly(table.leftSuccesses, table.drawnFailures);
+  return {table.drawnSuccesses, table.leftSuccesses, table.drawnFailures, table.leftFailures,
+          (main - side) / total};
 }
 
 /// The table with `step` drawn successes fewer and the same margins.
 MarkedTable Below(const MarkedTable& table, double step) {
-  const FourFold& c = table.cells;
-  return {{c.drawnSuccesses - step, c.leftSuccesses + step, c.drawnFailures + step, c.leftFailures - step},
-          table.deviation - step};
+  return {table.drawnSuccesses - step, table.leftSuccesses + step, table.drawnFailures + step,
+          table.leftFailures - step, table.deviation - step};
 }
 
 double Probability(const MarkedTable& table) {
-  const FourFold& c = table.cells;
-  const double successes = c.drawnSuccesses + c.leftSuccesses;
-  const double failures = c.drawnFailures + c.leftFailures;
-  const double drawn = c.drawnSuccesses + c.drawnFailures;
-  const double left = c.leftSuccesses + c.leftFailures;
-  const double total = drawn + left;
+  const DoubleDouble successes = table.drawnSuccesses + table.leftSuccesses;
+  const DoubleDouble failures = table.drawnFailures + table.leftFailures;
+  const DoubleDouble drawn = table.drawnSuccesses + table.drawnFailures;
+  const DoubleDouble left = table.leftSuccesses + table.leftFailures;
+  const DoubleDouble total = drawn + left;
   FactorialQuotient factorials;
-  for (const double margin : {successes, failures, drawn, left})
-    factorials.Multiply(margin);
-  factorials.Divide(total);
-  for (const double cell : {c.drawnSuccesses, c.leftSuccesses, c.drawnFailures, c.leftFailures})
-    factorials.Divide(cell);
-  const double up = table.deviation;
-  return factorials.Times(Deviance(c.drawnSuccesses, successes * (drawn / total), -up) +
-                          Deviance(c.leftSuccesses, successes * (left / total), up) +
-                          Deviance(c.drawnFailures, failures * (drawn / total), up) +
-                          Deviance(c.leftFailures, failures * (left / total), -up));
+  for (const DoubleDouble& margin : {successes, failures, drawn, left})
+    factorials.Multiply(margin.high);
+  factorials.Divide(total.high);
+  for (const DoubleDouble& cell :
+       {table.drawnSuccesses, table.leftSuccesses, table.drawnFailures, table.leftFailures})
+    factorials.Divide(cell.high);
+  const DoubleDouble up = table.deviation;
+  const auto deviance = [&](const DoubleDouble& row, const DoubleDouble& column, const DoubleDouble& distance,
+                            const DoubleDouble& cell) {
+    const auto mean = [&] { return row * column / total; };
+    return cell.high == 0.0 ? mean() : Deviance(mean, distance, cell);
+  };
+  return factorials.Times(
+      deviance(successes, drawn, -up, table.drawnSuccesses) +
+          deviance(successes, left, up, table.leftSuccesses),
+      deviance(failures, drawn, up, table.drawnFailures) + deviance(failures, left, -up, table.leftFailures));
 }
 
 /// Adds up the tail term by term; the quotients of neighbours are rational.
@@ -145,7 +146,8 @@ double EndCorrection(const FourFold& table) {
 }  // namespace
 
 bool IsCount(double n) {
-  return n >= 0.0 && n <= kLargestCount && std::floor(n) == n;
+  // The conversion there and back is shorter than std::floor.
+  return n >= 0.0 && n <= kLargestCount && static_cast<double>(static_cast<std::int64_t>(n)) == n;
 }
 
 double BinomialProbability(double k, double n, double prob) {
@@ -153,9 +155,13 @@ double BinomialProbability(double k, double n, double prob) {
   factorials.Multiply(n);
   factorials.Divide(k);
   factorials.Divide(n - k);
-  const ExactProduct mean = MultiplyExactly(n, prob);
-  const double distance = (mean.high - k) + mean.low;
-  return factorials.Times(Deviance(k, mean.high, distance) + Deviance(n - k, n * (1.0 - prob), -distance));
+  const DoubleDouble mean = MultiplyExactly(n, prob);
+  const DoubleDouble above = AddExactly(mean.high, -k);
+  const DoubleDouble distance = {above.high, above.low + mean.low};
+  const double left = n - k;
+  const DoubleDouble successes = k == 0.0 ? mean : Deviance([&] { return mean; }, distance, k);
+  const auto failure_mean = [&] { return AddExactly(1.0, -prob) * n; };
+  return factorials.Times(successes, left == 0.0 ? failure_mean() : Deviance(failure_mean, -distance, left));
 }
 
 double HypergeometricProbability(const FourFold& table) {
