@@ -7,7 +7,7 @@ One row: the arguments as exact doubles, then the values, computed with 60 digit
 `quantile` is the inverse at the double nearest to `cdf` (left out where that is 1), `nc_root` the non-centrality
 that gives that double (left out where it is ill-determined), `middle` a probability whose binomial quantile is k.
 Points cover both tails down to 1e-300, the neighbourhood of the mean and parameters from 0.1 to 1e7, all from one
-seed. check_reference.py holds the values against other methods. Needs mpmath; takes about 25 minutes.
+seed. check_reference.py holds the values against other methods. Needs mpmath; takes about 45 minutes.
 """
 import argparse
 import csv
@@ -281,8 +281,7 @@ def lgamma_row(r):
     return ([x], [value]) if x not in (1.0, 2.0) else None
 
 
-# name of the table: arguments, values, rows, what makes a row. Some rows stay without a quantile. Those of
-# noncentral_t are fewer because each takes many times as long.
+# name of the table: arguments, values, rows, what makes a row. Some rows stay without a quantile.
 FAMILIES = {
     "normal": ("x", "cdf quantile", 13000, normal_row),
     "lgamma": ("x", "value", 10000, lgamma_row),
@@ -294,8 +293,12 @@ FAMILIES = {
     "hypergeometric": ("k total successes draws", "cdf", 10000, hypergeometric_row),
     "noncentral_chi": ("x df nc", "cdf nc_root", 10000, noncentral_chi_row),
     "noncentral_f": ("x df1 df2 nc", "cdf nc_root", 10000, noncentral_f_row),
-    "noncentral_t": ("x df nc", "cdf nc_root", 3000, noncentral_t_row),
+    "noncentral_t": ("x df nc", "cdf nc_root", 10000, noncentral_t_row),
 }
+
+# Tables that go on, with such rows alone, until this many have their last value: about half of the searches for a
+# non-centrality are ill-determined.
+COMPLETE = {"noncentral_chi": 10000, "noncentral_f": 10000, "noncentral_t": 10000}
 
 
 def argument_text(x):
@@ -313,19 +316,21 @@ def value_text(value):
 
 def write_table(folder, name, rows):
     arguments, values, wanted, make = FAMILIES[name]
+    wanted, enough = rows or wanted, 0 if rows else COMPLETE.get(name, 0)
     r = random.Random(f"{name} 1")
-    seen, start = set(), time.process_time()
+    seen, complete, start = set(), 0, time.process_time()
     with open(os.path.join(folder, name + ".csv"), "w", newline="", encoding="ascii") as file:
         out = csv.writer(file, lineterminator="\n")
         out.writerow(arguments.split() + values.split())
-        while len(seen) < (rows or wanted):
+        while len(seen) < wanted or complete < enough:
             row = make(r)
-            if row is None:
+            if row is None or len(seen) >= wanted and row[1][-1] is None:
                 continue
             cells = tuple(argument_text(x) for x in row[0])
             if cells in seen:
                 continue
             seen.add(cells)
+            complete += row[1][-1] is not None
             out.writerow(list(cells) + [value_text(v) for v in row[1]])
     print(f"{name}: {len(seen)} rows in {time.process_time() - start:.0f} s", flush=True)
 

@@ -1,0 +1,150 @@
+#include "kestrel/math/NonCentralSaddle.h"
+
+#include <algorithm>
+#include <cmath>
+#include <complex>
+
+#include "kestrel/math/MCPower.h"
+#include "kestrel/math/Polynomial.h"
+#include "kestrel/math/SaddlePoint.h"
+
+namespace MCMath_800 {
+
+namespace {
+
+constexpr double kPi = 3.14159265358979323846;
+
+using Complex = std::complex<double>;
+
+/// (x - atan(x)) / x^3 in x^2.
+constexpr double kArcSeries[] = {1.0 / 3,   -1.0 / 5, 1.0 / 7,   -1.0 / 9, 1.0 / 11,  -1.0 / 13, 1.0 / 15,
+                                 -1.0 / 17, 1.0 / 19, -1.0 / 21, 1.0 / 23, -1.0 / 25, 1.0 / 27,  -1.0 / 29};
+
+/// z - ln(1 + z), without the cancellation of small z.
+Complex Deviance(const Complex& z) {
+  const double x = z.real(), y = z.imag();
+  const double norm = x * x + y * y;
+  const double real = 0.5 * (LogDeviance(2.0 * x + norm) - norm);
+  const double slant = y / (1.0 + x);
+  if (x < -0.5 || std::fabs(slant) > 0.3) return {real, y - std::atan2(y, 1.0 + x)};
+  const double square = slant * slant;
+  return {real, slant * (x + square * Polynomial(kArcSeries, square))};
+}
+
+Complex Reciprocal(const Complex& z) {
+  return std::conj(z) / std::norm(z);
+}
+
+/// The line that the integral is taken on: t with 2 t / (1 - 2 t) = u at its real point.
+struct Line {
+  double u;
+  double w;
+  double part;
+  double exponent;  ///< the cumulant function there, without its sign
+  double tilt;      ///< its slope in alpha, which is 0 at the saddle point
+};
+
+/// The line through the saddle point, or a little beside it when that would lead through the pole at t = 0.
+Line ChooseLine(const ChiQuotient& q, double nc, const ChiSaddle& saddle) {
+  const double square = 0.5 * (q.df1 + q.df2 * saddle.part * saddle.part) + nc * saddle.w;
+  const double gap = std::min(0.5 / std::sqrt(square), 0.3 / saddle.part);
+  if (std::fabs(saddle.u) >= gap) return {saddle.u, saddle.w, saddle.part, 0.5 * saddle.deviance, 0.0};
+  Line line{};
+  line.u = std::copysign(gap, saddle.u);
+  line.w = 1.0 + line.u;
+  const double v = q.odds * line.u / line.w;
+  line.part = q.df2 > 0.0 ? q.odds / (line.w + q.odds * line.u) : 0.0;
+  const double mean = q.df1 + nc;
+  const double bound = q.df2 > 0.0 ? q.df2 * q.odds : q.point;
+  line.exponent = 0.5 * (q.df1 * LogDeviance(line.u) - q.df2 * LogDeviance(v) +
+                         line.u / line.w * ((bound - mean) - mean * line.u));
+  line.tilt = 0.5 * (q.df1 + nc * line.w - (q.df2 > 0.0 ? q.df2 * line.part : q.point / line.w));
+  return line;
+}
+
+}  // namespace
+
+double SaddleDeviance(double u, double w) {
+  return u > -0.5 ? LogDeviance(u) : u - std::log(w);
+}
+
+ChiQuotient ChiAgainstNumber(double df, double x) {
+  return {df, 0.0, 0.0, 1.0, x};
+}
+
+ChiQuotient ChiAgainstChi(double df1, double df2, double odds) {
+  const double y = 1.0 / (1.0 + odds);
+  return {df1, df2, odds, y, df2 * (odds * y)};
+}
+
+// The saddle point solves a quadratic equation, of which the positive root w is taken; u has one of its own,
+// so that nothing cancels.
+ChiSaddle FindSaddle(const ChiQuotient& q, double nc) {
+  const double x = q.odds * q.y;
+  const double lead = q.df1 - nc * x;
+  const double rest = x * q.df1 + q.point;
+  const double root = std::sqrt(lead * lead + 4.0 * nc * rest);
+  double u = 2.0 * (q.point - (q.df1 + nc) * q.y) / (q.df1 + nc * (1.0 + q.y) + root);
+  if (u == 0.0) u = 1e-20;
+  const double w = lead > 0.0 ? 2.0 * rest / (lead + root) : 0.5 * (root - lead) / nc;
+  double deviance = q.df1 * SaddleDeviance(u, w) + nc * u * u;
+  if (q.df2 == 0.0) return {u, w, 0.0, deviance};
+  const double part = (q.df1 + nc * w) / q.df2;
+  deviance += q.df2 * SaddleDeviance(-u * part, w * part / q.odds);
+  return {u, w, part, deviance};
+}
+
+// The tail is an integral of e^K(t) / t over a path across the real axis, K the cumulant function (S. O. Rice
+// 1980, "Distribution of quadratic forms in normal random variables - evaluation by numerical integration").
+// With 1 - 2 t = (1 - z) / w the saddle point is at z = 0. The path z = i y - bend y^2 follows the steepest
+// descent there, so that nothing oscillates. The trapezoidal rule in theta, y = reach sinh(theta), converges
+// exponentially; the pole of 1 / t, which may be close, is taken out by its residue.
+NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle& saddle, SumCare care) {
+  const double digits = care == SumCare::kRough ? 17.0 : 36.0;
+  const Line line = ChooseLine(q, nc, saddle);
+  const double pull = nc * line.w;
+  const double spread = 0.5 * (q.df1 + q.df2 * line.part * line.part) + pull;
+  const double scale = std::sqrt(spread);
+  const double bend = (q.df2 * line.part * line.part * line.part - q.df1 - 3.0 * pull) / (6.0 * spread);
+  // Where 1 - z, 1 + part z and u + z are 0, on the imaginary axis of y, or how far from it when beside it.
+  const auto height = [bend](double z) {
+    const double inside = 1.0 + 4.0 * bend * z;
+    return inside > 0.0 ? 2.0 * std::fabs(z) / (1.0 + std::sqrt(inside)) : 0.5 / std::fabs(bend);
+  };
+  const double reach = 0.85 * std::min(height(1.0), height(-1.0 / line.part));
+  // Inside a strip of that width the integrand grows at most as e to the power of the square below.
+  const double strip = std::min(0.7, 6.0 / (scale * reach));
+  const double growth = scale * reach * strip;
+  const double h = 2.0 * kPi * strip / (digits + growth * growth);
+  const double grow = std::exp(h);
+  const double shrink = 1.0 / grow;
+  double share = 0.5 * reach / line.u;
+  double slope = 0.5 * reach;
+  double curve = 0.25 * reach * line.u;
+  double up = 0.5 * reach, down = 0.5 * reach;
+  constexpr int kNodeLimit = 500;
+  for (int node = 0; node < kNodeLimit; ++node) {
+    up *= grow;
+    down *= shrink;
+    const double y = up - down;
+    const Complex z(-bend * y * y, y);
+    const Complex inverse = Reciprocal(1.0 - z);
+    Complex exponent = 0.5 * (q.df1 * Deviance(-z) + pull * (z * z * inverse)) + line.tilt * z;
+    if (q.df2 > 0.0) exponent += 0.5 * q.df2 * Deviance(line.part * z);
+    const double weight = (up + down) * std::exp(exponent.real());
+    const Complex power = Complex(weight * std::cos(exponent.imag()), weight * std::sin(exponent.imag())) *
+                          Complex(1.0, 2.0 * bend * y);
+    const Complex change = power * inverse;
+    share += (power * Reciprocal(line.u + z)).real();
+    slope += change.real();
+    curve += 0.5 * (change * (line.w * inverse - 1.0)).real();
+    if (exponent.real() < -digits) break;
+  }
+  const double front = MCPower::ExpUnderflow(-line.exponent) ? 0.0 : std::exp(-line.exponent) * h / kPi;
+  const double distance = std::asin(std::min(1.0, height(-line.u) / reach));
+  const double pole = distance < strip ? 1.0 / std::expm1(2.0 * kPi * distance / h) : 0.0;
+  const double sign = std::copysign(1.0, line.u);
+  return {sign * front * share - pole, sign * 0.5 * front * slope, sign * 0.5 * front * curve};
+}
+
+}  // namespace MCMath_800
