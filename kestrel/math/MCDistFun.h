@@ -13,9 +13,10 @@ struct BetaPoint;
 ///
 /// Every function gives a finite double for any arguments. Arguments outside the domain that stand with each
 /// function, a NaN, an infinite parameter, and a result that is too large give the missing value of `MCMV`.
-/// An infinite x is a point like others: it gives the limit, 0 or 1. The missing value as an argument is the
-/// number that it is. Upper tails are computed as such, so that a small one has all its digits; the figures
-/// are in docs/accuracy.md. Nothing throws or allocates; any number of threads may call at once.
+/// An infinite x is a point like others in every distribution function and significance: it gives the limit,
+/// 0 or 1. The missing value as an argument is the number that it is. Upper tails are computed as such, so
+/// that a small one has all its digits; the figures are in docs/accuracy.md. Nothing throws or allocates; any
+/// number of threads may call at once.
 class KESTREL_API MCDistFun {
  public:
   // --- The normal distribution. sd > 0; 0 < p < 1. ---
@@ -48,8 +49,8 @@ class KESTREL_API MCDistFun {
   static double CdfGam(double x, double shape, double rate);
   static double IdfGam(double p, double shape, double rate);
 
-  // --- Counts. n, total, successes and draws are whole numbers from 0 to 2^53, 0 <= prob <= 1. An infinite x
-  // is outside the domain here. err is 0, or 1 with the missing value: an argument outside the domain. ---
+  // --- Counts. n, total, successes and draws are whole numbers from 0 to 2^53, 0 <= prob <= 1. err is 0, or
+  // 1 with the missing value: an argument outside the domain. ---
   /// The probability of x successes in n trials; 0 for an x that is no count from 0 to n.
   static double PdfBin(double x, double n, double prob, long& err);
   /// Of at most x successes.
@@ -59,14 +60,14 @@ class KESTREL_API MCDistFun {
   /// Of at most x successes among `draws` out of `total` without replacement; successes, draws <= total.
   static double CDFHyper(double x, double total, double successes, double draws, long& err);
 
-  // --- Non-central distributions. 0.01 <= df <= 1e10; 0 <= nc <= 1e9, for t from -3e4 to 3e4; x is finite,
-  // for t up to 1e140 either way. Everything else is missing. ---
+  // --- Non-central distributions. 0.01 <= df <= 1e10; 0 <= nc <= 1e9, for t from -3e4 to 3e4. Everything
+  // else is missing. ---
   static double NonCentralCdfT(double x, double df, double nc);
   static double NonCentralCdfChi(double x, double df, double nc);
   /// upper  gives the share above x, the power of an F test, with all its digits where it is small.
   static double NonCentralCdfF(double x, double df1, double df2, double nc, bool upper = false);
-  /// The nc at which the distribution function at x is p, 0 < p < 1. Missing when there is none: chi-square
-  /// and F take only a p up to that of nc = 0. At most 100 steps.
+  /// The nc at which the distribution function at x, a finite number, is p, 2.3e-308 <= p < 1. Missing when
+  /// there is none: chi-square and F take only a p up to that of nc = 0. At most 100 steps, as a rule two.
   static double FindNCParamT(double x, double df, double p);
   static double FindNCParamChi(double x, double df, double p);
   static double FindNCParamF(double x, double df1, double df2, double p);

@@ -82,7 +82,7 @@ double SmallestCount(double p, double n, double prob) {
 
 double MCDistFun::PdfBin(double x, double n, double prob, long& err) {
   err = 0;
-  if (!IsBinomial(n, prob) || !std::isfinite(x)) return Refuse(err);
+  if (!IsBinomial(n, prob) || std::isnan(x)) return Refuse(err);
   if (x > n || !IsCount(x)) return 0.0;
   if (prob == 0.0) return x == 0.0 ? 1.0 : 0.0;
   if (prob == 1.0) return x == n ? 1.0 : 0.0;
@@ -91,7 +91,7 @@ double MCDistFun::PdfBin(double x, double n, double prob, long& err) {
 
 double MCDistFun::CdfBin(double x, double n, double prob, long& err) {
   err = 0;
-  if (!IsBinomial(n, prob) || !std::isfinite(x)) return Refuse(err);
+  if (!IsBinomial(n, prob) || std::isnan(x)) return Refuse(err);
   if (x < 0.0) return 0.0;
   if (x >= n || prob == 0.0) return 1.0;
   if (prob == 1.0) return 0.0;
@@ -109,7 +109,7 @@ double MCDistFun::IdfBin(double p, double n, double prob, long& err) {
 double MCDistFun::CDFHyper(double x, double total, double successes, double draws, long& err) {
   err = 0;
   if (!IsCount(total) || !IsCount(successes) || !IsCount(draws) || successes > total || draws > total ||
-      !std::isfinite(x))
+      std::isnan(x))
     return Refuse(err);
   const double failures = total - successes;
   const double k = std::floor(x);

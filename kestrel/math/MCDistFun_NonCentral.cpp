@@ -15,8 +15,6 @@ namespace {
 
 using MCCommon_800::MCMV;
 
-constexpr double kLargestX = 1e140;
-
 bool IsDf(double df) {
   return df >= 0.01 && df <= 1e10;
 }
@@ -101,18 +99,17 @@ bool IsNc(double nc) {
 }  // namespace
 
 double MCDistFun::NonCentralCdfT(double x, double df, double nc) {
-  if (!(std::fabs(x) <= kLargestX) || !IsDf(df) || !(std::fabs(nc) <= kLargestStudentParameter))
-    return MCMV::gMissingValue;
+  if (std::isnan(x) || !IsDf(df) || !(std::fabs(nc) <= kLargestStudentParameter)) return MCMV::gMissingValue;
   return AsProbability(FindStudentTail(x, df, nc, false, SumCare::kFull).share);
 }
 
 double MCDistFun::NonCentralCdfChi(double x, double df, double nc) {
-  if (!std::isfinite(x) || !IsDf(df) || !IsNc(nc)) return MCMV::gMissingValue;
+  if (std::isnan(x) || !IsDf(df) || !IsNc(nc)) return MCMV::gMissingValue;
   return x <= 0.0 ? 0.0 : AsProbability(FindChiTail(x, df, nc, false, SumCare::kFull).share);
 }
 
 double MCDistFun::NonCentralCdfF(double x, double df1, double df2, double nc, bool upper) {
-  if (!std::isfinite(x) || !IsDf(df1) || !IsDf(df2) || !IsNc(nc)) return MCMV::gMissingValue;
+  if (std::isnan(x) || !IsDf(df1) || !IsDf(df2) || !IsNc(nc)) return MCMV::gMissingValue;
   if (x <= 0.0) return upper ? 1.0 : 0.0;
   const double ratio = x * (df1 / df2);
   long err = 0;
@@ -121,7 +118,7 @@ double MCDistFun::NonCentralCdfF(double x, double df1, double df2, double nc, bo
 }
 
 double MCDistFun::FindNCParamT(double x, double df, double p) {
-  if (!(std::fabs(x) <= kLargestX) || !IsDf(df) || !IsSearchable(p)) return MCMV::gMissingValue;
+  if (!std::isfinite(x) || !IsDf(df) || !IsSearchable(p)) return MCMV::gMissingValue;
   const double z = IdfStdNorm(p);
   if (x == 0.0) return -z;
   return FindNonCentrality(

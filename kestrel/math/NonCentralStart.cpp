@@ -95,6 +95,9 @@ double Solve(const Model& model, double z, double low, double high, double start
 }  // namespace
 
 double StartStudentParameter(double z, double x, double df) {
+  // Squares of larger numbers are no numbers.
+  constexpr double kFarX = 1e140;
+  x = std::min(std::max(x, -kFarX), kFarX);
   const double spread = std::hypot(1.0, x / std::sqrt(2.0 * df));
   return Solve(StudentModel{x, df}, z, -kLargestStudentParameter, kLargestStudentParameter, x - z * spread);
 }

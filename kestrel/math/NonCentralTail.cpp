@@ -20,6 +20,10 @@ constexpr double kRootTwoPi = 2.50662827463100050242;
 constexpr double kIntegralFrom = 600.0;
 constexpr double kStudentIntegralFrom = 250.0;
 
+/// So close to 0 a distribution of squares is as good as a power of x; the sums' quotients are no numbers
+/// there.
+constexpr double kNearZero = 1e-280;
+
 double NormalDensity(double z) {
   return std::exp(-0.5 * z * z) / kRootTwoPi;
 }
@@ -113,7 +117,8 @@ NonCentralTail StudentOneSide(double x, double df, double nc, bool upper, SumCar
   const double y = 1.0 / (1.0 + square);
   const double edge = NormalDensity(nc) * std::exp(-0.5 * df * std::log1p(square));
   NonCentralTail tail = {0.0, -edge, nc * edge};
-  if (square == 0.0) {
+  if (square < kNearZero) {
+    // Too close to 0 for anything to lie between.
     if (above) tail.share = MCDistFun::CdfStdNorm(nc);
   } else if (lambda < kSmallestPoissonMean) {
     tail.share = above ? MCDistFun::SigT(x, df) : MCDistFun::CdfT(x, df) - 0.5;
@@ -143,9 +148,26 @@ NonCentralTail StudentTail(double x, double df, double nc, bool upper, SumCare c
   return Turned({above.share, -above.slope, above.bend}, !upper);
 }
 
+NonCentralTail PowerTail(const NonCentralTail& below, double x, double power, bool upper) {
+  const double share = std::pow(x / kNearZero, power);
+  return Turned({share * below.share, share * below.slope, share * below.bend}, upper);
+}
+
+/// Squares of larger numbers are no numbers.
+constexpr double kFarX = 1e140;
+
+/// Beyond kFarX either way, where a tail is as good as a power of x.
+NonCentralTail FarStudentTail(double x, double df, double nc, bool upper, SumCare care) {
+  const bool right = x > 0.0;
+  const NonCentralTail tail = FindStudentTail(right ? kFarX : -kFarX, df, nc, right, care);
+  const double share = std::pow(kFarX / std::fabs(x), df);
+  return Turned({share * tail.share, share * tail.slope, share * tail.bend}, upper != right);
+}
+
 }  // namespace
 
 NonCentralTail FindStudentTail(double x, double df, double nc, bool upper, SumCare care) {
+  if (std::fabs(x) > kFarX) return FarStudentTail(x, df, nc, upper, care);
   if (x > 0.0) return StudentTail(x, df, nc, upper, care);
   if (x < 0.0) {
     const NonCentralTail tail = StudentTail(-x, df, -nc, !upper, care);
@@ -158,7 +180,10 @@ NonCentralTail FindStudentTail(double x, double df, double nc, bool upper, SumCa
 
 NonCentralTail FindChiTail(double x, double df, double nc, bool upper, SumCare care) {
   const double half = 0.5 * x;
-  if (half == 0.0) return {upper ? 1.0 : 0.0, 0.0, 0.0};
+  if (half < kNearZero)
+    return PowerTail(FindChiTail(2.0 * kNearZero, df, nc, false, care), half, 0.5 * df, upper);
+  // So far out the share above is too small for any number.
+  if (half > 1e4 + 50.0 * (df + nc)) return {upper ? 0.0 : 1.0, 0.0, 0.0};
   const double lambda = 0.5 * nc;
   const ChiQuotient quotient = ChiAgainstNumber(df, x);
   const ChiSaddle saddle = FindSaddle(quotient, nc);
@@ -172,7 +197,7 @@ NonCentralTail FindChiTail(double x, double df, double nc, bool upper, SumCare c
 NonCentralTail FindBetaTail(double ratio, double a, double b, double nc, bool upper, SumCare care) {
   const double y = 1.0 / (1.0 + ratio);
   const double x = ratio * y;
-  if (ratio == 0.0) return {upper ? 1.0 : 0.0, 0.0, 0.0};
+  if (ratio < kNearZero) return PowerTail(FindBetaTail(kNearZero, a, b, nc, false, care), ratio, a, upper);
   if (y == 0.0 || !std::isfinite(x)) return {upper ? 0.0 : 1.0, 0.0, 0.0};
   const double lambda = 0.5 * nc;
   const ChiQuotient quotient = ChiAgainstChi(2.0 * a, 2.0 * b, ratio);

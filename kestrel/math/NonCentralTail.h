@@ -8,8 +8,8 @@
 
 namespace MCMath_800 {
 
-// The share below x, or above it (`upper`). All arguments are finite and inside the limits that MCDistFun
-// states.
+// The share below x, or above it (`upper`), for arguments inside the limits that MCDistFun states; x may be
+// infinite.
 
 NonCentralTail FindStudentTail(double x, double df, double nc, bool upper, SumCare care);
 

@@ -111,8 +111,6 @@ TEST(NonCentral, RefusesWhatIsOutsideTheDomain) {
   };
   const Row kRows[] = {
       {"t: NaN as x", MCDistFun::NonCentralCdfT(kNaN, 3, 1)},
-      {"t: infinite x", MCDistFun::NonCentralCdfT(kInfinity, 3, 1)},
-      {"t: x past its limit", MCDistFun::NonCentralCdfT(1e141, 3, 1)},
       {"t: no degree of freedom", MCDistFun::NonCentralCdfT(1, 0, 1)},
       {"t: NaN as df", MCDistFun::NonCentralCdfT(1, kNaN, 1)},
       {"t: too many degrees of freedom", MCDistFun::NonCentralCdfT(1, 1.1e10, 1)},
@@ -125,11 +123,13 @@ TEST(NonCentral, RefusesWhatIsOutsideTheDomain) {
       {"F: negative df1", MCDistFun::NonCentralCdfF(1, -3, 4, 1)},
       {"F: no df2", MCDistFun::NonCentralCdfF(1, 3, 0, 1)},
       {"F: NaN as parameter", MCDistFun::NonCentralCdfF(1, 3, 4, kNaN)},
-      {"F: infinite x", MCDistFun::NonCentralCdfF(kInfinity, 3, 4, 1)},
       {"search t: p is 0", MCDistFun::FindNCParamT(1, 3, 0.0)},
       {"search t: p is 1", MCDistFun::FindNCParamT(1, 3, 1.0)},
+      {"search t: p is too small to search by", MCDistFun::FindNCParamT(1, 3, 1e-310)},
       {"search t: out of reach", MCDistFun::FindNCParamT(1e10, 1e9, 0.5)},
       {"search chi-square: p above the central one", MCDistFun::FindNCParamChi(1, 3, 0.9)},
+      {"search chi-square: out of reach", MCDistFun::FindNCParamChi(1e300, 3, 0.5)},
+      {"search F: out of reach", MCDistFun::FindNCParamF(1e300, 3, 1e9, 0.5)},
       {"search chi-square: x is 0", MCDistFun::FindNCParamChi(0, 3, 0.5)},
       {"search chi-square: NaN as p", MCDistFun::FindNCParamChi(5, 3, kNaN)},
       {"search F: p above the central one", MCDistFun::FindNCParamF(0.1, 3, 5, 0.9)},
@@ -140,6 +140,44 @@ TEST(NonCentral, RefusesWhatIsOutsideTheDomain) {
   EXPECT_EQ(MCDistFun::NonCentralCdfChi(0, 3, 1), 0.0);
   EXPECT_EQ(MCDistFun::NonCentralCdfF(-1, 3, 4, 1), 0.0);
   EXPECT_EQ(MCDistFun::NonCentralCdfF(-1, 3, 4, 1, true), 1.0);
+}
+
+// Every x has a share, also where squares and products overflow.
+TEST(NonCentral, ReachesTheEndsOfTheLine) {
+  for (const double df : {0.01, 3.0, 1e3, 1e10}) {
+    for (const double nc : {0.0, 1e-300, 1e-5, 2.0, 300.0, 2e4}) {
+      double t = 0.0, chi = 0.0, f = 0.0, negative = 1.0;
+      for (double x = 1e-300; x < 1e305; x *= 1e5) {
+        const double up[] = {MCDistFun::NonCentralCdfT(x, df, nc), MCDistFun::NonCentralCdfChi(x, df, nc),
+                             MCDistFun::NonCentralCdfF(x, 4.0, df, nc)};
+        const double down = MCDistFun::NonCentralCdfT(-x, df, nc);
+        for (const double share : {up[0], up[1], up[2], down})
+          ASSERT_TRUE(share >= 0.0 && share <= 1.0) << x << " " << df << " " << nc << ": " << share;
+        EXPECT_GE(up[0], t * (1.0 - 1e-12)) << "t at " << x << " " << df << " " << nc;
+        EXPECT_GE(up[1], chi * (1.0 - 1e-12)) << "chi-square at " << x << " " << df << " " << nc;
+        EXPECT_GE(up[2], f * (1.0 - 1e-12)) << "F at " << x << " " << df << " " << nc;
+        EXPECT_LE(down, negative * (1.0 + 1e-12)) << "t at " << -x << " " << df << " " << nc;
+        t = up[0];
+        chi = up[1];
+        f = up[2];
+        negative = down;
+      }
+      EXPECT_EQ(chi, 1.0) << df << " " << nc;
+    }
+  }
+}
+
+// Far out a tail of t falls with the power df of x.
+TEST(NonCentral, FollowsThePowerLawPastTheSquareOfNumbers) {
+  for (const double df : {0.01, 0.3, 1.0}) {
+    for (const double nc : {-3.0, 0.0, 0.5, 20.0}) {
+      const double near = MCDistFun::NonCentralCdfT(-1e130, df, nc);
+      const double far = MCDistFun::NonCentralCdfT(-1e250, df, nc);
+      EXPECT_NEAR(far, near * std::pow(1e-120, df), 1e-12 * far) << df << " " << nc;
+    }
+  }
+  EXPECT_NEAR(MCDistFun::NonCentralCdfT(-1e200, 0.3, MCDistFun::FindNCParamT(-1e200, 0.3, 1e-62)), 1e-62,
+              1e-74);
 }
 
 TEST(NonCentral, SearchTurnsTheProbabilityBack) {
