@@ -23,6 +23,7 @@
 #include "kestrel/dictionary/ScoreValueProbability.h"
 #include "kestrel/dictionary/ScoreValueProbabilitySet.h"
 #include "kestrel/dictionary/ScoreVarStats.h"
+#include "kestrel/dictionary/TextCodes.h"
 #include "kestrel/dictionary/ValueIndex.h"
 #include "kestrel/dictionary/ValueLabelSet.h"
 #include "kestrel/dictionary/ValueLbl.h"

@@ -21,8 +21,8 @@ struct ApplyDetail;
 /// One step of a program. What it reads and writes are places that stay where they are from case to case:
 /// views of the fields, constants, and results of steps before it.
 struct ApplyInstruction {
-  /// Does the step and says how many of those behind it are left out.
-  using Run = std::size_t (*)(const ApplyInstruction& step);
+  /// Does the step and gives the one to do next.
+  using Run = const ApplyInstruction* (*)(const ApplyInstruction& step);
 
   Run run = nullptr;
   const double* x = nullptr;
@@ -30,7 +30,7 @@ struct ApplyInstruction {
   double* out = nullptr;
   ApplyDetail* detail = nullptr;  ///< what steps on texts, lists and fields need beside that
   TransformFunction function = kNoFunction;
-  std::size_t skip = 0;  ///< for jumps
+  std::size_t skip = 0;  ///< for jumps: how many behind it are left out
 };
 
 /// A text that a step reads: a place that holds the address of the text.
@@ -61,9 +61,9 @@ class ApplyProgram {
   static bool IsReference(const FunctionTree& node);
 
   void Run() {
-    const std::size_t end = code_.size();
-    for (std::size_t at = 0; at < end; ++at)
-      at += code_[at].run(code_[at]);
+    const ApplyInstruction* const end = code_.data() + code_.size();
+    for (const ApplyInstruction* step = code_.data(); step != end;)
+      step = step->run(*step);
   }
   double GetNumber() const { return *number_; }
   const StringValue& GetText() const { return **text_; }

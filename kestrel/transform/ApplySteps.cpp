@@ -11,15 +11,13 @@ namespace MCKestrel_800 {
 namespace ApplySteps {
 namespace {
 
-constexpr std::size_t kNext = 0;
-
-std::size_t Give(Step step, double result) {
+Next Give(Step step, double result) {
   *step.out = result;
-  return kNext;
+  return &step + 1;
 }
 
 // The result of a test, or of its opposite.
-std::size_t GiveTest(Step step, bool holds, TransformFunction opposite) {
+Next GiveTest(Step step, bool holds, TransformFunction opposite) {
   return Give(step, holds != (step.function == opposite) ? 1.0 : 0.0);
 }
 
@@ -29,27 +27,27 @@ const StringValue& TextOf(Step step, std::size_t index = 0) {
 
 }  // namespace
 
-std::size_t Add(Step step) {
+Next Add(Step step) {
   return Give(step, PlusNumbers(*step.x, *step.y));
 }
 
-std::size_t Subtract(Step step) {
+Next Subtract(Step step) {
   return Give(step, MinusNumbers(*step.x, *step.y));
 }
 
-std::size_t Multiply(Step step) {
+Next Multiply(Step step) {
   return Give(step, MultiplyNumbers(*step.x, *step.y));
 }
 
-std::size_t Divide(Step step) {
+Next Divide(Step step) {
   return Give(step, DivideNumbers(*step.x, *step.y));
 }
 
-std::size_t Scalar(Step step) {
+Next Scalar(Step step) {
   return Give(step, ApplyTransFunction(*step.x, *step.y, step.function));
 }
 
-std::size_t List(Step step) {
+Next List(Step step) {
   ApplyDetail& detail = *step.detail;
   for (std::size_t i = 0; i < detail.values.size(); ++i)
     detail.values[i] = *detail.numbers[i];
@@ -57,36 +55,36 @@ std::size_t List(Step step) {
                                             detail.scratch));
 }
 
-std::size_t DateTime(Step step) {
+Next DateTime(Step step) {
   return Give(step, ApplyDateTimeFunction(*step.x, *step.y, step.function));
 }
 
-std::size_t Outlier(Step step) {
+Next Outlier(Step step) {
   const std::vector<const double*>& from = step.detail->numbers;
   const double method = *from[1];
   return Give(step,
               HandleOutlier(*from[0], NumericValue(method).GetInt(), *from[2], *from[3], *from[4], *from[5]));
 }
 
-std::size_t ChangeText(Step step) {
+Next ChangeText(Step step) {
   std::int32_t length = 0;
   ApplyDetail& detail = *step.detail;
   ApplyTextFunction(TextOf(step), step.function, detail.text, length);
   detail.text_out->SetString(detail.text);
   detail.text_out->SetLength(length);
-  return kNext;
+  return &step + 1;
 }
 
-std::size_t Substring(Step step) {
+Next Substring(Step step) {
   std::int32_t length = 0;
   ApplyDetail& detail = *step.detail;
   ApplySubstring(TextOf(step), *step.x, detail.text, length);
   detail.text_out->SetString(detail.text);
   detail.text_out->SetLength(length);
-  return kNext;
+  return &step + 1;
 }
 
-std::size_t Concat(Step step) {
+Next Concat(Step step) {
   std::int32_t length = 0;
   ApplyDetail& detail = *step.detail;
   detail.text.clear();
@@ -94,21 +92,21 @@ std::size_t Concat(Step step) {
     AppendText(**text, detail.text, length);
   detail.text_out->SetString(detail.text);
   detail.text_out->SetLength(length);
-  return kNext;
+  return &step + 1;
 }
 
-std::size_t CompareNumbers(Step step) {
+Next CompareNumbers(Step step) {
   return GiveTest(step, NumericValue::IsEqual(*step.x, *step.y), kNotEqualFunction);
 }
 
-std::size_t CompareTexts(Step step) {
+Next CompareTexts(Step step) {
   const bool are_equal =
       WithoutTrailingBlanks(TextOf(step).GetText()) == WithoutTrailingBlanks(TextOf(step, 1).GetText());
   return GiveTest(step, are_equal, kNotEqualFunction);
 }
 
 // What equals a number lies next to where it would stand itself.
-std::size_t FindNumber(Step step) {
+Next FindNumber(Step step) {
   const std::vector<double>& listed = step.detail->listed_numbers;
   const double x = *step.x;
   const auto above = std::lower_bound(listed.begin(), listed.end(), x);
@@ -117,30 +115,30 @@ std::size_t FindNumber(Step step) {
   return GiveTest(step, is_listed, kIsNotInFunction);
 }
 
-std::size_t FindText(Step step) {
+Next FindText(Step step) {
   const std::vector<std::string>& listed = step.detail->listed_texts;
   const std::string_view text = WithoutTrailingBlanks(TextOf(step).GetText());
   const auto found = std::lower_bound(listed.begin(), listed.end(), text);
   return GiveTest(step, found != listed.end() && *found == text, kIsNotInFunction);
 }
 
-std::size_t TestMissing(Step step) {
+Next TestMissing(Step step) {
   return GiveTest(step, step.detail->source->IsMissing(), kIsNotMissingFunction);
 }
 
-std::size_t TestSysmis(Step step) {
+Next TestSysmis(Step step) {
   return GiveTest(step, IsMissingNumber(*step.x), kIsNotMissingFunction);
 }
 
-std::size_t Length(Step step) {
+Next Length(Step step) {
   return Give(step, LengthOf(TextOf(step)));
 }
 
-std::size_t ReadText(Step step) {
+Next ReadText(Step step) {
   return Give(step, NumberIn(TextOf(step).GetText()));
 }
 
-std::size_t ImputeNumber(Step step) {
+Next ImputeNumber(Step step) {
   const ApplyDetail& detail = *step.detail;
   if (!detail.source->IsMissing()) return Give(step, *step.x);
   if (IsMissingNumber(*step.y)) return Give(step, NumericValue::gSysmisValue);
@@ -149,7 +147,7 @@ std::size_t ImputeNumber(Step step) {
   return Give(step, detail.category_numbers[nearest]);
 }
 
-std::size_t ImputeText(Step step) {
+Next ImputeText(Step step) {
   const ApplyDetail& detail = *step.detail;
   static const StringValue kEmpty;
   // The empty text is what a record's missing text holds, whatever the field's rules say.
@@ -161,37 +159,37 @@ std::size_t ImputeText(Step step) {
     *detail.place_out = &detail.category_texts[NearestMean(*step.y, detail.values.data(),
                                                            detail.variances.data(), detail.values.size())];
   }
-  return kNext;
+  return &step + 1;
 }
 
-std::size_t ReplaceSysmis(Step step) {
+Next ReplaceSysmis(Step step) {
   return Give(step, IsMissingNumber(*step.x) ? *step.y : *step.x);
 }
 
-std::size_t ReplaceMissingNumber(Step step) {
+Next ReplaceMissingNumber(Step step) {
   return Give(step, step.detail->source->IsMissing() ? *step.y : *step.x);
 }
 
-std::size_t ReplaceMissingText(Step step) {
+Next ReplaceMissingText(Step step) {
   *step.detail->place_out = &TextOf(step, step.detail->source->IsMissing() ? 1 : 0);
-  return kNext;
+  return &step + 1;
 }
 
-std::size_t Copy(Step step) {
+Next Copy(Step step) {
   return Give(step, *step.x);
 }
 
-std::size_t CopyText(Step step) {
+Next CopyText(Step step) {
   *step.detail->place_out = &TextOf(step);
-  return kNext;
+  return &step + 1;
 }
 
-std::size_t SkipUnlessOne(Step step) {
-  return IsTrueCondition(*step.x) ? kNext : step.skip;
+Next SkipUnlessOne(Step step) {
+  return IsTrueCondition(*step.x) ? &step + 1 : &step + 1 + step.skip;
 }
 
-std::size_t Skip(Step step) {
-  return step.skip;
+Next Skip(Step step) {
+  return &step + 1 + step.skip;
 }
 
 }  // namespace ApplySteps

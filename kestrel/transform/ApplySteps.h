@@ -37,46 +37,47 @@ struct ApplyDetail {
 namespace ApplySteps {
 
 using Step = const ApplyInstruction&;
+using Next = const ApplyInstruction*;
 
 // Numbers to a number.
-std::size_t Add(Step step);
-std::size_t Subtract(Step step);
-std::size_t Multiply(Step step);
-std::size_t Divide(Step step);
-std::size_t Scalar(Step step);
-std::size_t List(Step step);
-std::size_t DateTime(Step step);  ///< x: the seconds; y: what is subtracted
-std::size_t Outlier(Step step);
+Next Add(Step step);
+Next Subtract(Step step);
+Next Multiply(Step step);
+Next Divide(Step step);
+Next Scalar(Step step);
+Next List(Step step);
+Next DateTime(Step step);  ///< x: the seconds; y: what is subtracted
+Next Outlier(Step step);
 
 // Texts to a text, into text_out.
-std::size_t ChangeText(Step step);
-std::size_t Substring(Step step);  ///< x: the start
-std::size_t Concat(Step step);
+Next ChangeText(Step step);
+Next Substring(Step step);  ///< x: the start
+Next Concat(Step step);
 
 // Tests, 1 or 0. `function` tells a test from its opposite.
-std::size_t CompareNumbers(Step step);
-std::size_t CompareTexts(Step step);
-std::size_t FindNumber(Step step);
-std::size_t FindText(Step step);
-std::size_t TestMissing(Step step);  ///< of the source
-std::size_t TestSysmis(Step step);
+Next CompareNumbers(Step step);
+Next CompareTexts(Step step);
+Next FindNumber(Step step);
+Next FindText(Step step);
+Next TestMissing(Step step);  ///< of the source
+Next TestSysmis(Step step);
 
 // Others.
-std::size_t Length(Step step);
-std::size_t ReadText(Step step);  ///< the number that a text reads as
-std::size_t ImputeNumber(Step step);
-std::size_t ImputeText(Step step);
+Next Length(Step step);
+Next ReadText(Step step);  ///< the number that a text reads as
+Next ImputeNumber(Step step);
+Next ImputeText(Step step);
 
 // Replacing what is missing: x (the first text) is the value, y (the second) the replacement.
-std::size_t ReplaceSysmis(Step step);
-std::size_t ReplaceMissingNumber(Step step);  ///< of the source
-std::size_t ReplaceMissingText(Step step);
+Next ReplaceSysmis(Step step);
+Next ReplaceMissingNumber(Step step);  ///< of the source
+Next ReplaceMissingText(Step step);
 
 // Choosing.
-std::size_t Copy(Step step);
-std::size_t CopyText(Step step);
-std::size_t SkipUnlessOne(Step step);
-std::size_t Skip(Step step);
+Next Copy(Step step);
+Next CopyText(Step step);
+Next SkipUnlessOne(Step step);
+Next Skip(Step step);
 
 }  // namespace ApplySteps
 }  // namespace MCKestrel_800

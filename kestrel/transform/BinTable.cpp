@@ -12,7 +12,6 @@ namespace MCKestrel_800 {
 namespace {
 
 constexpr std::size_t kWalked = 2;
-constexpr std::size_t kCounted = 24;
 
 // An end of a range as a number; an absent one is an infinity. False when it is another value.
 bool ReadEnd(const ScoreValue* end, double infinity, double& number) {
@@ -55,6 +54,23 @@ BinTable::BinTable(const std::vector<TransformVar::Bin>& bins) : bins_(bins) {
   }
   reaches_ = std::move(reaches);
   highs_ = std::move(highs);
+  MakeCores();
+}
+
+void BinTable::MakeCores() {
+  for (std::size_t i = 0; i < reaches_.size(); ++i) {
+    const Reach& reach = reaches_[i];
+    double low, high;
+    ReadEnd(reach.range->GetMin(), reach.low, low);
+    ReadEnd(reach.range->GetMax(), reach.high, high);
+    // A bin of a single value has no inside: its ends' tolerances meet.
+    Core core = {low + Tolerance(low), high - Tolerance(high), reach.bin};
+    // No bin holds the system-missing value, which is the lowest of the numbers.
+    core.low = std::max(core.low, NumericValue::gSysmisValue);
+    if (i > 0) core.low = std::max(core.low, reaches_[i - 1].high);
+    if (i + 1 < reaches_.size()) core.high = std::min(core.high, reaches_[i + 1].low);
+    cores_.push_back(core);
+  }
 }
 
 std::size_t BinTable::Walk(double number) const {
@@ -65,16 +81,9 @@ std::size_t BinTable::Walk(double number) const {
   return kNone;
 }
 
-std::size_t BinTable::Find(double number) const {
+// at  the first bin that may reach as far as the number.
+std::size_t BinTable::FindOther(double number, std::size_t at) const {
   if (reaches_.empty()) return Walk(number);
-  const double* const highs = highs_.data();
-  std::size_t at = 0;
-  if (highs_.size() <= kCounted) {
-    for (std::size_t i = 0; i < highs_.size(); ++i)
-      at += highs[i] < number;
-  } else {
-    at = static_cast<std::size_t>(std::lower_bound(highs_.begin(), highs_.end(), number) - highs_.begin());
-  }
   std::size_t first = kNone;
   for (; at < reaches_.size() && reaches_[at].low <= number; ++at) {
     if (reaches_[at].bin < first && reaches_[at].range->Range::IsInRange(number)) first = reaches_[at].bin;

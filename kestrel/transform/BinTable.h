@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <vector>
 
+#include "kestrel/transform/FirstNotBelow.h"
 #include "kestrel/transform/TransformVar.h"
 
 namespace MCKestrel_800 {
@@ -23,9 +24,21 @@ class BinTable {
   explicit BinTable(const std::vector<TransformVar::Bin>& bins);
 
   /// The first bin that holds the number; kNone when there is none.
-  std::size_t Find(double number) const;
+  std::size_t Find(double number) const {
+    const std::size_t at = FirstNotBelow(highs_.data(), highs_.size(), number);
+    if (at >= cores_.size()) return FindOther(number, at);
+    const Core& core = cores_[at];
+    return core.low < number && number < core.high ? core.bin : FindOther(number, at);
+  }
 
  private:
+  /// Between which numbers a bin alone may hold one: neither an end's tolerance nor a neighbour's reaches
+  /// there.
+  struct Core {
+    double low;
+    double high;
+    std::size_t bin;
+  };
   /// A bin with the numbers between which it may hold one, tolerances included.
   struct Reach {
     double low;
@@ -34,11 +47,14 @@ class BinTable {
     std::size_t bin;
   };
 
+  void MakeCores();
+  std::size_t FindOther(double number, std::size_t at) const;
   std::size_t Walk(double number) const;
 
   const std::vector<TransformVar::Bin>& bins_;
   std::vector<Reach> reaches_;  ///< ascending at both ends; empty when the bins are no such list
   std::vector<double> highs_;   ///< of the reaches
+  std::vector<Core> cores_;     ///< of the reaches
 };
 
 }  // namespace MCKestrel_800

@@ -1,6 +1,8 @@
 #include "kestrel/transform/DerivationPlan.h"
 
 #include <algorithm>
+#include <atomic>
+#include <utility>
 
 #include "kestrel/dictionary/ScoreCaseRecord.h"
 #include "kestrel/dictionary/ScoreDictionary.h"
@@ -13,6 +15,14 @@
 
 namespace MCKestrel_800 {
 namespace {
+
+// Of any field in the process; a number that is never given twice.
+std::atomic<unsigned long long> last_change{0};
+
+// A table by codes is made unless the source's texts are so many more than the field's rows.
+constexpr std::size_t kCodesPerRow = 8;
+
+constexpr std::uint32_t kNoRow = static_cast<std::uint32_t>(-1);
 
 unsigned long long StampOf(const ScoreDictionary* dictionary) {
   return dictionary == nullptr ? 0 : dictionary->GetLayoutStamp();
@@ -31,7 +41,8 @@ DerivationPlan::DerivationPlan(const std::vector<const TransformVar*>& fields,
     : dictionary_(dictionary),
       transformations_(transformations),
       dictionary_stamp_(StampOf(dictionary)),
-      transformations_stamp_(StampOf(transformations)) {
+      transformations_stamp_(StampOf(transformations)),
+      noted_change_(last_change.load(std::memory_order_relaxed)) {
   for (const TransformVar* field : fields)
     AddStep(*field);
   // Reading a field may add the fields that it reads behind those that are there.
@@ -43,10 +54,17 @@ DerivationPlan::DerivationPlan(const std::vector<const TransformVar*>& fields,
 
 DerivationPlan::~DerivationPlan() = default;
 
+void DerivationPlan::NoteChange(unsigned long long stamp) {
+  last_change.store(stamp, std::memory_order_relaxed);
+}
+
 bool DerivationPlan::IsFor(const ScoreDictionary* dictionary,
-                           const TransformationDictionary* transformations) const {
+                           const TransformationDictionary* transformations) {
   if (!IsSame(dictionary, dictionary_, dictionary_stamp_)) return false;
   if (!IsSame(transformations, transformations_, transformations_stamp_)) return false;
+  const unsigned long long change = last_change.load(std::memory_order_relaxed);
+  if (change == noted_change_) return true;
+  noted_change_ = change;
   return std::all_of(steps_.begin(), steps_.end(),
                      [](const Step& step) { return step.field->definition_stamp_ == step.definition_stamp; });
 }
@@ -83,7 +101,7 @@ void DerivationPlan::AddReads(int number) {
     if (field.GetRoot() != nullptr) reads = AddTreeReads(*field.GetRoot());
   } else if (!field.GetFieldName().empty()) {
     reads.push_back(AddSource(field.GetFieldName(), nullptr));
-    steps_[number].source = reads.front();
+    steps_[number].source = sources_[reads.front()].field.get();
   }
   steps_[number].reads = std::move(reads);
 }
@@ -137,74 +155,123 @@ void DerivationPlan::Prepare() {
   const auto find = [this](const std::string& name) -> const SourceField& {
     return *sources_[source_numbers_.at(name)].field;
   };
+  GiveCodes();
   for (Step& step : steps_) {
     step.evaluation = &step.field->Evaluation();
-    if (step.is_circular || step.field->GetTransExpression() != TransExpression::kApply) continue;
-    if (step.field->GetRoot() == nullptr) continue;
-    step.program = std::make_unique<ApplyProgram>(
-        *step.field->GetRoot(), step.evaluation->GetStorage() == FieldEvaluation::Storage::kText, find);
+    if (step.source == nullptr) step.source = &nothing_;
+    PrepareStep(step, find);
   }
 }
 
-void DerivationPlan::Choose(const std::vector<const TransformVar*>& fields) {
-  chosen_ = Work();
-  AddNeeds(fields, chosen_);
+// The commonest expressions are called without asking again what they are.
+void DerivationPlan::PrepareStep(Step& step, const ApplyProgram::FindSource& find) {
+  const FieldEvaluation::Storage storage = step.evaluation->GetStorage();
+  const TransExpression kind = step.field->GetTransExpression();
+  step.run = RunOther;
+  if (step.is_circular) {
+    step.run = RunCircular;
+  } else if (kind == TransExpression::kNormContinuous && storage == FieldEvaluation::Storage::kNumber) {
+    step.run = RunNorm;
+  } else if (kind == TransExpression::kDiscretize) {
+    step.run = RunBin;
+  } else if (kind == TransExpression::kMapValues || kind == TransExpression::kNormDiscrete) {
+    UseCodes(step);
+  } else if (kind == TransExpression::kApply && step.field->GetRoot() != nullptr) {
+    const bool is_text = storage == FieldEvaluation::Storage::kText;
+    step.program = std::make_unique<ApplyProgram>(*step.field->GetRoot(), is_text, find);
+    step.run = is_text ? RunTextTree : RunNumberTree;
+  }
+}
+
+// Fields that list texts of one source share one look-up of its text.
+void DerivationPlan::GiveCodes() {
+  for (const Step& step : steps_) {
+    if (step.field->GetAllEncodedValues().empty() || step.reads.size() != 1) continue;
+    std::unique_ptr<TextCodes>& codes = sources_[step.reads.front()].codes;
+    if (codes == nullptr) codes = std::make_unique<TextCodes>(false);
+    for (const StringValue* text : step.field->Evaluation().GetEncodings().GetTexts())
+      codes->Add(text->GetText(), static_cast<int>(codes->GetSize()));
+  }
+  for (Source& source : sources_)
+    source.field->SetCodes(source.codes.get());
+}
+
+void DerivationPlan::UseCodes(Step& step) {
+  if (step.reads.size() != 1) return;
+  const TextCodes& codes = *sources_[step.reads.front()].codes;
+  const EncodingTable& encodings = step.evaluation->GetEncodings();
+  const std::vector<const StringValue*> texts = encodings.GetTexts();
+  if (texts.empty() || !encodings.ListsTexts() || codes.GetSize() > kCodesPerRow * texts.size()) return;
+  step.row_of_code.assign(codes.GetSize(), kNoRow);
+  for (const StringValue* text : texts) {
+    std::uint32_t& row = step.row_of_code[static_cast<std::size_t>(codes.Find(text->GetText()))];
+    if (row == kNoRow) row = static_cast<std::uint32_t>(encodings.FindText(*text));
+  }
+  step.run = RunTextEncoding;
+}
+
+void DerivationPlan::Choose(const std::vector<Output>& outputs) {
+  chosen_ = WorkFor(outputs);
+}
+
+void DerivationPlan::ComputeOnly(const TransformVar& field, const ScoreCaseRecord* record) {
+  Run(WorkFor({{&field, nullptr}}), record);
 }
 
 // Every step stands behind those that it needs, so one walk from the end finds them all.
-void DerivationPlan::AddNeeds(const std::vector<const TransformVar*>& fields, Work& work) const {
+DerivationPlan::Work DerivationPlan::WorkFor(const std::vector<Output>& outputs) {
   std::vector<bool> is_needed(steps_.size(), false);
   std::vector<bool> is_read(sources_.size(), false);
-  for (const TransformVar* field : fields) {
-    const auto found = step_numbers_.find(field);
-    if (found != step_numbers_.end()) is_needed[found->second] = true;
+  std::unordered_map<const TransformVar*, ScoreValue*> places;
+  for (const Output& output : outputs) {
+    const auto found = step_numbers_.find(output.field);
+    if (found == step_numbers_.end()) continue;
+    is_needed[static_cast<std::size_t>(found->second)] = true;
+    places.emplace(output.field, output.to);
   }
-  for (std::size_t step = steps_.size(); step-- > 0;) {
-    if (!is_needed[step]) continue;
-    work.steps.push_back(static_cast<int>(step));
-    if (steps_[step].is_circular) continue;
-    for (const int source : steps_[step].reads) {
+  Work work;
+  for (std::size_t number = steps_.size(); number-- > 0;) {
+    if (!is_needed[number]) continue;
+    const Step& step = steps_[number];
+    const auto place = places.find(step.field);
+    ScoreValue* to = place == places.end() ? nullptr : place->second;
+    if (to == nullptr) to = &step.evaluation->GetOwnResult();
+    work.items.push_back({&step, step.as_source == kNone ? nullptr : &sources_[step.as_source], to});
+    if (step.is_circular) continue;
+    for (const int source : step.reads) {
       is_read[source] = true;
       if (sources_[source].step != kNone) is_needed[sources_[source].step] = true;
     }
   }
-  std::reverse(work.steps.begin(), work.steps.end());
+  std::reverse(work.items.begin(), work.items.end());
   for (std::size_t source = 0; source < sources_.size(); ++source) {
-    if (is_read[source]) work.sources.push_back(static_cast<int>(source));
+    if (is_read[source]) work.sources.push_back(&sources_[source]);
   }
-}
-
-void DerivationPlan::Compute(const ScoreCaseRecord* record) {
-  Run(chosen_, record);
-}
-
-void DerivationPlan::ComputeOnly(const TransformVar& field, const ScoreCaseRecord* record) {
-  Work work;
-  AddNeeds({&field}, work);
-  Run(work, record);
+  return work;
 }
 
 void DerivationPlan::Run(const Work& work, const ScoreCaseRecord* record) {
   if (record != nullptr) {
     TakeCase(work, *record);
   } else {
-    for (const int source : work.sources) {
-      sources_[source].field->Set(nullptr);
-      sources_[source].is_in_case = false;
+    for (Source* source : work.sources) {
+      source->field->Set(nullptr);
+      source->is_in_case = false;
     }
   }
-  for (const int step : work.steps)
-    RunStep(steps_[step]);
+  for (const Work::Item& item : work.items) {
+    item.step->run(*item.step, *item.to);
+    if (item.as_source != nullptr && !item.as_source->is_in_case) item.as_source->field->Set(item.to);
+  }
 }
 
 void DerivationPlan::TakeCase(const Work& work, const ScoreCaseRecord& record) {
   const unsigned long long stamp = record.GetLayoutStamp();
   if (stamp == 0) {
-    for (const int number : work.sources) {
-      Source& source = sources_[number];
-      const ScoreValue* const value = record.Get(source.name);
-      source.is_in_case = value != nullptr;
-      source.field->Set(value);
+    for (Source* source : work.sources) {
+      const ScoreValue* const value = record.Get(source->name);
+      source->is_in_case = value != nullptr;
+      source->field->Set(value);
     }
     record_stamp_ = 0;
     return;
@@ -212,11 +279,10 @@ void DerivationPlan::TakeCase(const Work& work, const ScoreCaseRecord& record) {
   const std::vector<ScoreValue*>& values = record.GetAllValues();
   if (stamp != record_stamp_ || values.size() < positions_end_) LookUpPositions(record);
   const ScoreValue* const* const value_of = values.data();
-  for (const int number : work.sources) {
-    Source& source = sources_[number];
-    const ScoreValue* const value = source.position == kNone ? nullptr : value_of[source.position];
-    source.is_in_case = value != nullptr;
-    source.field->Set(value);
+  for (Source* source : work.sources) {
+    const ScoreValue* const value = source->position == kNone ? nullptr : value_of[source->position];
+    source->is_in_case = value != nullptr;
+    source->field->Set(value);
   }
 }
 
@@ -233,22 +299,41 @@ void DerivationPlan::LookUpPositions(const ScoreCaseRecord& record) {
   record_stamp_ = record.GetLayoutStamp();
 }
 
-void DerivationPlan::RunStep(Step& step) {
-  if (step.is_circular) {
-    step.evaluation->SetMissing();
-  } else if (step.program != nullptr) {
-    step.program->Run();
-    if (step.evaluation->GetStorage() == FieldEvaluation::Storage::kText) {
-      step.evaluation->TakeText(step.program->GetText());
-    } else {
-      step.evaluation->TakeNumber(step.program->GetNumber());
-    }
-  } else {
-    step.evaluation->Compute(step.source == kNone ? nothing_ : *sources_[step.source].field);
+void DerivationPlan::RunCircular(const Step& step, ScoreValue& to) {
+  step.evaluation->GiveMissing(to);
+}
+
+void DerivationPlan::RunNumberTree(const Step& step, ScoreValue& to) {
+  step.program->Run();
+  step.evaluation->GiveNumber(step.program->GetNumber(), to);
+}
+
+void DerivationPlan::RunTextTree(const Step& step, ScoreValue& to) {
+  step.program->Run();
+  step.evaluation->GiveText(step.program->GetText(), to);
+}
+
+void DerivationPlan::RunTextEncoding(const Step& step, ScoreValue& to) {
+  const SourceField& source = *step.source;
+  if (source.GetKind() != SourceField::Kind::kText) {
+    step.evaluation->Compute(source, to);
+    return;
   }
-  if (step.as_source == kNone) return;
-  Source& source = sources_[step.as_source];
-  if (!source.is_in_case) source.field->Set(&step.evaluation->GetResult());
+  const int code = source.GetTextCode();
+  const std::uint32_t row = code == TextCodes::kUnknown ? kNoRow : step.row_of_code[code];
+  step.evaluation->GiveRow(row == kNoRow ? EncodingTable::kNone : row, source, to);
+}
+
+void DerivationPlan::RunNorm(const Step& step, ScoreValue& to) {
+  step.evaluation->ComputeNorm(*step.source, to);
+}
+
+void DerivationPlan::RunBin(const Step& step, ScoreValue& to) {
+  step.evaluation->ComputeBin(*step.source, to);
+}
+
+void DerivationPlan::RunOther(const Step& step, ScoreValue& to) {
+  step.evaluation->Compute(*step.source, to);
 }
 
 }  // namespace MCKestrel_800

@@ -4,16 +4,17 @@
 #define KESTREL_TRANSFORM_DERIVATIONPLAN_H
 
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <unordered_map>
 #include <vector>
 
+#include "kestrel/transform/ApplyProgram.h"
 #include "kestrel/transform/SourceField.h"
 
 namespace MCKestrel_800 {
 
-class ApplyProgram;
 class FieldEvaluation;
 class FunctionTree;
 class ScoreCaseRecord;
@@ -38,14 +39,24 @@ class DerivationPlan {
   ~DerivationPlan();
 
   /// Whether the plan still stands for these dictionaries and the fields as they are.
-  bool IsFor(const ScoreDictionary* dictionary, const TransformationDictionary* transformations) const;
+  bool IsFor(const ScoreDictionary* dictionary, const TransformationDictionary* transformations);
+
+  /// A field that is computed for each case, and where its value goes: a value of the type that the field
+  /// computes.
+  struct Output {
+    const TransformVar* field;
+    ScoreValue* to;
+  };
 
   /// Chooses what Compute computes: these fields and what they depend on. At first nothing is chosen.
-  void Choose(const std::vector<const TransformVar*>& fields);
+  void Choose(const std::vector<Output>& outputs);
   /// Computes the chosen fields for a case; null is a case without values.
-  void Compute(const ScoreCaseRecord* record);
-  /// Computes one field and what it depends on.
+  void Compute(const ScoreCaseRecord* record) { Run(chosen_, record); }
+  /// Computes one field and what it depends on, each into its own result.
   void ComputeOnly(const TransformVar& field, const ScoreCaseRecord* record);
+
+  /// To be told of each change of a field's definition, with the field's new stamp.
+  static void NoteChange(unsigned long long stamp);
 
  private:
   static constexpr int kNone = -1;
@@ -53,19 +64,36 @@ class DerivationPlan {
   struct Source {
     std::string name;
     std::unique_ptr<SourceField> field;
-    int step = kNone;         ///< the derived field of that name
-    int position = kNone;     ///< in the record
-    bool is_in_case = false;  ///< whether the case has a value of that name
+    std::unique_ptr<TextCodes> codes;  ///< of the texts that fields list which read it
+    int step = kNone;                  ///< the derived field of that name
+    int position = kNone;              ///< in the record
+    bool is_in_case = false;           ///< whether the case has a value of that name
   };
+  struct Step;
+  using RunStep = void (*)(const Step& step, ScoreValue& to);
+
   struct Step {
-    const TransformVar* field;
-    FieldEvaluation* evaluation;
-    unsigned long long definition_stamp;
+    const TransformVar* field = nullptr;
+    FieldEvaluation* evaluation = nullptr;
+    unsigned long long definition_stamp = 0;
     bool is_circular = false;
-    int source = kNone;     ///< what it reads, unless it is a function tree
-    int as_source = kNone;  ///< itself as what others read
+    RunStep run = nullptr;
+    const SourceField* source = nullptr;  ///< what it reads, unless it is a function tree
+    int as_source = kNone;                ///< itself as what others read
     std::unique_ptr<ApplyProgram> program;
-    std::vector<int> reads;  ///< all sources
+    std::vector<std::uint32_t> row_of_code;  ///< by the code of the source's text
+    std::vector<int> reads;                  ///< all sources
+  };
+
+  /// Steps to run, in order, with the sources that they read.
+  struct Work {
+    struct Item {
+      const Step* step;
+      Source* as_source;
+      ScoreValue* to;
+    };
+    std::vector<Item> items;
+    std::vector<Source*> sources;
   };
 
   int AddStep(const TransformVar& field);
@@ -74,16 +102,21 @@ class DerivationPlan {
   std::vector<int> AddTreeReads(const FunctionTree& root);
   void Order();
   void Prepare();
-  /// Steps to run, in order, with the sources that they read.
-  struct Work {
-    std::vector<int> steps;
-    std::vector<int> sources;
-  };
-  void AddNeeds(const std::vector<const TransformVar*>& fields, Work& work) const;
+  void PrepareStep(Step& step, const ApplyProgram::FindSource& find);
+  void GiveCodes();
+  void UseCodes(Step& step);
+  Work WorkFor(const std::vector<Output>& outputs);
   void Run(const Work& work, const ScoreCaseRecord* record);
   void TakeCase(const Work& work, const ScoreCaseRecord& record);
   void LookUpPositions(const ScoreCaseRecord& record);
-  void RunStep(Step& step);
+
+  static void RunCircular(const Step& step, ScoreValue& to);
+  static void RunNumberTree(const Step& step, ScoreValue& to);
+  static void RunTextTree(const Step& step, ScoreValue& to);
+  static void RunTextEncoding(const Step& step, ScoreValue& to);
+  static void RunNorm(const Step& step, ScoreValue& to);
+  static void RunBin(const Step& step, ScoreValue& to);
+  static void RunOther(const Step& step, ScoreValue& to);
 
   const ScoreDictionary* dictionary_;
   const TransformationDictionary* transformations_;
@@ -95,6 +128,7 @@ class DerivationPlan {
   SourceField nothing_{nullptr};  ///< what a field reads that names none
   std::unordered_map<std::string, int> source_numbers_;
   std::unordered_map<const TransformVar*, int> step_numbers_;
+  unsigned long long noted_change_;
   unsigned long long record_stamp_ = 0;
   std::size_t positions_end_ = 0;
 };

@@ -30,6 +30,7 @@ EncodingTable::EncodingTable(const std::vector<TransformVar::Encoding>& rows) {
       if (key.kind == ValueKey::kNumber || key.kind == ValueKey::kDateTime) row.number = value->GetDouble();
     }
     if (row.kind == ValueKey::kForeign) {
+      lists_texts_ = false;
       index_.AppendForeign();
     } else if (row.kind == ValueKey::kNever) {
       index_.AppendUnfiled();
@@ -38,6 +39,20 @@ EncodingTable::EncodingTable(const std::vector<TransformVar::Encoding>& rows) {
     }
     rows_.push_back(row);
   }
+}
+
+std::vector<const StringValue*> EncodingTable::GetTexts() const {
+  std::vector<const StringValue*> texts;
+  for (const Row& row : rows_) {
+    if (row.kind == ValueKey::kText) texts.push_back(row.text);
+  }
+  return texts;
+}
+
+std::size_t EncodingTable::FindText(const StringValue& text) const {
+  SourceField source(nullptr);
+  source.Set(&text);
+  return Find(source);
 }
 
 template <class Matches>

@@ -24,6 +24,12 @@ class EncodingTable {
   /// The first row that matches the value at hand, which must be there; kNone when there is none.
   std::size_t Find(const SourceField& source) const;
 
+  /// Whether the rows alone decide about texts: none asks a matcher of another class.
+  bool ListsTexts() const { return lists_texts_; }
+  /// The texts of the rows that list one, and the first row that matches a text; kNone when there is none.
+  std::vector<const StringValue*> GetTexts() const;
+  std::size_t FindText(const StringValue& text) const;
+
  private:
   struct Row {
     ValueKey::Kind kind;
@@ -35,6 +41,7 @@ class EncodingTable {
   template <class Matches>
   std::size_t FindWith(const SourceField& source, const Matches& matches) const;
 
+  bool lists_texts_ = true;
   std::vector<Row> rows_;
   ValueIndex index_;
 };

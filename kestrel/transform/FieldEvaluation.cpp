@@ -2,6 +2,8 @@
 
 #include <cmath>
 #include <string>
+#include <typeinfo>
+#include <utility>
 
 #include "kestrel/foundation/Locale.h"
 #include "kestrel/predicates/ScoreValueRange.h"
@@ -47,6 +49,7 @@ FieldEvaluation::Replacement::Replacement(const ScoreValue* value) : is_set(valu
 FieldEvaluation::FieldEvaluation(const TransformVar& field)
     : field_(field),
       storage_(StorageOf(field)),
+      compute_(&FieldEvaluation::ComputeNothing),
       result_(&number_),
       missing_(field.GetRecodeMissValueRep()),
       default_(field.GetRecodeDefaultValue()),
@@ -56,107 +59,174 @@ FieldEvaluation::FieldEvaluation(const TransformVar& field)
       bins_(field.GetBins()),
       encodings_(field.GetAllEncodedValues()) {
   if (storage_ == Storage::kText) result_ = &text_;
-  if (storage_ == Storage::kDateTime) {
-    result_ = &date_;
-    if (field.GetDateTimeType() != kNoDateTime) {
-      date_.SetDateTimeType(DateTimeValue::GetValType(field.GetDateTimeType()));
-    }
-  }
-}
-
-void FieldEvaluation::SetMissing() {
-  TakeNumber(NumericValue::gSysmisValue);
-  if (IsText()) {
-    text_.SetString(std::string());
-    text_.SetLength(0);
-  }
-}
-
-void FieldEvaluation::TakeNumber(double number) {
-  if (!std::isfinite(number)) number = NumericValue::gSysmisValue;
-  if (storage_ == Storage::kNumber) {
-    number_.SetDoubleValue(number);
-  } else if (storage_ == Storage::kDateTime) {
-    date_.SetDateTimeValue(number, date_.GetDateTimeType());
-  }
-}
-
-void FieldEvaluation::TakeText(const StringValue& text) {
-  text_.SetString(text.GetText());
-  text_.SetLength(text.GetLength());
-  CutText();
-}
-
-void FieldEvaluation::Take(const ScoreValue* value) {
-  if (value == nullptr) return;
-  result_->SetValue(value);
-  if (!IsText()) return;
-  text_.SetLength(static_cast<int32_t>(text_.GetText().size()));
-  CutText();
-}
-
-void FieldEvaluation::CutText() {
-  const int width = field_.GetWidth();
-  const std::string& text = text_.GetText();
-  if (width < 0 || static_cast<std::size_t>(width) >= text.size()) return;
-  cut_.assign(text, 0, CutSize(text, static_cast<std::size_t>(width)));
-  text_.SetString(cut_);
-  text_.SetLength(width);
-}
-
-void FieldEvaluation::Compute(const SourceField& source) {
-  if (field_.GetTransExpression() == TransExpression::kConstant) {
-    ComputeConstant();
-    return;
-  }
-  SetMissing();
-  switch (field_.GetTransExpression()) {
+  if (storage_ == Storage::kDateTime) result_ = &date_;
+  if (field.GetDateTimeType() != kNoDateTime) date_kind_ = DateTimeValue::GetValType(field.GetDateTimeType());
+  date_.SetDateTimeType(date_kind_);
+  switch (field.GetTransExpression()) {
+    case TransExpression::kConstant:
+      compute_ = &FieldEvaluation::ComputeConstant;
+      ReadConstant();
+      break;
     case TransExpression::kFieldRef:
-      ComputeFieldRef(source);
+      compute_ = &FieldEvaluation::ComputeFieldRef;
       break;
     case TransExpression::kNormContinuous:
-      ComputeNorm(source);
+      if (storage_ == Storage::kNumber) compute_ = &FieldEvaluation::ComputeNorm;
       break;
     case TransExpression::kNormDiscrete:
     case TransExpression::kMapValues:
-      Take(Encode(source));
+      compute_ = &FieldEvaluation::ComputeEncoding;
+      for (const TransformVar::Encoding& row : field.GetAllEncodedValues())
+        PrepareRow(row.value.get(), false);
       break;
     case TransExpression::kDiscretize:
-      Take(Bin(source));
+      compute_ = &FieldEvaluation::ComputeBin;
+      for (const TransformVar::Bin& bin : field.GetBins())
+        PrepareRow(bin.value.get(), bin.value == nullptr);
       break;
     default:
       break;
   }
+  gives_numbers_ = storage_ == Storage::kNumber && row_copies_.empty();
 }
 
-// Once, and kept for every later case.
-void FieldEvaluation::ComputeConstant() {
-  if (is_constant_done_) return;
-  is_constant_done_ = true;
+// A constant is the first row of its field.
+void FieldEvaluation::ReadConstant() {
   const std::string& text = field_.GetConstString();
   if (storage_ == Storage::kNumber) {
-    TakeNumber(NumericValue(text).GetDouble());
+    const NumericValue number(text);
+    PrepareRow(&number, false);
   } else if (storage_ == Storage::kDateTime) {
-    date_.FromString(text, field_.GetDateTimeType());
+    const DateTimeValue date(text, field_.GetDateTimeType());
+    PrepareRow(&date, false);
   } else {
-    TakeText(StringValue(text));
+    const StringValue value(text);
+    PrepareRow(&value, false);
   }
 }
 
-void FieldEvaluation::ComputeFieldRef(const SourceField& source) {
-  if (!source.HasValue()) return;
-  const bool is_replaced = source.IsMissing() && missing_.is_set;
-  Take(is_replaced ? field_.GetRecodeMissValueRep() : source.GetValue());
+// What the value makes of a result that takes it.
+void FieldEvaluation::PrepareRow(const ScoreValue* value, bool copies_input) {
+  if (copies_input || !row_copies_.empty()) {
+    row_copies_.resize(row_numbers_.size() + row_texts_.size(), false);
+    row_copies_.push_back(copies_input);
+  }
+  if (IsText()) {
+    StringValue result;
+    if (value != nullptr) Take(value, result);
+    row_texts_.push_back(std::move(result));
+    return;
+  }
+  const ScoreValue::ValueType type =
+      storage_ == Storage::kNumber ? ScoreValue::kNumeric : ScoreValue::kDateTime;
+  const bool fits = value != nullptr && value->GetType() == type && std::isfinite(value->GetDouble());
+  row_numbers_.push_back(fits ? value->GetDouble() : NumericValue::gSysmisValue);
 }
 
-void FieldEvaluation::ComputeNorm(const SourceField& source) {
-  if (storage_ != Storage::kNumber || !source.HasValue()) return;
-  if (source.IsMissing()) {
-    TakeNumber(missing_.number);
-  } else if (source.GetKind() == SourceField::Kind::kNumber) {
-    TakeNumber(curve_.Compute(source.GetNumber()));
+void FieldEvaluation::GiveMissing(ScoreValue& to) {
+  if (IsText()) {
+    GiveString(std::string(), to);
   } else {
-    TakeNumber(curve_.Compute(source.GetValue()->GetDouble()));
+    GiveNumber(NumericValue::gSysmisValue, to);
+  }
+}
+
+void FieldEvaluation::GiveSeconds(double seconds, ScoreValue& to) const {
+  static_cast<DateTimeValue&>(to).SetDateTimeValue(NumberOrMissing(seconds), date_kind_);
+}
+
+void FieldEvaluation::GiveText(const StringValue& text, ScoreValue& to) {
+  GiveString(text.GetText(), to);
+  StringValue& result = static_cast<StringValue&>(to);
+  // A text that was cut has the width as its length, any other that of its own.
+  if (result.GetText().size() == text.GetText().size()) result.SetLength(text.GetLength());
+}
+
+void FieldEvaluation::GiveString(const std::string& text, ScoreValue& to) {
+  StringValue& result = static_cast<StringValue&>(to);
+  const int width = field_.GetWidth();
+  if (width < 0 || static_cast<std::size_t>(width) >= text.size()) {
+    result.SetString(text);
+    result.SetLength(static_cast<int32_t>(text.size()));
+    return;
+  }
+  cut_.assign(text, 0, CutSize(text, static_cast<std::size_t>(width)));
+  result.SetString(cut_);
+  result.SetLength(width);
+}
+
+void FieldEvaluation::GiveOtherRow(std::size_t row, const SourceField& source, ScoreValue& to) {
+  if (row == EncodingTable::kNone) {
+    Take(Recode(source, IsText()), to);
+  } else if (!row_copies_.empty() && row_copies_[row]) {
+    Take(source.GetValue(), to);
+  } else if (storage_ == Storage::kNumber) {
+    static_cast<NumericValue&>(to).SetDoubleValue(row_numbers_[row]);
+  } else if (storage_ == Storage::kText) {
+    static_cast<StringValue&>(to).SetString(row_texts_[row].GetText());
+    static_cast<StringValue&>(to).SetLength(row_texts_[row].GetLength());
+  } else {
+    GiveNumber(row_numbers_[row], to);
+  }
+}
+
+// A value of another kind than the result leaves it missing.
+void FieldEvaluation::Take(const ScoreValue* value, ScoreValue& to) {
+  const ScoreValue::ValueType type = value->GetType();
+  if (type != to.GetType()) {
+    GiveMissing(to);
+  } else if (type != ScoreValue::kString) {
+    GiveNumber(value->GetDouble(), to);
+  } else if (typeid(*value) == typeid(StringValue)) {
+    GiveString(static_cast<const StringValue*>(value)->GetText(), to);
+  } else {
+    GiveString(value->GetString(), to);
+  }
+}
+
+void FieldEvaluation::ComputeNothing(const SourceField&, ScoreValue& to) {
+  GiveMissing(to);
+}
+
+void FieldEvaluation::ComputeConstant(const SourceField& source, ScoreValue& to) {
+  GiveRow(0, source, to);
+}
+
+void FieldEvaluation::ComputeFieldRef(const SourceField& source, ScoreValue& to) {
+  if (!source.HasValue()) {
+    GiveMissing(to);
+  } else {
+    Take(source.IsMissing() && missing_.is_set ? field_.GetRecodeMissValueRep() : source.GetValue(), to);
+  }
+}
+
+void FieldEvaluation::ComputeNorm(const SourceField& source, ScoreValue& to) {
+  double number;
+  if (source.IsNumber()) {
+    number = curve_.Compute(source.GetNumber());
+  } else if (source.IsMissing()) {
+    number = source.HasValue() ? missing_.number : NumericValue::gSysmisValue;
+  } else {
+    number = NumberOf(*source.GetValue());
+    if (!NumericValue::IsSystemMissingValue(number)) number = curve_.Compute(number);
+  }
+  static_cast<NumericValue&>(to).SetDoubleValue(NumberOrMissing(number));
+}
+
+void FieldEvaluation::ComputeEncoding(const SourceField& source, ScoreValue& to) {
+  if (source.HasValue()) {
+    GiveRow(encodings_.Find(source), source, to);
+  } else {
+    Take(RecodeAbsent(false), to);
+  }
+}
+
+void FieldEvaluation::ComputeBin(const SourceField& source, ScoreValue& to) {
+  const SourceField::Kind kind = source.GetKind();
+  if (kind == SourceField::Kind::kNumber || kind == SourceField::Kind::kDateTime) {
+    GiveRow(bins_.Find(source.GetNumber()), source, to);
+  } else {
+    Take(RecodeAbsent(true), to);
   }
 }
 
@@ -222,7 +292,7 @@ const ScoreValue* FieldEvaluation::RecodeNumber(const SourceField& source) {
 // As a value that a result of the field's type takes.
 const ScoreValue* FieldEvaluation::RecodedNumber(double number) {
   if (storage_ == Storage::kDateTime) {
-    recoded_date_.SetDateTimeValue(number, date_.GetDateTimeType());
+    recoded_date_.SetDateTimeValue(number, date_kind_);
     return &recoded_date_;
   }
   recoded_number_.SetDoubleValue(number);

@@ -7,6 +7,7 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
+#include <limits>
 #include <string>
 #include <vector>
 
@@ -24,21 +25,26 @@ inline bool IsMissingNumber(double x) {
   return NumericValue::IsSystemMissingValue(x);
 }
 inline double NumberOrMissing(double x) {
-  return std::isfinite(x) ? x : NumericValue::gSysmisValue;
+  return std::fabs(x) <= std::numeric_limits<double>::max() ? x : NumericValue::gSysmisValue;
+}
+
+// The missing value is the lowest number: when one of two is missing, the smaller one is. What else compares
+// that way is minus infinity or no number at all, and its results are missing, too.
+inline bool IsEitherMissing(double x, double y) {
+  return (x < y ? x : y) <= NumericValue::gSysmisValue;
 }
 
 inline double PlusNumbers(double x, double y) {
-  return IsMissingNumber(x) || IsMissingNumber(y) ? NumericValue::gSysmisValue : NumberOrMissing(x + y);
+  return IsEitherMissing(x, y) ? NumericValue::gSysmisValue : NumberOrMissing(x + y);
 }
 inline double MinusNumbers(double x, double y) {
-  return IsMissingNumber(x) || IsMissingNumber(y) ? NumericValue::gSysmisValue : NumberOrMissing(x - y);
+  return IsEitherMissing(x, y) ? NumericValue::gSysmisValue : NumberOrMissing(x - y);
 }
 inline double MultiplyNumbers(double x, double y) {
-  return IsMissingNumber(x) || IsMissingNumber(y) ? NumericValue::gSysmisValue : NumberOrMissing(x * y);
+  return IsEitherMissing(x, y) ? NumericValue::gSysmisValue : NumberOrMissing(x * y);
 }
 inline double DivideNumbers(double x, double y) {
-  return y == 0.0 || IsMissingNumber(x) || IsMissingNumber(y) ? NumericValue::gSysmisValue
-                                                              : NumberOrMissing(x / y);
+  return y == 0.0 || IsEitherMissing(x, y) ? NumericValue::gSysmisValue : NumberOrMissing(x / y);
 }
 
 /// The functions of the scalar family; y counts for those of two arguments. 0 for every other code.

@@ -4,13 +4,6 @@
 #include <cmath>
 
 namespace MCKestrel_800 {
-namespace {
-
-// Up to this many points, counting those below a number costs less than halving the list.
-constexpr std::size_t kCounted = 24;
-
-}  // namespace
-
 NormCurve::NormCurve(const std::vector<double>& orig, const std::vector<double>& norm,
                      const std::vector<double>& slopes, const std::vector<double>& intercepts,
                      ScoreDictVar::OutlierHandleMethod outliers)
@@ -29,9 +22,10 @@ NormCurve::NormCurve(const std::vector<double>& orig, const std::vector<double>&
   const auto [lowest, highest] = std::minmax_element(orig.begin(), orig.end());
   lowest_ = *lowest;
   highest_ = *highest;
+  is_plain_ = has_range_ && is_ascending_ && lines_.size() >= 2 && lines_.size() + 1 == orig.size();
 }
 
-double NormCurve::Compute(double x) const {
+double NormCurve::ComputeOther(double x) const {
   if (!IsOutOfContRange(x)) return CalculateNormValue(x);
   // Outliers treated as missing go on as those left as they are.
   return outliers_ == ScoreDictVar::kAsExtremeValues ? CalculateNormAsExtremeValues(x) : CalculateNormAsIs(x);
@@ -55,13 +49,7 @@ std::size_t NormCurve::FindSegment(double x) const {
     return i;
   }
   // In ascending points it ends at the first point, but the very first, that is not below x.
-  std::size_t i = 0;
-  if (segments <= kCounted) {
-    for (std::size_t point = 1; point < segments; ++point)
-      i += orig[point] < x;
-  } else {
-    i = static_cast<std::size_t>(std::lower_bound(orig + 1, orig + segments, x) - (orig + 1));
-  }
+  const std::size_t i = FirstNotBelow(orig + 1, segments - 1, x);
   return orig[i] <= x && x <= orig[i + 1] ? i : segments;
 }
 

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
+#include "kestrel/transform/FirstNotBelow.h"
 
 namespace MCKestrel_800 {
 
@@ -18,9 +19,13 @@ class NormCurve {
             const std::vector<double>& slopes, const std::vector<double>& intercepts,
             ScoreDictVar::OutlierHandleMethod outliers);
 
-  double Compute(double x) const;
+  double Compute(double x) const {
+    if (!is_plain_ || !(lowest_ <= x && x <= highest_)) return ComputeOther(x);
+    return lines_[FirstNotBelow(orig_.data() + 1, lines_.size() - 1, x)].At(x);
+  }
 
  private:
+  double ComputeOther(double x) const;
   bool IsOutOfContRange(double x) const { return has_range_ && (x > highest_ || x < lowest_); }
   double CalculateNormValue(double x) const;
   double CalculateNormAsIs(double x) const;
@@ -39,6 +44,8 @@ class NormCurve {
   std::vector<Line> lines_;
   bool has_range_;
   bool is_ascending_;
+  /// Whether the points ascend and each two of them have a line.
+  bool is_plain_ = false;
   double lowest_ = 0.0;
   double highest_ = 0.0;
   ScoreDictVar::OutlierHandleMethod outliers_;

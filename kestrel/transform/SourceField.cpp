@@ -50,6 +50,7 @@ SourceField::SourceField(const ScoreDictVar* variable)
 void SourceField::Set(const ScoreValue* value) {
   value_ = value;
   has_key_ = false;
+  has_code_ = false;
   if (value != nullptr && typeid(*value) == typeid(NumericValue)) {
     number_ = static_cast<const NumericValue*>(value)->NumericValue::GetDouble();
     is_missing_ =

@@ -7,6 +7,7 @@
 #include <string>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
+#include "kestrel/dictionary/TextCodes.h"
 #include "kestrel/dictionary/ValueIndex.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
@@ -42,6 +43,9 @@ class SourceField {
   /// Whether the value is absent or the variable says that it is missing.
   bool IsMissing() const { return is_missing_; }
 
+  /// Whether the value is a number that is not missing.
+  bool IsNumber() const { return kind_ == Kind::kNumber && !is_missing_; }
+
   /// The number, or the seconds of a date/time; the system-missing value for everything else.
   const double& GetNumber() const { return number_; }
   /// The seconds of a date/time; the system-missing value for everything else.
@@ -50,6 +54,19 @@ class SourceField {
   const StringValue* const& GetText() const { return text_; }
   /// Where values equal to this one are filed; computed when it is first asked for.
   const ValueKey& GetKey() const;
+
+  /// Gives texts codes, so that a text is looked up once for all fields that list texts. `codes` must outlive
+  /// this object.
+  void SetCodes(const TextCodes* codes) { codes_ = codes; }
+  /// The code of the text at hand, which must be one; TextCodes::kUnknown when it has none. Looked up when it
+  /// is first asked for.
+  int GetTextCode() const {
+    if (!has_code_) {
+      code_ = codes_->Find(text_->GetText());
+      has_code_ = true;
+    }
+    return code_;
+  }
 
  private:
   void SetOther(const ScoreValue& value);
@@ -60,6 +77,7 @@ class SourceField {
   bool takes_every_value_;
   bool misses_sysmis_;
   mutable bool has_key_ = false;
+  mutable bool has_code_ = false;
   bool is_missing_ = true;
   Kind kind_ = Kind::kNone;
   const ScoreValue* value_ = nullptr;
@@ -67,6 +85,8 @@ class SourceField {
   double seconds_ = NumericValue::gSysmisValue;
   const StringValue* text_;
   mutable ValueKey key_;
+  const TextCodes* codes_ = nullptr;
+  mutable int code_ = TextCodes::kUnknown;
   StringValue copied_text_;
 };
 

@@ -166,6 +166,7 @@ void TransformVar::ForgetEvaluation() {
   plan_.reset();
   evaluation_.reset();
   definition_stamp_ = NewLayoutStamp();
+  DerivationPlan::NoteChange(definition_stamp_);
 }
 
 const ScoreValue* TransformVar::GetTransformedValue(const ScoreCaseRecord* record,
@@ -174,7 +175,7 @@ const ScoreValue* TransformVar::GetTransformedValue(const ScoreCaseRecord* recor
   // The fields of a dictionary share one plan; a field on its own has a plan for itself and what it reads.
   if (transformations != nullptr && transformations->GetVar(GetName()) == this) {
     transformations->PlanFor(dictionary).ComputeOnly(*this, record);
-    return &Evaluation().GetResult();
+    return &Evaluation().GetOwnResult();
   }
   if (plan_ == nullptr || !plan_->IsFor(dictionary, transformations)) {
     plan_.reset();
@@ -182,26 +183,11 @@ const ScoreValue* TransformVar::GetTransformedValue(const ScoreCaseRecord* recor
         std::make_unique<DerivationPlan>(std::vector<const TransformVar*>{this}, dictionary, transformations);
   }
   plan_->ComputeOnly(*this, record);
-  return &Evaluation().GetResult();
+  return &Evaluation().GetOwnResult();
 }
 
 ScoreValue::ValueType TransformVar::GetResultType() const {
-  return Evaluation().GetResult().GetType();
-}
-
-void TransformVar::CopyResult(ScoreValue& to) const {
-  const FieldEvaluation& evaluation = *evaluation_;
-  switch (evaluation.GetStorage()) {
-    case FieldEvaluation::Storage::kNumber:
-      static_cast<NumericValue&>(to).SetDoubleValue(evaluation.GetNumber().GetDouble());
-      break;
-    case FieldEvaluation::Storage::kText:
-      static_cast<StringValue&>(to).SetString(evaluation.GetText().GetText());
-      static_cast<StringValue&>(to).SetLength(evaluation.GetText().GetLength());
-      break;
-    default:
-      to.SetValue(&evaluation.GetDateTime());
-  }
+  return Evaluation().GetOwnResult().GetType();
 }
 
 double TransformVar::GetNormValue(double x) {

@@ -158,8 +158,6 @@ class KESTREL_API TransformVar : public DictVar {
   void ForgetEvaluation();
   /// The type of the values that are computed.
   ScoreValue::ValueType GetResultType() const;
-  /// Copies what was computed last into a value of that type, of the library's own.
-  void CopyResult(ScoreValue& to) const;
 
   std::string field_name_;
   TransExpression kind_ = TransExpression::kConstant;

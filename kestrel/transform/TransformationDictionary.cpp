@@ -113,33 +113,29 @@ DerivationPlan& TransformationDictionary::PlanFor(const ScoreDictionary* diction
 }
 
 void TransformationDictionary::ChooseOutputs() {
-  outputs_.clear();
-  std::vector<const TransformVar*> chosen;
+  std::vector<DerivationPlan::Output> outputs;
+  chosen_.assign(derived_names_.size(), false);
   if (derived_record_ != nullptr) {
     const std::vector<ScoreValue*>& values = derived_record_->GetAllValues();
     for (const std::string& name : has_wanted_names_ ? wanted_names_ : derived_names_) {
       const int index = derived_record_->GetIndex(name);
       const auto* field = dynamic_cast<const TransformVar*>(GetVar(name));
       if (field == nullptr || index < 0) continue;
+      ScoreValue* const value = values[static_cast<std::size_t>(index)];
       // A host may have changed the type since the record was set up.
-      if (values[static_cast<std::size_t>(index)]->GetType() != field->GetResultType()) continue;
-      outputs_.push_back({field, values[static_cast<std::size_t>(index)], static_cast<std::size_t>(index)});
-      chosen.push_back(field);
+      if (value->GetType() != field->GetResultType()) continue;
+      outputs.push_back({field, value});
+      chosen_[static_cast<std::size_t>(index)] = true;
     }
   }
-  plan_->Choose(chosen);
+  plan_->Choose(outputs);
 }
 
 const CaseRecord* TransformationDictionary::GetValuesForDerivedVars(const ScoreCaseRecord* record,
                                                                     const ScoreDictionary* dictionary) {
   if (record == nullptr || derived_record_ == nullptr) return derived_record_.get();
-  Reset();
-  DerivationPlan& plan = PlanFor(dictionary);
-  plan.Compute(record);
-  for (const Output& output : outputs_) {
-    output.field->CopyResult(*output.value);
-    computed_[output.index] = true;
-  }
+  PlanFor(dictionary).Compute(record);
+  computed_ = chosen_;
   return derived_record_.get();
 }
 

@@ -172,18 +172,11 @@ class KESTREL_API TransformationDictionary : public BaseDictionary {
   std::vector<std::string> derived_names_;
   bool is_set_up_ = false;
 
-  /// Where the result of one field goes in the record.
-  struct Output {
-    const TransformVar* field;
-    ScoreValue* value;
-    std::size_t index;
-  };
-
   std::vector<std::string> wanted_names_;
   bool has_wanted_names_ = false;
   /// How all the fields are computed with the data dictionary at hand; null until it is needed.
   std::unique_ptr<DerivationPlan> plan_;
-  std::vector<Output> outputs_;
+  std::vector<bool> chosen_;  ///< by position in the record: what the plan computes
 };
 
 }  // namespace MCKestrel_800

@@ -8,9 +8,9 @@
 #include <vector>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
+#include "kestrel/dictionary/TextCodes.h"
 #include "kestrel/foundation/ScoreValue.h"
 #include "plugins/support/NumberCodes.h"
-#include "plugins/support/TextCodes.h"
 
 namespace MCKestrel_800 {
 

@@ -1,4 +1,4 @@
-#include "plugins/support/TextCodes.h"
+#include "kestrel/dictionary/TextCodes.h"
 
 #include <chrono>
 #include <cstring>
@@ -6,42 +6,45 @@
 namespace MCKestrel_800 {
 namespace {
 
-__extension__ using Wide = unsigned __int128;
-
-std::uint64_t Fold(std::uint64_t left, std::uint64_t right) {
-  const Wide product = static_cast<Wide>(left) * right;
-  return static_cast<std::uint64_t>(product) ^ static_cast<std::uint64_t>(product >> 64);
-}
-
-/// A key of this process: without it, no document can be written whose categories all land in one place.
+// Secret numbers of this process: without them, no document can be written whose categories all land in one
+// place.
 struct HashKey {
-  std::uint64_t first;
-  std::uint64_t second;
+  std::uint64_t start;
+  std::uint64_t factor;
 
   HashKey() {
     const auto now = static_cast<std::uint64_t>(std::chrono::steady_clock::now().time_since_epoch().count());
     const auto place = static_cast<std::uint64_t>(reinterpret_cast<std::uintptr_t>(this));
-    first = Fold(now ^ 0x9E3779B97F4A7C15u, place ^ 0xD6E8FEB86659FD93u);
-    second = Fold(first ^ 0xA0761D6478BD642Fu, now ^ 0xE7037ED1A0B428DBu);
+    start = Mix(now ^ Mix(place));
+    factor = Mix(start + 0x9E3779B97F4A7C15u) | 1;
+  }
+
+  static std::uint64_t Mix(std::uint64_t x) {
+    x = (x ^ (x >> 30)) * 0xBF58476D1CE4E5B9u;
+    x = (x ^ (x >> 27)) * 0x94D049BB133111EBu;
+    return x ^ (x >> 31);
   }
 };
 
 const HashKey kKey;
 
-// Category texts are short: eight bytes a step, one multiplication each.
+// Category texts are short: eight bytes a step, one multiplication each. The shift brings the high bits of
+// the product, which depend on all bytes so far, back to where the table and the next step look.
 std::uint64_t Hash(std::string_view text) {
-  std::uint64_t hash = text.size() ^ kKey.second;
+  std::uint64_t hash = kKey.start + text.size();
   const char* next = text.data();
   std::size_t left = text.size();
   std::uint64_t block;
   for (; left >= sizeof block; left -= sizeof block, next += sizeof block) {
     std::memcpy(&block, next, sizeof block);
-    hash = Fold(block ^ kKey.first, hash ^ kKey.second);
+    hash = (hash ^ block) * kKey.factor;
+    hash ^= hash >> 32;
   }
   block = 0;
   for (std::size_t i = 0; i < left; ++i)
     block |= std::uint64_t{static_cast<unsigned char>(next[i])} << (8 * i);
-  return Fold(block ^ kKey.first, hash);
+  hash = (hash ^ block) * kKey.factor;
+  return hash ^ (hash >> 32);
 }
 
 }  // namespace

@@ -1,7 +1,7 @@
 // From a category's text to its code: the look-up that every text input of every case goes through.
 
-#ifndef KESTREL_PLUGINS_SUPPORT_TEXTCODES_H
-#define KESTREL_PLUGINS_SUPPORT_TEXTCODES_H
+#ifndef KESTREL_DICTIONARY_TEXTCODES_H
+#define KESTREL_DICTIONARY_TEXTCODES_H
 
 #include <cstddef>
 #include <cstdint>
@@ -9,12 +9,14 @@
 #include <string_view>
 #include <vector>
 
+#include "kestrel/platform/Export.h"
+
 namespace MCKestrel_800 {
 
 /// A table of texts with their codes, packed into three arrays: an open-addressing table of entry numbers,
 /// the entries with their hashes, and all texts in a row. Looking up allocates nothing. Built on one thread,
 /// then only read.
-class TextCodes {
+class KESTREL_API TextCodes {
  public:
   static constexpr int kUnknown = -1;
 
@@ -28,6 +30,8 @@ class TextCodes {
   int Find(std::string_view text) const;
 
   bool IsEmpty() const { return entries_.empty(); }
+  /// The number of texts.
+  std::size_t GetSize() const { return entries_.size(); }
 
  private:
   struct Entry {
@@ -51,4 +55,4 @@ class TextCodes {
 
 }  // namespace MCKestrel_800
 
-#endif  // KESTREL_PLUGINS_SUPPORT_TEXTCODES_H
+#endif  // KESTREL_DICTIONARY_TEXTCODES_H
