@@ -11,6 +11,7 @@
 #include <xercesc/parsers/XercesDOMParser.hpp>
 #include <xercesc/util/PlatformUtils.hpp>
 
+#include "bench/load/DerivedDocuments.h"
 #include "bench/support/Documents.h"
 #include "bench/support/Interleaved.h"
 #include "bench/support/PredicateDocuments.h"
@@ -19,6 +20,7 @@
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ScoreModel.h"
 #include "kestrel/predicates/ScorePredicate.h"
+#include "kestrel/transform/TransformationDictionary.h"
 #include "kestrel/translate/DocumentReader.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/XmlText.h"
@@ -31,6 +33,7 @@ using MCKestrel_800::PMMLTranslator;
 using MCKestrel_800::ScoreDictionary;
 using MCKestrel_800::ScoreModel;
 using MCKestrel_800::ScorePredicate;
+using MCKestrel_800::TransformationDictionary;
 
 [[noreturn]] void Fail(const char* what) {
   std::fprintf(stderr, "bench_load: %s\n", what);
@@ -47,6 +50,22 @@ void ParseWithStockParser(const std::string& document) {
   parser.parse(source);
   if (parser.getErrorCount() != 0 || parser.getDocument() == nullptr)
     Fail("the stock parser refused a document");
+}
+
+/// A document's dictionaries.
+struct ReadFields {
+  std::unique_ptr<ScoreDictionary> dictionary;
+  std::unique_ptr<TransformationDictionary> derived;
+};
+
+ReadFields LoadFields(const std::string& document) {
+  std::istringstream in(document);
+  ReadFields fields;
+  ScoreDictionary* dictionary = nullptr;
+  fields.derived.reset(ModelFactory::GetTransformationDictionaryFromXML(in, dictionary, std::string()));
+  fields.dictionary.reset(dictionary);
+  if (fields.derived->Size() == 0) Fail("a document gave no derived fields");
+  return fields;
 }
 
 std::unique_ptr<ScoreModel> Load(const std::string& document) {
@@ -95,6 +114,23 @@ size_t CompareLoads(const char* title, const std::string& document, int repeat) 
   std::printf("  %-46s %10.2f us\n", "one whole load", 1e6 * seconds[2] / repeat);
   std::printf("  %-46s %10.3f MB\n", "memory that the model keeps", Megabytes(kept));
   return kept;
+}
+
+/// The same for derived fields, which are read and let go of.
+void CompareFieldLoads(const char* title, const std::string& document) {
+  ReadFields fields;
+  const std::vector<Contestant> contestants = {
+      {"stock parser: parse and release", [&] { ParseWithStockParser(document); }},
+      {"our reader: parse and release",
+       [&] {
+         std::istringstream in(document);
+         if (MCKestrel_800::ReadDocument(in) == nullptr) Fail("our reader refused a document");
+       }},
+      {"whole load: bytes to fields", [&] { fields = LoadFields(document); }, [&] { fields = {}; }},
+      {"the same, fields deleted", [&] { LoadFields(document); }},
+  };
+  std::printf("%s, %.3f MB\n", title, Megabytes(document.size()));
+  PrintRatios(contestants, Compare(contestants));
 }
 
 /// The same for a tree: with identifiers and, for a classification, distributions of three categories, all of
@@ -167,12 +203,16 @@ int Run(bool smoke) {
   CompareLoads("dictionary document", OfSize(large, DictionaryModel), 1);
   CompareTreeLoads("regression tree document", smoke ? 10 : 16, {});
   CompareTreeLoads("classification tree document", smoke ? 10 : 15, {3, true});
+  CompareFieldLoads("table document (text to number)", OfSize(large, TableDocument));
+  CompareFieldLoads("table document (text to category)", OfSize(large, CategoryTableDocument));
   CompareLoads("small regression document (20 inputs)", LinearModel(20, false), smoke ? 10 : 500);
   std::printf("growth: t(2n) / t(n), n = %zu\n", many);
   for (const GrowthShape& shape : GrowthShapes())
     CompareSizes(shape, many, Load);
   for (const GrowthShape& shape : PredicateShapes())
     CompareSizes(shape, many, LoadRule);
+  for (const GrowthShape& shape : DerivedShapes())
+    CompareSizes(shape, many, LoadFields);
   return 0;
 }
 
