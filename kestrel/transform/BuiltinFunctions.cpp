@@ -65,10 +65,24 @@ constexpr BuiltinFunction Text(const char* name, TransformFunction code, const c
              Missing::kEmptyText, meaning);
 }
 
-constexpr BuiltinFunction DateTime(const char* name, TransformFunction code, const Arity& arity,
-                                   const char* meaning) {
-  return Row(name, code, Family::kDateTime, Kind::kDateTime, Kind::kNumber, arity, Check::kNone,
+/// A row with one argument of another kind.
+constexpr BuiltinFunction With(int odd_index, Kind odd_argument, BuiltinFunction row) {
+  row.odd_index = odd_index;
+  row.odd_argument = odd_argument;
+  return row;
+}
+
+/// A part of a date/time.
+constexpr BuiltinFunction DateTime(const char* name, TransformFunction code, const char* meaning) {
+  return Row(name, code, Family::kDateTime, Kind::kDateTime, Kind::kNumber, kOneRequired, Check::kNone,
              Nesting::kOther, Missing::kPropagates, meaning);
+}
+
+/// A date/time less a number of seconds.
+constexpr BuiltinFunction Duration(const char* name, TransformFunction code, const char* meaning) {
+  return With(1, Kind::kNumber,
+              Row(name, code, Family::kDateTime, Kind::kDateTime, Kind::kNumber, kTwo, Check::kNone,
+                  Nesting::kOther, Missing::kPropagates, meaning));
 }
 
 /// Values of any kind to 1 or 0.
@@ -135,37 +149,39 @@ constexpr BuiltinFunction kFunctions[] = {
     Text("ltrim", kLtrimFunction, "without the blanks and tabs at the start"),
     Text("rtrim", kRtrimFunction, "without the blanks and tabs at the end"),
     Text("trimend", kRtrimFunction, "without the blanks and tabs at the end"),
-    Row("substr", kSubstrFunction, Family::kText, Kind::kText, Kind::kText, kTwo, Check::kNone,
-        Nesting::kOther, Missing::kAsMeant,
-        "the text from the position y, counted from 1, to its end; empty unless 1 <= y < its size, and when "
-        "y is missing"),
+    With(1, Kind::kNumber,
+         Row("substr", kSubstrFunction, Family::kText, Kind::kText, Kind::kText, kTwo, Check::kNone,
+             Nesting::kOther, Missing::kAsMeant,
+             "x from the position y, counted from 1, to its end; empty unless 1 <= y < its size, and when "
+             "y is missing")),
     Text("uppercase", kUppercaseFunction, "ASCII letters made large"),
     FieldTest("sysmis", kSysmisFunction, Nesting::kNumeric, "1 when the field is system-missing, else 0"),
     NumberOfField("value", kValueFunction, "the number of the field, or the one that its text reads as"),
-    DateTime("date_years_difference", kDateYearsDifferenceFunction, kTwo,
+    Duration("date_years_difference", kDateYearsDifferenceFunction,
              "x minus y, both in seconds, in years of 365.25 days, not rounded"),
-    DateTime("date_months_difference", kDateMonthsDifferenceFunction, kTwo,
+    Duration("date_months_difference", kDateMonthsDifferenceFunction,
              "x minus y, both in seconds, in months of 30.4375 days, not rounded"),
-    DateTime("date_days_difference", kDateDaysDifferenceFunction, kTwo,
+    Duration("date_days_difference", kDateDaysDifferenceFunction,
              "x minus y, both in seconds, in days, not rounded"),
-    DateTime("year-from-date", kYearFromDateFunction, kOneRequired, "the year of x"),
-    DateTime("month-from-date", kMonthFromDateFunction, kOneRequired, "the month of x"),
-    DateTime("day-from-date", kDayFromDateFunction, kOneRequired, "the day of x"),
-    DateTime("time_hours_difference", kTimeHoursDifferenceFunction, kTwo,
+    DateTime("year-from-date", kYearFromDateFunction, "the year of x"),
+    DateTime("month-from-date", kMonthFromDateFunction, "the month of x"),
+    DateTime("day-from-date", kDayFromDateFunction, "the day of x"),
+    Duration("time_hours_difference", kTimeHoursDifferenceFunction,
              "x minus y, both in seconds, in hours, not rounded"),
-    DateTime("time_minutes_difference", kTimeMinutesDifferenceFunction, kTwo,
+    Duration("time_minutes_difference", kTimeMinutesDifferenceFunction,
              "x minus y, both in seconds, in minutes, not rounded"),
-    DateTime("time_seconds_difference", kTimeSecondsDifferenceFunction, kTwo,
+    Duration("time_seconds_difference", kTimeSecondsDifferenceFunction,
              "x minus y, both in seconds, not rounded"),
-    DateTime("hour-from-time", kHourFromTimeFunction, kOneRequired, "the hour of x"),
-    DateTime("minute-from-time", kMinuteFromTimeFunction, kOneRequired, "the minute of x"),
-    DateTime("second-from-time", kSecondFromTimeFunction, kOneRequired, "the second of x"),
+    DateTime("hour-from-time", kHourFromTimeFunction, "the hour of x"),
+    DateTime("minute-from-time", kMinuteFromTimeFunction, "the minute of x"),
+    DateTime("second-from-time", kSecondFromTimeFunction, "the second of x"),
     NumberOfField("recast_to_ordinal", kRecastToOrdinalFunction, "the same as value"),
     NumberOfField("recast_to_scale", kRecastToScaleFunction, "the same as value"),
-    Row("outlierHandle", kOutlierHandleFunction, Family::kSpecial, Kind::kNumber, Kind::kNumber, kSix,
-        Check::kNone, Nesting::kOther, Missing::kPropagates,
-        "of (x, method, c, a, b, n): x when it is within a * b / sqrt(n) of c; outside it the nearer bound "
-        "when the method is asExtremeValues, missing for asIs and asMissingValues"),
+    With(1, Kind::kText,
+         Row("outlierHandle", kOutlierHandleFunction, Family::kSpecial, Kind::kNumber, Kind::kNumber, kSix,
+             Check::kNone, Nesting::kOther, Missing::kPropagates,
+             "of (x, method, c, a, b, n): x when it is within a * b / sqrt(n) of c; outside it the nearer "
+             "bound when the method is asExtremeValues, missing for asIs and asMissingValues")),
     FieldTest("isMissing", kIsMissingFunction, Nesting::kOther,
               "1 when the value of the field is missing by the rules of the field, else 0"),
     FieldTest("isNotMissing", kIsNotMissingFunction, Nesting::kOther,
@@ -185,18 +201,21 @@ constexpr BuiltinFunction kFunctions[] = {
     Logical("and", kAndFunction, kAny, "1 when no argument is 0, else 0; 0 without arguments"),
     Logical("or", kOrFunction, kAny, "1 when an argument is other than 0, else 0"),
     Logical("not", kNotFunction, kOne, "1 when x is 0, else 0"),
-    Row("if", kIfFunction, Family::kSpecial, Kind::kAny, Kind::kArgument, kTwoOrThree, Check::kNone,
-        Nesting::kNumeric, Missing::kAsMeant, "y when x is 1, else z; missing when there is no z"),
+    With(0, Kind::kNumber,
+         Row("if", kIfFunction, Family::kSpecial, Kind::kAny, Kind::kArgument, kTwoOrThree, Check::kNone,
+             Nesting::kNumeric, Missing::kAsMeant, "y when x is 1, else z; missing when there is no z")),
     Row("threshold", kThresholdFunction, Family::kScalar, Kind::kNumber, Kind::kNumber, kTwo, Check::kNone,
         Nesting::kOther, Missing::kANumber, "1 when x > y, else 0"),
     Row("floor", kFloorFunction, Family::kScalar, Kind::kNumber, Kind::kNumber, kOne, Check::kNone,
         Nesting::kOther, Missing::kPropagates, "the largest integer that is not above x"),
     Row("ceil", kCeilFunction, Family::kScalar, Kind::kNumber, Kind::kNumber, kOne, Check::kNone,
         Nesting::kOther, Missing::kPropagates, "the smallest integer that is not below x"),
-    Row("imputeCatFieldMissingAgainstConTarget", kImputeFunction, Family::kSpecial, Kind::kAny,
-        Kind::kFirstArgument, kTwoAndTwoArrays, Check::kNone, Nesting::kNumeric, Missing::kAsMeant,
-        "of (category, number, means, variances): the category when it is not missing, else the one whose "
-        "mean is nearest to the number, measured in its standard deviation; missing when the number is"),
+    With(1, Kind::kNumber,
+         Row("imputeCatFieldMissingAgainstConTarget", kImputeFunction, Family::kSpecial, Kind::kAny,
+             Kind::kFirstArgument, kTwoAndTwoArrays, Check::kNone, Nesting::kNumeric, Missing::kAsMeant,
+             "of (category, number, means, variances): the category when it is not missing, else the one "
+             "whose mean is nearest to the number, measured in its standard deviation; missing when the "
+             "number is")),
     Summary("median", kMedianFunction,
             "the middle one of the sorted arguments, or the mean of the two in the middle"),
     Summary("product", kProductFunction, "the product"),

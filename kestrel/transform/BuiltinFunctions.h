@@ -64,7 +64,7 @@ struct BuiltinFunction {
   const char* name;
   TransformFunction code;
   FunctionFamily family;
-  FunctionValueKind argument;  ///< what its arguments are used as
+  FunctionValueKind argument;  ///< what its arguments are used as, but for one of another kind
   FunctionValueKind result;
   int min_arguments;       ///< expressions, without the arrays
   int max_arguments;       ///< kAnyNumber for no limit
@@ -74,8 +74,13 @@ struct BuiltinFunction {
   FunctionNesting nesting;
   FunctionMissingRule missing;
   const char* meaning;  ///< one line for the documentation; x, y, z are the arguments
+  int odd_index = -1;   ///< the argument of another kind; -1 for none
+  FunctionValueKind odd_argument = FunctionValueKind::kAny;  ///< its kind
 
   static constexpr int kAnyNumber = -1;
+
+  /// What an argument is used as, by its position from 0.
+  FunctionValueKind KindOfArgument(int index) const { return index == odd_index ? odd_argument : argument; }
 
   bool TakesCount(std::size_t arguments) const {
     return arguments >= static_cast<std::size_t>(min_arguments) &&

@@ -163,7 +163,7 @@ TEST(BuiltinFunctions, NamesOfOneCodeDifferInNothingElse) {
 
 TEST(BuiltinFunctions, EveryFunctionHasRowsThatSayWhatItGives) {
   std::set<int> codes_with_rows;
-  for (const kestrel_test::FunctionRow& row : kestrel_test::AllFunctionRows()) {
+  for (const kestrel_tests::FunctionRow& row : kestrel_tests::AllFunctionRows()) {
     const BuiltinFunction* function = FindBuiltinFunction(row.name);
     ASSERT_NE(function, nullptr) << row.name;
     codes_with_rows.insert(function->code);
@@ -237,6 +237,31 @@ TEST(BuiltinFunctions, ChecksAndNestingAreThoseOfTheReader) {
             Codes({{17, 24}}, {66, 67}));
   EXPECT_EQ(CodesWhere([](const BuiltinFunction& row) { return row.check == FunctionArgumentCheck::kField; }),
             Codes({}, {30, 31, 44, 45, 47, 48}));
+}
+
+TEST(BuiltinFunctions, SomeTakeOneArgumentOfAnotherKind) {
+  struct Row {
+    std::set<int> codes;
+    int index;
+    FunctionValueKind kind, others;
+  };
+  const Row kRows[] = {
+      {{28}, 1, FunctionValueKind::kNumber, FunctionValueKind::kText},
+      {Codes({{32, 34}, {38, 40}}, {}), 1, FunctionValueKind::kNumber, FunctionValueKind::kDateTime},
+      {{46}, 1, FunctionValueKind::kText, FunctionValueKind::kNumber},
+      {{60}, 0, FunctionValueKind::kNumber, FunctionValueKind::kAny},
+      {{64}, 1, FunctionValueKind::kNumber, FunctionValueKind::kAny},
+  };
+  std::set<int> seen;
+  for (const Row& row : kRows) {
+    for (const int code : row.codes) {
+      const BuiltinFunction& function = *FindBuiltinFunction(static_cast<TransformFunction>(code));
+      for (int i = 0; i < function.max_arguments; ++i)
+        EXPECT_EQ(function.KindOfArgument(i), i == row.index ? row.kind : row.others) << function.name << i;
+      seen.insert(code);
+    }
+  }
+  EXPECT_EQ(CodesWhere([](const BuiltinFunction& row) { return row.odd_index >= 0; }), seen);
 }
 
 }  // namespace

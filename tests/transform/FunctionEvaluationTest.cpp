@@ -15,10 +15,10 @@
 namespace MCKestrel_800 {
 namespace {
 
-using kestrel_test::AllFunctionRows;
-using kestrel_test::FunctionRow;
-using kestrel_test::IsAsWanted;
-using kestrel_test::RowValue;
+using kestrel_tests::AllFunctionRows;
+using kestrel_tests::FunctionRow;
+using kestrel_tests::IsAsWanted;
+using kestrel_tests::RowValue;
 
 constexpr double kSysmis = NumericValue::gSysmisValue;
 

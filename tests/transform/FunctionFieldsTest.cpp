@@ -21,10 +21,10 @@
 namespace MCKestrel_800 {
 namespace {
 
-using kestrel_test::AllFunctionRows;
-using kestrel_test::FunctionRow;
-using kestrel_test::IsAsWanted;
-using kestrel_test::RowValue;
+using kestrel_tests::AllFunctionRows;
+using kestrel_tests::FunctionRow;
+using kestrel_tests::IsAsWanted;
+using kestrel_tests::RowValue;
 
 std::string FieldName(std::size_t index) {
   return "field" + std::to_string(index);
@@ -97,7 +97,7 @@ RowValue Compute(const FunctionRow& row, bool of_fields) {
   const ScoreValue* value = field.GetTransformedValue(&inputs.record, &inputs.dictionary, nullptr);
   if (value->GetType() != ScoreValue::kString) return value->GetDouble();
   const auto& text = dynamic_cast<const StringValue&>(*value);
-  return kestrel_test::Wide(text.GetText().c_str(), text.GetLength());
+  return kestrel_tests::Wide(text.GetText().c_str(), text.GetLength());
 }
 
 TEST(FunctionFields, ConstantsGiveWhatTheRowsSay) {

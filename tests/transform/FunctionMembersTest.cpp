@@ -19,9 +19,9 @@
 namespace MCKestrel_800 {
 namespace {
 
-using kestrel_test::FunctionRow;
-using kestrel_test::IsAsWanted;
-using kestrel_test::RowValue;
+using kestrel_tests::FunctionRow;
+using kestrel_tests::IsAsWanted;
+using kestrel_tests::RowValue;
 
 using Dictionary = TransformationDictionary;
 
@@ -54,8 +54,8 @@ constexpr NumberMember kNumberMembers[] = {
 };
 
 TEST(FunctionMembers, OfNumbersGiveWhatTheRowsSay) {
-  for (const auto* rows : {&kestrel_test::ArithmeticRows(), &kestrel_test::SummaryRows(),
-                           &kestrel_test::NormalRows(), &kestrel_test::LogicalRows()}) {
+  for (const auto* rows : {&kestrel_tests::ArithmeticRows(), &kestrel_tests::SummaryRows(),
+                           &kestrel_tests::NormalRows(), &kestrel_tests::LogicalRows()}) {
     for (const FunctionRow& row : *rows) {
       const auto* const member =
           std::find_if(std::begin(kNumberMembers), std::end(kNumberMembers),
@@ -92,11 +92,11 @@ RowValue CallText(const FunctionRow& row) {
            : name == "rtrim"     ? Dictionary::Rtrim(value, length)
                                  : Dictionary::ToLowerCase(value, length);
   }
-  return kestrel_test::Wide(text.c_str(), length);
+  return kestrel_tests::Wide(text.c_str(), length);
 }
 
 TEST(FunctionMembers, OfTextsGiveWhatTheRowsSay) {
-  for (const FunctionRow& row : kestrel_test::TextRows()) {
+  for (const FunctionRow& row : kestrel_tests::TextRows()) {
     const RowValue result = CallText(row);
     EXPECT_TRUE(IsAsWanted(result, row.want, 0.0)) << row << " is " << result;
   }
@@ -115,7 +115,7 @@ void DeleteAll(std::vector<ScoreValue*>& values) {
 }
 
 TEST(FunctionMembers, OfValuesGiveWhatTheRowsSayAndDeleteThem) {
-  for (const FunctionRow& row : kestrel_test::ValueRows()) {
+  for (const FunctionRow& row : kestrel_tests::ValueRows()) {
     const BuiltinFunction& function = *FindBuiltinFunction(row.name);
     double result = 0.0;
     bool is_left = false;

@@ -5,7 +5,7 @@
 #include "kestrel/foundation/DateTimeValue.h"
 #include "kestrel/foundation/StringValue.h"
 
-namespace kestrel_test {
+namespace kestrel_tests {
 
 using namespace MCKestrel_800;
 
@@ -64,4 +64,4 @@ std::vector<FunctionRow> AllFunctionRows() {
   return all;
 }
 
-}  // namespace kestrel_test
+}  // namespace kestrel_tests

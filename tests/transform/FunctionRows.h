@@ -13,7 +13,7 @@
 #include "kestrel/foundation/ScoreValue.h"
 #include "kestrel/transform/BuiltinFunctions.h"
 
-namespace kestrel_test {
+namespace kestrel_tests {
 
 /// An argument or a result.
 struct RowValue {
@@ -63,6 +63,6 @@ const std::vector<FunctionRow>& DateTimeRows();
 const std::vector<FunctionRow>& ValueRows();
 const std::vector<FunctionRow>& SpecialRows();
 
-}  // namespace kestrel_test
+}  // namespace kestrel_tests
 
 #endif  // KESTREL_TESTS_TRANSFORM_FUNCTIONROWS_H

@@ -4,7 +4,7 @@
 
 #include "tests/transform/FunctionRows.h"
 
-namespace kestrel_test {
+namespace kestrel_tests {
 
 namespace {
 
@@ -364,4 +364,4 @@ const std::vector<FunctionRow>& LogicalRows() {
   return kLogicalRows;
 }
 
-}  // namespace kestrel_test
+}  // namespace kestrel_tests

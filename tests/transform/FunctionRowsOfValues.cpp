@@ -4,7 +4,7 @@
 
 #include "tests/transform/FunctionRows.h"
 
-namespace kestrel_test {
+namespace kestrel_tests {
 
 namespace {
 
@@ -258,4 +258,4 @@ const std::vector<FunctionRow>& SpecialRows() {
   return kRows;
 }
 
-}  // namespace kestrel_test
+}  // namespace kestrel_tests
