@@ -6,8 +6,8 @@
 It was written from the description of the language, apart from the library and without a look at it, so that the two
 can be held against each other. It goes the plainest way and is slow.
 
-The table has a header line with the fields' names. An empty cell is a missing value, for a text the empty one; dates
-and times are written as their field's dataType says. A column of another name is left alone.
+The table has a header line with the fields' names. An empty cell is a missing number or date/time, or no text at all;
+dates and times are written as their field's dataType says. A column of another name is left alone.
 """
 import csv
 import sys
@@ -305,7 +305,7 @@ class Case:
 
 def value_of_cell(cell, field):
     if cell == "":
-        return nothing(field.kind, field.data_type)
+        return None if field.kind == TEXT else nothing(field.kind, field.data_type)
     return value_from_text(cell, field.data_type)
 
 

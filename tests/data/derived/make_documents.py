@@ -37,7 +37,7 @@ from values import DATE_TYPES, DAY, MISSING, MOMENT, NUMBER, TEXT, Moment, Text
 
 DOCUMENTS = 260
 CASES = 9
-CANDIDATES = 60  # of which the most varied cases are kept
+CANDIDATES = 30  # of which the most varied cases are kept
 SEED = 41
 HERE = os.path.dirname(os.path.abspath(__file__))
 NAMES = ["x", "y", "light & dark", "a<b", "Größe", "t", "u", "day", "moment"]
