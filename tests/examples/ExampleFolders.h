@@ -1,4 +1,5 @@
-// The folders of examples/ that hold a model with its data and the training program's answers.
+// The folders of examples/ that hold a model with its data and the training program's answers, or derived
+// fields with data and what they are.
 
 #ifndef KESTREL_TESTS_EXAMPLES_EXAMPLEFOLDERS_H
 #define KESTREL_TESTS_EXAMPLES_EXAMPLEFOLDERS_H
@@ -15,15 +16,24 @@ inline std::string ExamplePath(const std::string& example, const std::string& fi
   return std::string(KESTREL_SOURCE_DIR) + "/examples/" + example + "/" + file;
 }
 
-inline std::vector<std::string> ExampleFolders() {
+inline std::vector<std::string> FoldersWith(const std::string& file) {
   std::vector<std::string> names;
   for (const auto& entry :
        std::filesystem::directory_iterator(std::string(KESTREL_SOURCE_DIR) + "/examples")) {
-    if (std::filesystem::exists(entry.path() / "expected.csv"))
-      names.push_back(entry.path().filename().string());
+    if (std::filesystem::exists(entry.path() / file)) names.push_back(entry.path().filename().string());
   }
   std::sort(names.begin(), names.end());
   return names;
+}
+
+/// Those with a model.
+inline std::vector<std::string> ExampleFolders() {
+  return FoldersWith("expected.csv");
+}
+
+/// Those with derived fields alone.
+inline std::vector<std::string> DerivedExampleFolders() {
+  return FoldersWith("derived.csv");
 }
 
 /// The model elements that examples hold.
