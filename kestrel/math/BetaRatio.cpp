@@ -10,20 +10,19 @@
 #include "kestrel/math/ErrorFunction.h"
 #include "kestrel/math/GammaRatio.h"
 #include "kestrel/math/MCPower.h"
+#include "kestrel/math/PowerSum.h"
 #include "kestrel/math/SaddlePoint.h"
 
 namespace MCMath_800 {
 namespace {
 
 constexpr double kTwoPi = 6.28318530717958647693;
-constexpr double kTwoOverSqrtPi = 1.12837916709551257390;
-constexpr double kPrecision = MCPower::gMachineEpsilon / 4.0;
 
 // Far more terms than any sum below needs where it is used; the limit is there for the reader's peace.
 constexpr int kTermLimit = 2000;
 
 // Up to here the continued fraction takes less time than the expansion's coefficients.
-constexpr double kNormalShape = 1000.0;
+constexpr double kNormalShape = 20.0;
 
 // A point with its parameters, so that both can be turned round: I_x(a, b) = 1 - I_y(b, a).
 struct BetaCase {
@@ -64,39 +63,15 @@ DoubleDouble BetaDeviance(const BetaPoint& point, double a, double b) {
          Deviance([&] { return point.y * AddExactly(a, b); }, -point.deviation, b);
 }
 
-// 1 + t_1 + t_1 t_2 + ..., summed with what the additions round off. Every factor t has the same number in
-// it: what that has beyond a double moves the n-th product by n times as much.
-class PowerSum {
- public:
-  explicit PowerSum(DoubleDouble common) : excess_(common.low / common.high) {}
-
-  bool Counts() const { return term_ > kPrecision * sum_.high; }
-  void Add(double factor) {
-    term_ *= factor;
-    index_ += 1.0;
-    const DoubleDouble sum = AddExactly(sum_.high, term_);
-    sum_ = {sum.high, sum_.low + sum.low};
-    moment_ += index_ * term_;
-  }
-  double Value() const { return sum_.high + (sum_.low + excess_ * moment_); }
-
- private:
-  double excess_;
-  double term_ = 1.0;
-  double index_ = 0.0;
-  double moment_ = 0.0;
-  DoubleDouble sum_ = 1.0;
-};
-
 // I_x(a, b) - I_x(a + count, b), from the recurrence in a; with enough terms it is I_x(a, b) itself. For b <=
 // 1, or x below the mean.
 double ForwardSum(const BetaCase& c, int count) {
   PowerSum sum(c.at.x);
-  double n = c.a;
-  for (int i = 1; i < count && sum.Counts(); ++i) {
-    sum.Add(c.at.x.high * ((n + c.b) / (n + 1.0)));
-    n += 1.0;
-  }
+  const double x = c.at.x.high;
+  const double excess = x * (c.b - 1.0);
+  // x (n + b) / (n + 1) with fewer roundings.
+  for (int i = 1; i < count && sum.Counts(); ++i)
+    sum.Add(x + excess / (c.a + i));
   return c.Power() / c.a * sum.Value();
 }
 
@@ -108,8 +83,9 @@ double BackwardSum(const BetaCase& c, int count) {
   const DoubleDouble inverse = DoubleDouble(1.0) / c.at.y;
   PowerSum sum(inverse);
   for (int i = 1; i < count && sum.Counts(); ++i) {
-    sum.Add(inverse.high * (b / (c.a + b - 1.0)));
-    b -= 1.0;
+    const double less = b - 1.0;
+    sum.Add(inverse.high * (b / (c.a + less)));
+    b = less;
   }
   return BetaPower(last, c.a, c.b - 1.0) / (c.b - 1.0) * sum.Value();
 }
@@ -130,13 +106,14 @@ double LargeAExpansion(const BetaCase& c, int steps) {
   if (!(z > 0.0)) return 1.0;
   const GammaShare gamma = FindGammaShare(exact_z, b, true);
   if (gamma.power == 0.0) return 0.0;
-  const double scale = gamma.power * std::exp(LogGammaGrowth(b, a) - b * std::log1p(shift.high / a));
+  const double scale = std::exp(LogGammaGrowth(b, a) - b * std::log1p(shift.high / a));
   const double v = 0.25 / nu / nu;
   const double square = 0.25 * log_x * log_x;
   double coefficients[kTerms];
   double weights[kTerms];
-  double j = gamma.ratio / gamma.power;
-  double sum = j;
+  const double first = gamma.ratio / gamma.power;
+  double j = first;
+  double sum = 0.0;
   double t = 1.0;
   double coefficient = 1.0;
   for (int n = 1; n <= kTerms; ++n) {
@@ -151,33 +128,48 @@ double LargeAExpansion(const BetaCase& c, int steps) {
     weights[n - 1] = (b - 1.0) * coefficient + s / n;
     const double term = weights[n - 1] * j;
     sum += term;
-    if (std::fabs(term) <= kPrecision * sum) break;
+    if (std::fabs(term) <= kPowerSumPrecision * first) break;
   }
-  return scale * sum;
+  return scale * (gamma.ratio + gamma.power * sum);
 }
 
-// The continued fraction of section 4, for a, b > 1 and x below the mean.
-double Fraction(const BetaCase& c) {
-  const double power = c.Power();
-  if (power == 0.0) return 0.0;
-  const double a = c.a;
-  const double b = c.b;
-  const double x = c.at.x.high;
-  const double first = 1.0 - c.at.deviation.high;
-  double inverse = 1.0 / (a + 1.0);
+// The continued fraction of section 4, for a, b > 1 and x below the mean: beta_0 + alpha_1 / (beta_1 + ...).
+class FractionTerms {
+ public:
+  explicit FractionTerms(const BetaCase& c)
+      : a_(c.a), b_(c.b), x_(c.at.x.high), y_(c.at.y.high), first_(1.0 - c.at.deviation.high) {}
+
+  struct Term {
+    double alpha;
+    double beta;
+  };
+  Term At(double n) const {
+    const double divisor = a_ + (2.0 * n - 1.0);
+    const double step = n * ((b_ - n) * x_) / divisor;
+    return {(a_ + (n - 1.0)) * ((a_ + b_ + (n - 1.0)) * x_ / divisor) * step,
+            n + step + (a_ + n) / (a_ + (2.0 * n + 1.0)) * (first_ + n * (1.0 + y_))};
+  }
+  double First() const { return a_ / (a_ + 1.0) * first_; }
+
+ private:
+  double a_;
+  double b_;
+  double x_;
+  double y_;
+  double first_;
+};
+
+// The fraction from beta_start on, by its convergents.
+double FractionFrom(const FractionTerms& terms, int start, double beta) {
   double above = 0.0, below = 1.0;
-  double next_above = 1.0, next_below = a * first * inverse;
-  for (int i = 1; i < kTermLimit; ++i) {
-    const double n = i;
-    const double step = n * ((b - n) * x) * inverse;
-    const double alpha = (a + n - 1.0) * inverse * ((a + b + n - 1.0) * x) * step;
-    inverse = 1.0 / (a + 2.0 * n + 1.0);
-    const double beta = n + step + (a + n) * inverse * (first + n * (1.0 + c.at.y.high));
-    const double new_above = alpha * above + beta * next_above;
-    const double new_below = alpha * below + beta * next_below;
+  double next_above = 1.0, next_below = beta;
+  for (int n = start + 1; n < kTermLimit; ++n) {
+    const FractionTerms::Term term = terms.At(n);
+    const double new_above = term.alpha * above + term.beta * next_above;
+    const double new_below = term.alpha * below + term.beta * next_below;
     // Two convergents agree when their cross products do; a division only when the numbers grow.
     const double left = new_above * next_below;
-    const bool agree = std::fabs(left - next_above * new_below) <= 2.0 * kPrecision * left;
+    const bool agree = std::fabs(left - next_above * new_below) <= 2.0 * kPowerSumPrecision * left;
     above = next_above;
     below = next_below;
     next_above = new_above;
@@ -191,97 +183,93 @@ double Fraction(const BetaCase& c) {
       next_below = 1.0;
     }
   }
-  return power * (next_above / next_below);
+  return next_below / next_above;
 }
 
-// The coefficients d_n of the expansion below, one by one; they depend on the shapes alone.
-class NormalCoefficients {
- public:
-  static constexpr int kCount = 22;
-
-  NormalCoefficients(double a, double b) {
-    const double large = std::max(a, b);
-    ratio_ = std::min(a, b) / large;
-    even_ = 2.0 / (1.0 + ratio_);
-    odd_ = 2.0 * ((b - a) / large);
-    a_[0] = odd_ / 3.0;
-    c_[0] = -0.5 * a_[0];
-    d_[0] = -c_[0];
+// Convergents gather rounding errors that the levels of a fraction fade out: the first levels, which count
+// most, are put on top of them.
+double Fraction(const BetaCase& c) {
+  const double power = c.Power();
+  if (power == 0.0) return 0.0;
+  constexpr int kLevels = 6;
+  const FractionTerms terms(c);
+  double alpha[kLevels + 1], beta[kLevels + 1];
+  beta[0] = terms.First();
+  for (int n = 1; n <= kLevels; ++n) {
+    const FractionTerms::Term term = terms.At(n);
+    alpha[n] = term.alpha;
+    beta[n] = term.beta;
   }
+  double value = FractionFrom(terms, kLevels, beta[kLevels]);
+  for (int n = kLevels; n >= 1; --n)
+    value = beta[n - 1] + alpha[n] / value;
+  return power / value;
+}
 
-  double First() const { return d_[0]; }
+// The expansion near the mean for a and b that are not small. With the mean m = a / (a + b), M = a b / (a +
+// b) and the deviance M w^2 / 2 as the variable, where w has the sign of t - m,
+//   I_x(a, b) = sqrt(M / (2 pi)) e^-correction * integral of e^(-M w^2 / 2) g(w) over w up to that of x,
+// g(w) = w / s(w), s = (t - m) / (m (1 - m)), and s s' = w (1 + (1 - 2 m) s - m (1 - m) s^2), which gives the
+// power series of s^2, s and g one after the other. Compare N. M. Temme, "The uniform asymptotic expansion of
+// a class of integrals related to cumulative distribution functions", SIAM J. Math. Anal. 13 (1982) 239-253.
+class NormalSeries {
+ public:
+  static constexpr int kCount = 24;
 
-  /// d_n and d_n+1, for n = 2, 4, ... in turn.
-  void Next(int n, double& even, double& odd) {
-    ratio_power_ *= ratio_ * ratio_;
-    a_[n - 1] = even_ * (1.0 + ratio_ * ratio_power_) / (n + 2.0);
-    ratio_sum_ += ratio_power_;
-    a_[n] = odd_ * ratio_sum_ / (n + 3.0);
-    even = Add(n);
-    odd = Add(n + 1);
+  // With w turned round, since x is below the mean.
+  NormalSeries(double a, double b) : skewness_((a - b) / (a + b)), variance_(a / (a + b) * (b / (a + b))) {}
+
+  /// g_n, for n = 1, 2, ... in turn.
+  double Next(int n) {
+    // s_n+1 from the square's coefficient of w^(n+2).
+    square_[n + 2] = 2.0 / (n + 2) * (skewness_ * s_[n] - variance_ * square_[n]);
+    double s = 0.5 * square_[n + 2];
+    for (int i = 2; 2 * i < n + 2; ++i)
+      s -= s_[i] * s_[n + 2 - i];
+    if (n % 2 == 0) s -= 0.5 * s_[n / 2 + 1] * s_[n / 2 + 1];
+    s_[n + 1] = s;
+    double g = -s;
+    for (int i = 1; i < n; ++i)
+      g -= g_[i] * s_[n + 1 - i];
+    g_[n] = g;
+    return g;
   }
 
  private:
-  double Add(int i) {
-    double b[kCount];
-    const double r = -0.5 * (i + 1.0);
-    b[0] = r * a_[0];
-    for (int m = 2; m <= i; ++m) {
-      double inner = 0.0;
-      for (int j = 1; j < m; ++j)
-        inner += (j * r - (m - j)) * a_[j - 1] * b[m - j - 1];
-      b[m - 1] = r * a_[m - 1] + inner / m;
-    }
-    c_[i - 1] = b[i - 1] / (i + 1.0);
-    double inner = c_[i - 1];
-    for (int j = 1; j < i; ++j)
-      inner += d_[i - j - 1] * c_[j - 1];
-    d_[i - 1] = -inner;
-    return d_[i - 1];
-  }
-
-  double ratio_;
-  double ratio_power_ = 1.0;
-  double ratio_sum_ = 1.0;
-  double even_;
-  double odd_;
-  double a_[kCount];
-  double c_[kCount];
-  double d_[kCount];
+  double skewness_;
+  double variance_;
+  double square_[kCount + 3] = {0.0, 0.0, 1.0};
+  double s_[kCount + 2] = {0.0, 1.0};
+  double g_[kCount + 1] = {1.0};
 };
 
-// The asymptotic expansion for large a and b near the mean, section 10.
 double NormalExpansion(const BetaCase& c) {
-  constexpr double kStep = 0.35355339059327376220;  // 2^(-3/2)
   const double a = c.a;
   const double b = c.b;
-  const DoubleDouble exact_deviance = BetaDeviance(c.at, a, b);
-  const double deviance = exact_deviance.high;
+  const DoubleDouble deviance = BetaDeviance(c.at, a, b);
   const double correction = StirlingError(a) + StirlingError(b) - StirlingError(a + b);
-  const double z = std::sqrt(deviance);
-  const double width = std::sqrt(std::max(a, b) / std::min(a, b) / (a + b));
-  NormalCoefficients coefficients(a, b);
-  double even_integral = 0.5 / kTwoOverSqrtPi * ScaledErfc(z);
-  double odd_integral = kStep;
-  double even_power = 0.5 * z / kStep;
-  double odd_power = 2.0 * deviance;
-  double weight = width;
-  double sum = even_integral + coefficients.First() * width * odd_integral;
-  for (int n = 2; n < NormalCoefficients::kCount; n += 2) {
-    double even, odd;
-    coefficients.Next(n, even, odd);
-    even_integral = kStep * even_power + (n - 1.0) * even_integral;
-    odd_integral = kStep * odd_power + n * odd_integral;
-    even_power *= 2.0 * deviance;
-    odd_power *= 2.0 * deviance;
-    weight *= width;
-    const double first = even * weight * even_integral;
-    weight *= width;
-    const double second = odd * weight * odd_integral;
-    sum += first + second;
-    if (std::fabs(first) + std::fabs(second) <= kPrecision * sum) break;
+  const double size = a / (a + b) * b;
+  const double inverse = 1.0 / size;
+  const double w = std::sqrt(2.0 * deviance.high * inverse);
+  NormalSeries series(a, b);
+  // Integrals of sqrt(M / (2 pi)) w^n e^(-M w^2 / 2) over the exponential at the lower end, begun with n = 0.
+  double before = 0.5 * ScaledErfc(std::sqrt(deviance.high));
+  double power = std::sqrt(size / kTwoPi);
+  double integral = power * inverse;
+  double sum = before;
+  // Every other term is 0 when a = b.
+  double last = sum;
+  for (int n = 1; n <= NormalSeries::kCount; ++n) {
+    const double term = series.Next(n) * integral;
+    sum += term;
+    if (std::fabs(last) + std::fabs(term) <= kPowerSumPrecision * sum) break;
+    last = term;
+    power *= w;
+    const double next = (power + n * before) * inverse;
+    before = integral;
+    integral = next;
   }
-  return kTwoOverSqrtPi * GuardedExpMinus(exact_deviance + correction) * sum;
+  return GuardedExpMinus(deviance + correction) * sum;
 }
 
 // The expansion for large a after as many steps of the recurrence as it takes to get there.
@@ -302,12 +290,12 @@ Tail FindSmallShape(const BetaCase& c) {
     if (c.b <= 1.0) return {ForwardSum(c, kTermLimit), false};
     if (c.at.x.high >= 0.29) return {ForwardSum(c.Reflected(), kTermLimit), true};
     // With x so small the sum in x is short, and its result is not so close to 1 that the rest would be lost.
-    if (c.at.x.high < 0.1 && c.b * c.at.x.high <= 0.7 && std::pow(c.at.x.high * c.b, c.a) <= 0.7) {
+    if (c.at.x.high < 0.3 && c.b * c.at.x.high <= 0.7 && std::pow(c.at.x.high * c.b, c.a) <= 0.7) {
       return {ForwardSum(c, kTermLimit), false};
     }
     return {ExpandLargeA(c.Reflected()), true};
   }
-  if (c.a >= std::min(0.2, c.b) || std::pow(c.at.x.high, c.a) <= 0.9)
+  if (c.a >= std::min(0.2, c.b) || std::pow(c.at.x.high, c.a) <= 0.7)
     return {ForwardSum(c, kTermLimit), false};
   if (c.at.x.high >= 0.3) return {ForwardSum(c.Reflected(), kTermLimit), true};
   return {ExpandLargeA(c.Reflected()), true};
@@ -316,16 +304,17 @@ Tail FindSmallShape(const BetaCase& c) {
 // a, b > 1, x below the mean.
 double FindLargeShape(const BetaCase& c) {
   const double small = std::min(c.a, c.b);
+  const double x = c.at.x.high;
+  if (c.b * x <= 0.7 || (c.a < 20.0 && x <= 0.5)) return ForwardSum(c, kTermLimit);
+  if (small > kNormalShape && -c.at.deviation.high <= 0.4 * small) return NormalExpansion(c);
   if (c.b < 40.0) {
-    if (c.b * c.at.x.high <= 0.7) return ForwardSum(c, kTermLimit);
     // Down to the last part of b that is above 0.
     const int steps = static_cast<int>(std::ceil(c.b)) - 1;
     const double sum = BackwardSum(c, steps);
     const BetaCase rest = {{c.at.x, c.at.y, c.at.deviation - c.at.x * steps}, c.a, c.b - steps};
     return sum + (c.at.x.high <= 0.7 ? ForwardSum(rest, kTermLimit) : ExpandLargeA(rest));
   }
-  if (small <= kNormalShape || -c.at.deviation.high > 0.03 * small) return Fraction(c);
-  return NormalExpansion(c);
+  return Fraction(c);
 }
 
 Tail FindTail(const BetaCase& c) {

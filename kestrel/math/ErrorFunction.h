@@ -5,7 +5,7 @@
 
 namespace MCMath_800 {
 
-/// exp(a^2) erfc(a) for a >= 0, to a few units in the last place.
+/// exp(a^2) erfc(a) for a >= 0, to one unit in the last place.
 double ScaledErfc(double a);
 
 }  // namespace MCMath_800

@@ -7,6 +7,7 @@
 #include "kestrel/math/GammaCoefficients.h"
 #include "kestrel/math/MCPower.h"
 #include "kestrel/math/Polynomial.h"
+#include "kestrel/math/PowerSum.h"
 #include "kestrel/math/SaddlePoint.h"
 
 namespace MCMath_800 {
@@ -26,40 +27,29 @@ constexpr double kTemmeShape = 20.0;
 constexpr double kSmallX = 1.1;
 
 // The power series of P(a, x) over the power term: sum of x^n / (a (a + 1) ... (a + n)).
-double LowerSeries(double x, double a) {
-  double term = 1.0;
-  double sum = 1.0;
-  double n = a;
-  for (int i = 0; i < kTermLimit && term > kPrecision * sum; ++i) {
-    n += 1.0;
-    term *= x / n;
-    sum += term;
-  }
-  return sum / a;
+double LowerSeries(DoubleDouble x, double a) {
+  PowerSum sum(x);
+  for (int i = 1; i < kTermLimit && sum.Counts(); ++i)
+    sum.Add(x.high / (a + i));
+  return sum.Value() / a;
 }
 
 // Legendre's continued fraction of Q(a, x) over the power term, summed as W. Gautschi does: "A computational
 // procedure for incomplete gamma functions", ACM TOMS 5 (1979) 466-481. For x above a, or above 1.
 double UpperFraction(double x, double a) {
   const double first = x + 1.0 - a;
-  double p = 0.0;
-  double q = (x - 1.0 - a) * first;
-  double r = 4.0 * first;
-  double s = 1.0 - a;
   double rho = 0.0;
   double term = 1.0;
-  double sum = 1.0;
-  for (int i = 0; i < kTermLimit && std::fabs(term) > kPrecision * sum; ++i) {
-    p += s;
-    q += r;
-    r += 8.0;
-    s += 2.0;
-    const double tau = p * (1.0 + rho);
-    rho = tau / (q - tau);
+  DoubleDouble sum = 1.0;
+  for (int i = 1; i < kTermLimit && std::fabs(term) > kPrecision * sum.high; ++i) {
+    const double step = first + 2 * i;
+    const double tau = i * (i - a) * (1.0 + rho);
+    rho = tau / ((step - 2.0) * step - tau);
     term *= rho;
-    sum += term;
+    const DoubleDouble next = AddOrdered(sum.high, term);
+    sum = {next.high, sum.low + next.low};
   }
-  return sum / first;
+  return (sum.high + sum.low) / first;
 }
 
 // ln Gamma(1 + y) for 0 <= y <= 1, with all digits beside its zeros.
@@ -71,17 +61,19 @@ double LogGamma1(double y) {
 // "Computation of the incomplete gamma function ratios and their inverse", ACM TOMS 12 (1986) 377-393,
 // equation 11.
 double UpperOfSmallShape(double x, double a) {
-  double power = -x;
-  double series = power / (a + 1.0);
-  for (int n = 2; n < kTermLimit; ++n) {
-    power *= -x / n;
-    const double term = power / (a + n);
-    series += term;
-    if (std::fabs(term) <= kPrecision * std::fabs(series)) break;
+  // Two doubles, since in the end only a small part of the series is left.
+  DoubleDouble power = x;
+  DoubleDouble series = 0.0;
+  for (int n = 1; n < kTermLimit; ++n) {
+    const DoubleDouble term = power / AddExactly(a, n);
+    series = series + term;
+    if (std::fabs(term.high) <= kPrecision * series.high) break;
+    power = power * -x / (n + 1.0);
   }
   // x^a / Gamma(1 + a) - 1
   const double grown = std::expm1(a * std::log(x) - LogGamma1(a));
-  return -grown - (grown + 1.0) * a * series;
+  const DoubleDouble lost = series * a;
+  return (lost - grown).high + grown * lost.high;
 }
 
 // The sum of Temme's expansion: N. M. Temme, "The asymptotic expansion of the incomplete gamma functions",
@@ -159,7 +151,7 @@ GammaShare FindGammaShare(DoubleDouble x, double a, bool upper) {
   if (a < 1.0 && at < kSmallX && upper) return {std::max(0.0, UpperOfSmallShape(at, a)), power};
   if (a == 0.5 && upper) return {GuardedExpMinus(x) * ScaledErfc(std::sqrt(at)), power};
   if (at < std::max(a, kSmallX))
-    return {Choose(std::min(1.0, power * LowerSeries(at, a)), false, upper), power};
+    return {Choose(std::min(1.0, power * LowerSeries(x, a)), false, upper), power};
   if (power == 0.0) return {upper ? 0.0 : 1.0, power};
   return {Choose(power * UpperFraction(at, a), true, upper), power};
 }

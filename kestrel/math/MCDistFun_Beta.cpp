@@ -8,6 +8,7 @@
 #include "kestrel/math/BetaRatio.h"
 #include "kestrel/math/MCDistFun.h"
 #include "kestrel/math/QuantileSearch.h"
+#include "kestrel/math/SaddlePoint.h"
 
 namespace MCMath_800 {
 
@@ -39,9 +40,29 @@ BetaPoint PointOfOdds(DoubleDouble odds, double a, double b) {
 // Beyond this logarithm of the odds the leading power of that end is all there is to the beta distribution.
 constexpr double kExtremeLogOdds = -600.0;
 
-// ln x for I_x(a, b) = p by the leading power alone.
-double LeadingLogOdds(double p, double a, double b) {
+// 1 / (a B(a, b)), the factor of the leading power x^a, for a < 3.
+double LeadingFactor(double a, double b) {
+  double factor = 1.0;
+  for (; a >= 1.0; a -= 1.0)
+    factor *= (a - 1.0 + b) / a;
+  return a == 0.0 ? factor : factor * (BetaPower({1.0, 1.0, 0.0}, a, b) / a);
+}
+
+// ln x for I_x(a, b) = p by the leading power alone. At the edge of the format that is the answer.
+DoubleDouble LeadingLogOdds(double p, double a, double b) {
+  if (a < 3.0) return (Log(p) - Log(LeadingFactor(a, b))) / a;
   return (std::log(p) + std::log(a) + LogBeta(a, b)) / a;
+}
+
+// The odds by that power in a far tail, 0 elsewhere and where the other power, y^(b - 1), is more than a
+// tenth of it as a logarithm.
+double LeadingOdds(double p, double a, double b) {
+  constexpr double kFarTail = 1e-30;
+  if (p > kFarTail) return 0.0;
+  const double log_x = LeadingLogOdds(p, a, b).high;
+  const double y = -std::expm1(log_x);
+  if (!(y > 0.0) || std::fabs((b - 1.0) * std::log(y)) > -0.1 * a * log_x) return 0.0;
+  return std::clamp(std::exp(log_x) / y, 1e-280, 1e280);
 }
 
 // After G. W. Cran, K. J. Martin and G. E. Thomas, "Remark AS R19 and algorithm AS 109", Applied Statistics
@@ -50,6 +71,8 @@ double LeadingLogOdds(double p, double a, double b) {
 // powers of ten outside, from where the search would not begin.
 double StartOdds(double p, double q, double a, double b) {
   if (a > 1.0 && b > 1.0) {
+    const double leading = LeadingOdds(p < q ? p : q, p < q ? a : b, p < q ? b : a);
+    if (leading > 0.0) return p < q ? leading : 1.0 / leading;
     const double z = p < q ? MCDistFun::IdfStdNorm(p) : -MCDistFun::IdfStdNorm(q);
     const double lambda = (z * z - 3.0) / 6.0;
     const double ra = 1.0 / (2.0 * a - 1.0);
@@ -64,13 +87,13 @@ double StartOdds(double p, double q, double a, double b) {
   const double right = std::exp(b * std::log(b / (a + b))) / b;
   const double whole = left + right;
   if (p < left / whole) {
-    const double extreme = LeadingLogOdds(p, a, b);
-    if (extreme < kExtremeLogOdds) return std::exp(extreme);
+    const DoubleDouble extreme = LeadingLogOdds(p, a, b);
+    if (extreme.high < kExtremeLogOdds) return GuardedExpMinus(-extreme);
     const double x = std::exp(std::min(-1e-3, (std::log(a * whole) + std::log(p)) / a));
     return x / (1.0 - x);
   }
-  const double extreme = LeadingLogOdds(q, b, a);
-  if (extreme < kExtremeLogOdds) return std::exp(-extreme);
+  const DoubleDouble extreme = LeadingLogOdds(q, b, a);
+  if (extreme.high < kExtremeLogOdds) return GuardedExpMinus(extreme);
   const double y = std::exp(std::min(-1e-3, (std::log(b * whole) + std::log(q)) / b));
   return (1.0 - y) / y;
 }
@@ -157,15 +180,15 @@ double MCDistFun::vexacdft(const double& x, const double& df, long& err) {
 double MCDistFun::vexaidft(const double& p, const double& df, long& err) {
   const double tail = p < 0.5 ? p : 1.0 - p;
   const double a = HalfOf(df);
-  const double extreme = LeadingLogOdds(2.0 * tail, a, 0.5);
+  const DoubleDouble extreme = LeadingLogOdds(2.0 * tail, a, 0.5);
   double size;
   if (df == 1.0) {
     size = tail > 0.25 ? std::tan(kPi * (0.5 - tail)) : 1.0 / std::tan(kPi * tail);
-  } else if (extreme < kExtremeLogOdds) {
-    size = std::exp(0.5 * (std::log(df) - extreme));
+  } else if (extreme.high < kExtremeLogOdds) {
+    size = GuardedExpMinus(extreme * 0.5) * std::sqrt(df);
   } else {
     const double twice = 2.0 * tail;
-    const double square = df > 1.0 && df < 1e9 ? HillSquare(twice, df, extreme) : 0.0;
+    const double square = df > 1.0 && df < 1e9 ? HillSquare(twice, df, extreme.high) : 0.0;
     const double start = square > 0.0 ? 1.0 / square : StartOdds(twice, 1.0 - twice, a, 0.5);
     size = std::sqrt(df / FindOdds(twice, 1.0 - twice, a, 0.5, start));
   }

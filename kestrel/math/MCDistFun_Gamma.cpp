@@ -103,11 +103,16 @@ double MCDistFun::vexaidfchi(const double& p, const double& df, long& err) {
   if (a == 0.0) return 0.0;
   const bool upper = p > 0.5;
   const double target = upper ? 1.0 - p : p;
-  const double x =
-      SearchQuantile(0.5 * idfchb(p, df), target, std::max(1.0, std::sqrt(a)), upper, [&](double at) {
-        const GammaShare share = FindGammaShare(at, a, upper);
-        return QuantilePoint{share.ratio, share.power, a - at};
-      });
+  double start = 0.5 * idfchb(p, df);
+  // At the edge of the format the leading power is the answer.
+  if (start < 1e-280 && a < 2.0) {
+    const double factor = a < 1.0 ? ReciprocalGamma1(a) : ReciprocalGamma1(a - 1.0) / a;
+    start = GuardedExpMinus((Log(factor) - Log(p)) / a);
+  }
+  const double x = SearchQuantile(start, target, std::max(1.0, std::sqrt(a)), upper, [&](double at) {
+    const GammaShare share = FindGammaShare(at, a, upper);
+    return QuantilePoint{share.ratio, share.power, a - at};
+  });
   const double quantile = 2.0 * x;
   if (!std::isfinite(quantile)) err = 1;
   return quantile;

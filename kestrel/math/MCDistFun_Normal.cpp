@@ -3,6 +3,7 @@
 #include <cmath>
 
 #include "kestrel/foundation/MCMV.h"
+#include "kestrel/math/ErfcTable.h"
 #include "kestrel/math/ErrorFunction.h"
 #include "kestrel/math/MCDistFun.h"
 #include "kestrel/math/MCPower.h"
@@ -106,6 +107,7 @@ constexpr double kF[] = {1.0,
                          2.04426310338993978564e-15};
 
 constexpr double kSqrt2 = 1.41421356237309504880;
+constexpr double kSqrtPi = 1.77245385090551602730;
 
 // y exp(-half_square), where y is the scaled complement and half_square = base^2 * factor (1 or 1/2). A
 // square of 700 is off by 1e-13 when it is rounded, and so would be the exponential: it is taken of a part of
@@ -118,11 +120,20 @@ double TailExponential(double y, double base, double factor) {
   return tail < kSmallestErfc ? 0.0 : tail;
 }
 
+// In one piece, as published; ScaledErfc has more digits.
+double PublishedScaledErfc(double a) {
+  const double t = kErfcScale / (a + kErfcScale);
+  return Polynomial(kScaledErfc, t - 0.5) * t;
+}
+
 }  // namespace
 
 double ScaledErfc(double a) {
-  const double t = kErfcScale / (a + kErfcScale);
-  return Polynomial(kScaledErfc, t - 0.5) * t;
+  if (a < kErfcEnd) {
+    const int part = static_cast<int>(a * kErfcPartsPerUnit);
+    return Polynomial(kErfcParts[part], a - (part + 0.5) / kErfcPartsPerUnit);
+  }
+  return Polynomial(kErfcFar, 1.0 / (a * a)) / (kSqrtPi * a);
 }
 
 double MCDistFun::derf(const double& x) {
@@ -149,7 +160,7 @@ double MCDistFun::derf(const double& x) {
 double MCDistFun::derfc(const double& x) {
   if (x == 0.0) return 1.0;
   const double a = std::fabs(x);
-  const double tail = TailExponential(ScaledErfc(a), a, 1.0);
+  const double tail = TailExponential(PublishedScaledErfc(a), a, 1.0);
   return x < 0.0 ? 2.0 - tail : tail;
 }
 
@@ -158,7 +169,7 @@ double MCDistFun::derfc(const double& x) {
 double MCDistFun::prbnrm(const double& z) {
   if (z > 0.0) return (derf(z / kSqrt2) + 1.0) / 2.0;
   if (z == 0.0) return 0.5;
-  return TailExponential(ScaledErfc(-z / kSqrt2), -z, 0.5) / 2.0;
+  return TailExponential(PublishedScaledErfc(-z / kSqrt2), -z, 0.5) / 2.0;
 }
 
 double MCDistFun::probit(const double& p) {

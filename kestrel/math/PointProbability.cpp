@@ -56,68 +56,59 @@ constexpr Node kNodes[] = {
     {0.9856115115452683354, 0.01627439473090567061},  {0.9972638618494815635, 0.0070186100094700966},
 };
 
-/// The table with its margins and how far the drawn successes are above their mean, which has digits that
-/// the cells alone have lost.
-struct MarkedTable {
-  DoubleDouble drawnSuccesses;
-  DoubleDouble leftSuccesses;
-  DoubleDouble drawnFailures;
-  DoubleDouble leftFailures;
-  DoubleDouble deviation;
+/// The tables with the margins of one table, along the number of drawn successes.
+class TableCurve {
+ public:
+  explicit TableCurve(const FourFold& table)
+      : cells_{table.drawnSuccesses, table.leftSuccesses, table.drawnFailures, table.leftFailures} {
+    const DoubleDouble rows[] = {AddExactly(cells_[0], cells_[1]), AddExactly(cells_[2], cells_[3])};
+    const DoubleDouble columns[] = {AddExactly(cells_[0], cells_[2]), AddExactly(cells_[1], cells_[3])};
+    const DoubleDouble total = rows[0] + rows[1];
+    for (int cell = 0; cell < 4; ++cell)
+      means_[cell] = rows[cell / 2] * columns[cell % 2] / total;
+    for (const DoubleDouble& margin : {rows[0], rows[1], columns[0], columns[1]})
+      margins_.Multiply(margin.high);
+    margins_.Divide(total.high);
+    // Of this the cells alone have lost digits.
+    deviation_ = (MultiplyExactly(cells_[0], cells_[3]) - MultiplyExactly(cells_[1], cells_[2])) / total;
+  }
+
+  /// The probability of the table with `step` drawn successes fewer.
+  double Below(double step) const {
+    FactorialQuotient factorials = margins_;
+    DoubleDouble deviances[4];
+    for (int cell = 0; cell < 4; ++cell) {
+      const bool shrinks = cell == 0 || cell == 3;
+      const DoubleDouble count = AddExactly(cells_[cell], shrinks ? -step : step);
+      const DoubleDouble up = deviation_ - step;
+      factorials.Divide(count.high);
+      const auto mean = [&] { return means_[cell]; };
+      deviances[cell] = count.high == 0.0 ? means_[cell] : Deviance(mean, shrinks ? -up : up, count);
+    }
+    return factorials.Times(deviances[0] + deviances[1], deviances[2] + deviances[3]);
+  }
+
+ private:
+  double cells_[4];
+  DoubleDouble means_[4];
+  DoubleDouble deviation_;
+  FactorialQuotient margins_;
 };
 
-MarkedTable Mark(const FourFold& table) {
-  const double total = table.drawnSuccesses + table.leftSuccesses + table.drawnFailures + table.leftFailures;
-  const DoubleDouble main = MultiplyExactly(table.drawnSuccesses, table.leftFailures);
-  const DoubleDouble side = MultiplyExactly(table.leftSuccesses, table.drawnFailures);
-  return {table.drawnSuccesses, table.leftSuccesses, table.drawnFailures, table.leftFailures,
-          (main - side) / total};
-}
-
-/// The table with `step` drawn successes fewer and the same margins.
-MarkedTable Below(const MarkedTable& table, double step) {
-  return {table.drawnSuccesses - step, table.leftSuccesses + step, table.drawnFailures + step,
-          table.leftFailures - step, table.deviation - step};
-}
-
-double Probability(const MarkedTable& table) {
-  const DoubleDouble successes = table.drawnSuccesses + table.leftSuccesses;
-  const DoubleDouble failures = table.drawnFailures + table.leftFailures;
-  const DoubleDouble drawn = table.drawnSuccesses + table.drawnFailures;
-  const DoubleDouble left = table.leftSuccesses + table.leftFailures;
-  const DoubleDouble total = drawn + left;
-  FactorialQuotient factorials;
-  for (const DoubleDouble& margin : {successes, failures, drawn, left})
-    factorials.Multiply(margin.high);
-  factorials.Divide(total.high);
-  for (const DoubleDouble& cell :
-       {table.drawnSuccesses, table.leftSuccesses, table.drawnFailures, table.leftFailures})
-    factorials.Divide(cell.high);
-  const DoubleDouble up = table.deviation;
-  const auto deviance = [&](const DoubleDouble& row, const DoubleDouble& column, const DoubleDouble& distance,
-                            const DoubleDouble& cell) {
-    const auto mean = [&] { return row * column / total; };
-    return cell.high == 0.0 ? mean() : Deviance(mean, distance, cell);
-  };
-  return factorials.Times(
-      deviance(successes, drawn, -up, table.drawnSuccesses) +
-          deviance(successes, left, up, table.leftSuccesses),
-      deviance(failures, drawn, up, table.drawnFailures) + deviance(failures, left, -up, table.leftFailures));
-}
-
-/// Adds up the tail term by term; the quotients of neighbours are rational.
+/// Adds up the tail term by term; the quotients of neighbours are rational. Hundreds of terms would show
+/// their rounding.
 double SumOfTerms(const FourFold& table, double first) {
   double a = table.drawnSuccesses, b = table.leftSuccesses, c = table.drawnFailures, d = table.leftFailures;
-  double sum = 1.0, term = 1.0;
-  while (a > 0.0 && d > 0.0 && term > 1e-17 * sum) {
+  DoubleDouble sum = 1.0, term = 1.0;
+  while (a > 0.0 && d > 0.0 && term.high > 1e-17 * sum.high) {
     b += 1.0;
     c += 1.0;
-    term *= a * d / (b * c);
-    sum += term;
+    term = term * (MultiplyExactly(a, d) / MultiplyExactly(b, c));
+    sum = sum + term;
     a -= 1.0;
     d -= 1.0;
   }
-  return first * sum;
+  return first * sum.high;
 }
 
 /// What the derivatives of the curve through the probabilities add to its integral to make the sum
@@ -140,7 +131,11 @@ double EndCorrection(const FourFold& table) {
   const double thirdOfCurve = first * (square + 3.0 * second) + third;
   const double fifthOfCurve =
       first * (square * (square + 10.0 * second) + 15.0 * second * second) + 10.0 * third * (square + second);
-  return 0.5 + first / 12.0 - thirdOfCurve / 720.0 + fifthOfCurve / 30240.0;
+  const double seventhOfCurve =
+      first * (square * (square * (square + 21.0 * second) + 105.0 * second * second) +
+               105.0 * second * second * second) +
+      35.0 * third * square * (square + 6.0 * second);
+  return 0.5 + first / 12.0 - thirdOfCurve / 720.0 + fifthOfCurve / 30240.0 - seventhOfCurve / 1209600.0;
 }
 
 }  // namespace
@@ -165,27 +160,26 @@ double BinomialProbability(double k, double n, double prob) {
 }
 
 double HypergeometricProbability(const FourFold& table) {
-  return Probability(Mark(table));
+  return TableCurve(table).Below(0.0);
 }
 
 double HypergeometricLowerTail(const FourFold& table) {
-  const MarkedTable marked = Mark(table);
-  const double last = Probability(marked);
+  const TableCurve curve(table);
+  const double last = curve.Below(0.0);
   // How far down the terms matter: the logarithm falls by 40 with the slope and the curvature at the end.
   const double b = table.leftSuccesses + 1.0, c = table.drawnFailures + 1.0;
   const double a = table.drawnSuccesses + 1.0, d = table.leftFailures + 1.0;
   const double slope = std::max(0.0, std::log(b / a * (c / d)));
   const double curvature = 1.0 / a + 1.0 / b + 1.0 / c + 1.0 / d;
   const double length = 80.0 / (slope + std::sqrt(slope * slope + 80.0 * curvature));
-  constexpr double kManyTerms = 800.0;
+  constexpr double kManyTerms = 300.0;
   // Where a cell runs empty within that length there are too few terms to need anything else.
   if (length < kManyTerms || std::min(a, d) < 1.05 * length + 100.0) return SumOfTerms(table, last);
   const double half = 0.525 * length;
   double integral = 0.0;
   for (const Node& node : kNodes) {
     const double step = half * node.at;
-    integral +=
-        node.weight * (Probability(Below(marked, half - step)) + Probability(Below(marked, half + step)));
+    integral += node.weight * (curve.Below(half - step) + curve.Below(half + step));
   }
   return half * integral + last * EndCorrection(table);
 }
