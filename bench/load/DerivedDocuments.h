@@ -111,6 +111,17 @@ inline std::string ListedSetDocument(std::size_t n) {
       }) + "</Apply>"));
 }
 
+/// Values in a list behind a deep argument, whose type is that of the innermost one.
+inline std::string DeepSetDocument(std::size_t n) {
+  std::string argument = "<FieldRef field=\"t\"/>";
+  for (int depth = 0; depth < 500; ++depth)
+    argument = "<Apply function=\"if\"><FieldRef field=\"x\"/>" + argument + "</Apply>";
+  return DerivedDocument(DerivedField("d", kNumber,
+                                      "<Apply function=\"isIn\">" + argument + "<Array type=\"string\">" +
+                                          Pieces(n + 1, [](const std::string& i) { return "v" + i + " "; }) +
+                                          "</Array></Apply>"));
+}
+
 inline std::string ValuesDocument(std::size_t n) {
   return DerivedDocument(
       DerivedField("d", kCategory, "<FieldRef field=\"t\"/>" + Pieces(n, [](const std::string& i) {
@@ -130,6 +141,7 @@ inline std::vector<GrowthShape> DerivedShapes() {
           {"arguments of a function", ArgumentsDocument},
           {"elements of a function's set", SetDocument},
           {"constants of a function's set", ListedSetDocument},
+          {"elements of a set behind a deep argument", DeepSetDocument},
           {"valid and missing values of a derived field", ValuesDocument}};
 }
 

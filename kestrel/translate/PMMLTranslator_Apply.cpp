@@ -84,6 +84,28 @@ Kind KindOf(const FunctionTree* node) {
   return stats.GetVariable() != nullptr ? KindOfType(stats.GetVariable()->GetVarType()) : Kind::kAny;
 }
 
+/// The type of the values among which one is looked for: that of the argument.
+class ElementType {
+ public:
+  explicit ElementType(const FunctionTree* argument)
+      : variable_(argument != nullptr ? argument->GetNodeStats().GetVariable() : nullptr),
+        is_text_(KindOf(argument) == Kind::kText) {}
+
+  std::unique_ptr<ScoreValue> Make(const DOMElement* where, const std::string& text) const {
+    if (variable_ != nullptr) {
+      return MakeValueAt(where, *variable_, ToXMLCh(MCXML_800::NarrowToUtf16(text).c_str()));
+    }
+    if (!is_text_) {
+      if (auto number = NumberOf(text); number != nullptr) return number;
+    }
+    return std::make_unique<StringValue>(text);
+  }
+
+ private:
+  const ScoreDictVar* const variable_;
+  const bool is_text_;
+};
+
 /// Builds the tree of one Apply element. It goes down and up the document's tree and its own side by side, so
 /// that depth costs no stack.
 class ApplyReader {
@@ -107,8 +129,6 @@ class ApplyReader {
   void Close(const DOMElement* apply, FunctionTree& node) const;
   void ReadArrays(const DOMElement* apply, FunctionTree& node) const;
   void TakeListedConstants(const DOMElement* apply, FunctionTree& node) const;
-  std::unique_ptr<ScoreValue> MakeElement(const DOMElement* where, const FunctionTree& node,
-                                          const std::string& text) const;
   void CheckOutlierMethod(const DOMElement* apply, const FunctionTree& node) const;
 
   const TransformVar& variable_;
@@ -249,7 +269,10 @@ std::unique_ptr<ScoreValue> ApplyReader::ReadUntyped(const DOMElement* constant,
   // Of "substr" the text stands first, and a number behind it.
   if (code == kSubstrFunction) is_text = node.GetChildCount() == 0;
   if (code == kOutlierHandleFunction) is_text = node.GetChildCount() == kOutlierMethod;
-  if (wanted == Kind::kAny) is_text = IsComparedWithText(apply) || NumberOf(text) == nullptr;
+  if (wanted == Kind::kAny) {
+    // What is compared stands first or second; whatever follows is one argument too many.
+    is_text = (node.GetChildCount() < 2 && IsComparedWithText(apply)) || NumberOf(text) == nullptr;
+  }
   if (is_text) return std::make_unique<StringValue>(text);
   return std::make_unique<NumericValue>(text);
 }
@@ -274,47 +297,38 @@ void ApplyReader::Close(const DOMElement* apply, FunctionTree& node) const {
 }
 
 void ApplyReader::ReadArrays(const DOMElement* apply, FunctionTree& node) const {
-  const bool takes = FindBuiltinFunction(node.GetNodeStats().GetTransFunction())->arrays > 0;
-  const bool numbers = node.GetNodeStats().GetTransFunction() == kImputeFunction;
+  const BuiltinFunction& function = *FindBuiltinFunction(node.GetNodeStats().GetTransFunction());
+  const bool numbers = function.code == kImputeFunction;
+  const ElementType type(node.GetChildAt(0));
   for (const DOMElement* array : ChildElements(apply, Tag::XML_ELE_ARRAY)) {
-    if (!takes) FailOnElement(array);
+    if (function.arrays == 0) FailOnElement(array);
+    // Not left to the check of the whole node: adding an array copies those before it.
+    if (node.GetNodeStats().GetNumberOfArray() == function.arrays) {
+      FailAt(apply, KestrelException::kInvalidDocument, function.arity_text);
+    }
     ValueList values;
     if (numbers) {
       for (const double number : PMMLTranslator::VerifyDoubleArray(array))
         values.Add(std::make_unique<NumericValue>(number));
     } else {
       for (const std::string& text : PMMLTranslator::GetArrayElements(array))
-        values.Add(MakeElement(array, node, text));
+        values.Add(type.Make(array, text));
     }
     values.GiveTo(node);
   }
 }
 
-/// A value of an array, of the type of what is looked for in it.
-std::unique_ptr<ScoreValue> ApplyReader::MakeElement(const DOMElement* where, const FunctionTree& node,
-                                                     const std::string& text) const {
-  const FunctionTree* const argument = node.GetChildAt(0);
-  if (argument != nullptr && argument->GetNodeStats().GetVariable() != nullptr) {
-    return MakeValueAt(where, *argument->GetNodeStats().GetVariable(),
-                       ToXMLCh(MCXML_800::NarrowToUtf16(text).c_str()));
-  }
-  const Kind kind = KindOf(argument);
-  if (kind != Kind::kText) {
-    if (auto number = NumberOf(text); number != nullptr) return number;
-  }
-  return std::make_unique<StringValue>(text);
-}
-
 /// Documents write the list of "isIn" as an Array or as constants behind the value.
 void ApplyReader::TakeListedConstants(const DOMElement* apply, FunctionTree& node) const {
   if (node.GetNodeStats().GetNumberOfArray() != 0 || node.GetChildCount() < 2) return;
+  const ElementType type(node.GetChildAt(0));
   ValueList values;
   int index = 0;
   for (const DOMElement* child : ChildElements(apply)) {
     if (ElementIs(child, Tag::XML_ELE_EXTENSION)) continue;
     if (index++ == 0) continue;
     if (!ElementIs(child, Tag::XML_ELE_CONSTANT)) return;
-    values.Add(MakeElement(child, node, ElementNarrowText(child)));
+    values.Add(type.Make(child, ElementNarrowText(child)));
   }
   values.GiveTo(node);
   const std::vector<FunctionTree*> children = node.Children();

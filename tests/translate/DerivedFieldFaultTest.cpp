@@ -353,6 +353,8 @@ constexpr FaultRow kApplyFaults[] = {
     {"a method that is a field", FIELD("@" APPLY("outlierHandle", X X X X X X)), 5,
      "d: not Supported outlier handle method"},
     {"a set without its array", FIELD("@" APPLY("isIn", X)), 6, "Only one parameter is allowed!"},
+    {"two arrays for one", FIELD("@" APPLY("isIn", X MEANS("1") MEANS("2"))), 6,
+     "Only one parameter is allowed!"},
     {"a set of fields", FIELD("@" APPLY("isIn", X X)), 6, "Only one parameter is allowed!"},
     {"a set of another type", FIELD("<Apply function='isIn'>" X "@<Array type='string'>a</Array></Apply>"), 3,
      "aInvalid double string -- "},
