@@ -8,6 +8,7 @@
 namespace MCMath_800 {
 
 struct BetaPoint;
+struct DoubleDouble;
 
 /// Cumulative distribution functions (Cdf), their inverses (Idf) and upper-tail significances (Sig).
 ///
@@ -131,9 +132,9 @@ class KESTREL_API MCDistFun {
   static double cdfbet(const double& x, const double& a, const double& b, long& err);
   static double betinv(const double& p, const double& a, const double& b, long& err);
 
-  /// The non-central beta distribution at ratio / (1 + ratio), or above it; nc is the numerator's.
-  static double ncdbet(const double& ratio, const double& a, const double& b, const double& nc, bool upper,
-                       long& err);
+  /// The non-central beta distribution at odds / (1 + odds), or above it; nc is the numerator's.
+  static double ncdbet(const DoubleDouble& odds, const double& a, const double& b, const double& nc,
+                       bool upper, long& err);
 
   /// P(T > size), size >= 0.
   static double vexasigt(const double& size, const double& df, long& err);

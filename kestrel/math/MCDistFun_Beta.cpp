@@ -121,11 +121,16 @@ double HillSquare(double p, double df, double leading) {
          1.0 / y;
 }
 
+// Where the format ends the low part is no number.
+double Rounded(DoubleDouble number) {
+  return std::isfinite(number.low) ? number.high + number.low : number.high;
+}
+
 // The odds x / y at which I_x(a, b) = p; p + q = 1, and the smaller of them is exact.
-double FindOdds(double p, double q, double a, double b, double start) {
+DoubleDouble FindOdds(double p, double q, double a, double b, double start) {
   const bool upper = q < p;
   const double reach = std::max(1.0, std::sqrt(a * (b / (a + b))));
-  return SearchQuantile(start, upper ? q : p, reach, upper, [&](double odds) {
+  return SearchLongQuantile(start, upper ? q : p, reach, upper, [&](double odds) {
     const BetaPoint point = PointOfOdds(odds, a, b);
     return QuantilePoint{BetaRatio(point, a, b, upper), BetaPower(point, a, b), -point.deviation.high};
   });
@@ -147,9 +152,10 @@ double MCDistFun::cdfbet(const double& x, const double& a, const double& b, long
 }
 
 double MCDistFun::betinv(const double& p, const double& a, const double& b, long& err) {
-  const double odds = FindOdds(p, 1.0 - p, a, b, StartOdds(p, 1.0 - p, a, b));
-  err = std::isnan(odds) ? 1 : 0;
-  return odds <= 1.0 ? odds / (1.0 + odds) : 1.0 / (1.0 + 1.0 / odds);
+  const DoubleDouble odds = FindOdds(p, 1.0 - p, a, b, StartOdds(p, 1.0 - p, a, b));
+  err = std::isnan(odds.high) ? 1 : 0;
+  const DoubleDouble one = 1.0;
+  return odds.high <= 1.0 ? Rounded(odds / (one + odds)) : Rounded(one - one / (one + odds));
 }
 
 // P(T > size) for size >= 0: half of I_w(df/2, 1/2), w = df / (df + size^2). w and its complement are formed
@@ -190,7 +196,7 @@ double MCDistFun::vexaidft(const double& p, const double& df, long& err) {
     const double twice = 2.0 * tail;
     const double square = df > 1.0 && df < 1e9 ? HillSquare(twice, df, extreme.high) : 0.0;
     const double start = square > 0.0 ? 1.0 / square : StartOdds(twice, 1.0 - twice, a, 0.5);
-    size = std::sqrt(df / FindOdds(twice, 1.0 - twice, a, 0.5, start));
+    size = std::sqrt(df / FindOdds(twice, 1.0 - twice, a, 0.5, start).high);
   }
   err = std::isfinite(size) ? 0 : 1;
   return p < 0.5 ? -size : size;
@@ -210,7 +216,7 @@ double MCDistFun::vexacdff(const double& f, const double& df1, const double& df2
 double MCDistFun::vexaidff(const double& p, const double& df1, const double& df2, long& err) {
   const double a = HalfOf(df1);
   const double b = HalfOf(df2);
-  const double f = FindOdds(p, 1.0 - p, a, b, StartOdds(p, 1.0 - p, a, b)) * df2 / df1;
+  const double f = Rounded(FindOdds(p, 1.0 - p, a, b, StartOdds(p, 1.0 - p, a, b)) * df2 / df1);
   err = std::isfinite(f) ? 0 : 1;
   return f;
 }

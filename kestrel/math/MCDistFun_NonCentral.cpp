@@ -111,9 +111,9 @@ double MCDistFun::NonCentralCdfChi(double x, double df, double nc) {
 double MCDistFun::NonCentralCdfF(double x, double df1, double df2, double nc, bool upper) {
   if (std::isnan(x) || !IsDf(df1) || !IsDf(df2) || !IsNc(nc)) return MCMV::gMissingValue;
   if (x <= 0.0) return upper ? 1.0 : 0.0;
-  const double ratio = x * (df1 / df2);
+  const DoubleDouble odds = DoubleDouble(df1) / df2 * x;
   long err = 0;
-  const double share = ncdbet(ratio, 0.5 * df1, 0.5 * df2, nc, upper, err);
+  const double share = ncdbet(odds, 0.5 * df1, 0.5 * df2, nc, upper, err);
   return err == 0 ? share : MCMV::gMissingValue;
 }
 
@@ -138,18 +138,18 @@ double MCDistFun::FindNCParamChi(double x, double df, double p) {
 double MCDistFun::FindNCParamF(double x, double df1, double df2, double p) {
   if (!std::isfinite(x) || x <= 0.0 || !IsDf(df1) || !IsDf(df2) || !IsSearchable(p))
     return MCMV::gMissingValue;
-  const double ratio = x * (df1 / df2);
+  const DoubleDouble odds = DoubleDouble(df1) / df2 * x;
   const double a = 0.5 * df1, b = 0.5 * df2;
-  const double central = FindBetaTail(ratio, a, b, 0.0, false, SumCare::kFull).share;
+  const double central = FindBetaTail(odds, a, b, 0.0, false, SumCare::kFull).share;
   if (p >= central) return p == central ? 0.0 : MCMV::gMissingValue;
   return FindNonCentrality(
-      p, {0.0, kLargestChiParameter}, StartFParameter(IdfStdNorm(p), ratio, df1, df2),
-      [&](double nc, bool upper, SumCare care) { return FindBetaTail(ratio, a, b, nc, upper, care); });
+      p, {0.0, kLargestChiParameter}, StartFParameter(IdfStdNorm(p), odds.high, df1, df2),
+      [&](double nc, bool upper, SumCare care) { return FindBetaTail(odds, a, b, nc, upper, care); });
 }
 
-double MCDistFun::ncdbet(const double& ratio, const double& a, const double& b, const double& nc, bool upper,
-                         long& err) {
-  const double share = FindBetaTail(ratio, a, b, nc, upper, SumCare::kFull).share;
+double MCDistFun::ncdbet(const DoubleDouble& odds, const double& a, const double& b, const double& nc,
+                         bool upper, long& err) {
+  const double share = FindBetaTail(odds, a, b, nc, upper, SumCare::kFull).share;
   if (!std::isfinite(share)) err = 1;
   return AsProbability(share);
 }

@@ -4,7 +4,6 @@
 #include <cmath>
 #include <complex>
 
-#include "kestrel/math/MCPower.h"
 #include "kestrel/math/Polynomial.h"
 #include "kestrel/math/SaddlePoint.h"
 
@@ -40,25 +39,38 @@ struct Line {
   double u;
   double w;
   double part;
-  double exponent;  ///< the cumulant function there, without its sign
-  double tilt;      ///< its slope in alpha, which is 0 at the saddle point
+  double tilt;            ///< the cumulant function's slope in z, which is 0 at the saddle point
+  DoubleDouble exponent;  ///< the cumulant function there, without its sign
 };
+
+/// The cumulant function at 2 t / (1 - 2 t) = u, without its sign. Near the mean every term is small.
+DoubleDouble ExponentAt(const ChiQuotient& q, double nc, double u) {
+  const DoubleDouble w = AddExactly(1.0, u);
+  const DoubleDouble v = q.odds * u / w;
+  if (v.high > 1.0 || v.high < -0.5)
+    return (Log(v + 1.0) * q.df2 - Log(w) * q.df1 - MultiplyExactly(nc, u)) * 0.5;
+  const DoubleDouble mean = AddExactly(q.df1, nc);
+  const DoubleDouble twice =
+      LogDeviance(Split(u)) * q.df1 + DoubleDouble(u) / w * ((q.bound - mean) - mean * u);
+  return (q.df2 > 0.0 ? twice - LogDeviance(Split(v)) * q.df2 : twice) * 0.5;
+}
 
 /// The line through the saddle point, or a little beside it when that would lead through the pole at t = 0.
 Line ChooseLine(const ChiQuotient& q, double nc, const ChiSaddle& saddle) {
   const double square = 0.5 * (q.df1 + q.df2 * saddle.part * saddle.part) + nc * saddle.w;
   const double gap = std::min(0.5 / std::sqrt(square), 0.3 / saddle.part);
-  if (std::fabs(saddle.u) >= gap) return {saddle.u, saddle.w, saddle.part, 0.5 * saddle.deviance, 0.0};
   Line line{};
-  line.u = std::copysign(gap, saddle.u);
-  line.w = 1.0 + line.u;
-  const double v = q.odds * line.u / line.w;
-  line.part = q.df2 > 0.0 ? q.odds / (line.w + q.odds * line.u) : 0.0;
-  const double mean = q.df1 + nc;
-  const double bound = q.df2 > 0.0 ? q.df2 * q.odds : q.point;
-  line.exponent = 0.5 * (q.df1 * LogDeviance(line.u) - q.df2 * LogDeviance(v) +
-                         line.u / line.w * ((bound - mean) - mean * line.u));
-  line.tilt = 0.5 * (q.df1 + nc * line.w - (q.df2 > 0.0 ? q.df2 * line.part : q.point / line.w));
+  if (std::fabs(saddle.u) >= gap) {
+    line.u = saddle.u;
+    line.w = saddle.w;
+    line.part = saddle.part;
+  } else {
+    line.u = std::copysign(gap, saddle.u);
+    line.w = 1.0 + line.u;
+    line.part = q.df2 > 0.0 ? q.odds.high / (line.w + q.odds.high * line.u) : 0.0;
+    line.tilt = 0.5 * (q.df1 + nc * line.w - (q.df2 > 0.0 ? q.df2 * line.part : q.bound.high / line.w));
+  }
+  line.exponent = ExponentAt(q, nc, line.u);
   return line;
 }
 
@@ -69,28 +81,28 @@ double SaddleDeviance(double u, double w) {
 }
 
 ChiQuotient ChiAgainstNumber(double df, double x) {
-  return {df, 0.0, 0.0, 1.0, x};
+  return {df, 0.0, 0.0, x, 1.0};
 }
 
-ChiQuotient ChiAgainstChi(double df1, double df2, double odds) {
-  const double y = 1.0 / (1.0 + odds);
-  return {df1, df2, odds, y, df2 * (odds * y)};
+ChiQuotient ChiAgainstChi(double df1, double df2, DoubleDouble odds) {
+  return {df1, df2, odds, odds * df2, 1.0 / (1.0 + odds.high)};
 }
 
 // The saddle point solves a quadratic equation, of which the positive root w is taken; u has one of its own,
 // so that nothing cancels.
 ChiSaddle FindSaddle(const ChiQuotient& q, double nc) {
-  const double x = q.odds * q.y;
+  const double x = q.odds.high * q.y;
   const double lead = q.df1 - nc * x;
-  const double rest = x * q.df1 + q.point;
+  const double rest = x * q.df1 + q.bound.high * q.y;
   const double root = std::sqrt(lead * lead + 4.0 * nc * rest);
-  double u = 2.0 * (q.point - (q.df1 + nc) * q.y) / (q.df1 + nc * (1.0 + q.y) + root);
+  const double above = (q.bound - AddExactly(q.df1, nc)).high;
+  double u = 2.0 * (above * q.y) / (q.df1 + nc * (1.0 + q.y) + root);
   if (u == 0.0) u = 1e-20;
   const double w = lead > 0.0 ? 2.0 * rest / (lead + root) : 0.5 * (root - lead) / nc;
   double deviance = q.df1 * SaddleDeviance(u, w) + nc * u * u;
   if (q.df2 == 0.0) return {u, w, 0.0, deviance};
   const double part = (q.df1 + nc * w) / q.df2;
-  deviance += q.df2 * SaddleDeviance(-u * part, w * part / q.odds);
+  deviance += q.df2 * SaddleDeviance(-u * part, w * part / q.odds.high);
   return {u, w, part, deviance};
 }
 
@@ -140,7 +152,7 @@ NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle&
     curve += 0.5 * (change * (line.w * inverse - 1.0)).real();
     if (exponent.real() < -digits) break;
   }
-  const double front = MCPower::ExpUnderflow(-line.exponent) ? 0.0 : std::exp(-line.exponent) * h / kPi;
+  const double front = GuardedExpMinus(line.exponent) * h / kPi;
   const double distance = std::asin(std::min(1.0, height(-line.u) / reach));
   const double pole = distance < strip ? 1.0 / std::expm1(2.0 * kPi * distance / h) : 0.0;
   const double sign = std::copysign(1.0, line.u);

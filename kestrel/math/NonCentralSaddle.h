@@ -12,15 +12,15 @@ namespace MCMath_800 {
 /// or `odds` times a central chi-square of df2.
 struct ChiQuotient {
   double df1;
-  double df2;    ///< 0 for a number.
-  double odds;   ///< 0 for a number.
-  double y;      ///< 1 / (1 + odds)
-  double point;  ///< df2 odds y, or the number.
+  double df2;          ///< 0 for a number.
+  DoubleDouble odds;   ///< 0 for a number.
+  DoubleDouble bound;  ///< df2 odds, the mean of the bound, or the number.
+  double y;            ///< 1 / (1 + odds)
 };
 
 ChiQuotient ChiAgainstNumber(double df, double x);
-/// odds > 0.
-ChiQuotient ChiAgainstChi(double df1, double df2, double odds);
+/// 0 <= odds <= 1e290.
+ChiQuotient ChiAgainstChi(double df1, double df2, DoubleDouble odds);
 
 /// The saddle point t of the cumulant function, as that of chi-square less its bound.
 struct ChiSaddle {

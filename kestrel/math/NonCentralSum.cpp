@@ -40,7 +40,8 @@ class GammaFamily {
 
 class BetaFamily {
  public:
-  BetaFamily(double x, double y, double b) : x_(x), y_(y), b_(b) {}
+  BetaFamily(DoubleDouble odds, double b)
+      : odds_(odds), far_(DoubleDouble(1.0) / (odds + 1.0)), near_(odds * far_), x_(near_.high), b_(b) {}
   double Drop(double s) const { return BetaPower(Point(s), s, b_) / s; }
   double Growth(double s) const { return x_ * (s + b_) / (s + 1.0); }
   double Shrinkage(double s) const { return (s + 1.0) / (x_ * (s + b_)); }
@@ -53,10 +54,12 @@ class BetaFamily {
   }
 
  private:
-  BetaPoint Point(double s) const { return {x_, y_, b_ * x_ - s * y_}; }
+  BetaPoint Point(double s) const { return {near_, far_, (odds_ * b_ - s) * far_}; }
 
+  DoubleDouble odds_;
+  DoubleDouble far_;
+  DoubleDouble near_;
   double x_;
-  double y_;
   double b_;
 };
 
@@ -189,12 +192,12 @@ MixtureShare NonCentralGamma(double x, double a, double lambda, bool upper, SumC
   return SumOf(GammaFamily(x), a, lambda, upper, care);
 }
 
-MixtureShare NonCentralBeta(double x, double y, double a, double b, double lambda, bool upper, SumCare care) {
-  return SumOf(BetaFamily(x, y, b), a, lambda, upper, care);
+MixtureShare NonCentralBeta(DoubleDouble odds, double a, double b, double lambda, bool upper, SumCare care) {
+  return SumOf(BetaFamily(odds, b), a, lambda, upper, care);
 }
 
-MixtureShare NonCentralStudent(double x, double y, double b, double lambda, bool upper, SumCare care) {
-  const Mixture<BetaFamily> mixture(BetaFamily(x, y, b), 0.5, lambda, care);
+MixtureShare NonCentralStudent(DoubleDouble odds, double b, double lambda, bool upper, SumCare care) {
+  const Mixture<BetaFamily> mixture(BetaFamily(odds, b), 0.5, lambda, care);
   const MixtureShare even = mixture.Sum(0.0, upper), odd = mixture.Sum(0.5, upper);
   return {0.5 * (even.share + odd.share), 0.5 * (even.drop + odd.drop), 0.5 * (even.next + odd.next)};
 }

@@ -20,9 +20,10 @@ constexpr double kRootTwoPi = 2.50662827463100050242;
 constexpr double kIntegralFrom = 600.0;
 constexpr double kStudentIntegralFrom = 250.0;
 
-/// So close to 0 a distribution of squares is as good as a power of x; the sums' quotients are no numbers
+/// So close to an end a distribution of squares is as good as a power; the sums' quotients are no numbers
 /// there.
 constexpr double kNearZero = 1e-280;
+constexpr double kFarOdds = 1e280;
 
 double NormalDensity(double z) {
   return std::exp(-0.5 * z * z) / kRootTwoPi;
@@ -102,7 +103,7 @@ NonCentralTail StudentAcrossZero(double x, double df, double nc, SumCare care) {
 
 /// P(T <= x), or P(T > x), for x, nc > 0: the share below 0 and a mixture beyond it.
 NonCentralTail StudentOneSide(double x, double df, double nc, bool upper, SumCare care) {
-  const double square = x * (x / df);
+  const DoubleDouble square = MultiplyExactly(x, x) / df;
   const double lambda = 0.5 * nc * nc;
   const ChiQuotient quotient = ChiAgainstChi(1.0, df, square);
   const ChiSaddle saddle = FindSaddle(quotient, nc * nc);
@@ -114,16 +115,15 @@ NonCentralTail StudentOneSide(double x, double df, double nc, bool upper, SumCar
   }
   // Whichever tail is the smaller, about.
   const bool above = x > nc;
-  const double y = 1.0 / (1.0 + square);
-  const double edge = NormalDensity(nc) * std::exp(-0.5 * df * std::log1p(square));
+  const double edge = NormalDensity(nc) * std::exp(-0.5 * df * std::log1p(square.high));
   NonCentralTail tail = {0.0, -edge, nc * edge};
-  if (square < kNearZero) {
+  if (square.high < kNearZero) {
     // Too close to 0 for anything to lie between.
     if (above) tail.share = MCDistFun::CdfStdNorm(nc);
   } else if (lambda < kSmallestPoissonMean) {
     tail.share = above ? MCDistFun::SigT(x, df) : MCDistFun::CdfT(x, df) - 0.5;
   } else {
-    const MixtureShare mixture = NonCentralStudent(square * y, y, 0.5 * df, lambda, above, care);
+    const MixtureShare mixture = NonCentralStudent(square, 0.5 * df, lambda, above, care);
     tail.share = mixture.share;
     tail.slope -= nc * mixture.drop;
     tail.bend += 2.0 * lambda * (mixture.drop - mixture.next) - mixture.drop;
@@ -148,9 +148,10 @@ NonCentralTail StudentTail(double x, double df, double nc, bool upper, SumCare c
   return Turned({above.share, -above.slope, above.bend}, !upper);
 }
 
-NonCentralTail PowerTail(const NonCentralTail& below, double x, double power, bool upper) {
-  const double share = std::pow(x / kNearZero, power);
-  return Turned({share * below.share, share * below.slope, share * below.bend}, upper);
+/// The tail at an end, which shrinks with a power of what is left to that end, or the rest of 1.
+NonCentralTail PowerTail(const NonCentralTail& tail, double ratio, double power, bool turn) {
+  const double share = std::pow(ratio, power);
+  return Turned({share * tail.share, share * tail.slope, share * tail.bend}, turn);
 }
 
 /// Squares of larger numbers are no numbers.
@@ -160,8 +161,7 @@ constexpr double kFarX = 1e140;
 NonCentralTail FarStudentTail(double x, double df, double nc, bool upper, SumCare care) {
   const bool right = x > 0.0;
   const NonCentralTail tail = FindStudentTail(right ? kFarX : -kFarX, df, nc, right, care);
-  const double share = std::pow(kFarX / std::fabs(x), df);
-  return Turned({share * tail.share, share * tail.slope, share * tail.bend}, upper != right);
+  return PowerTail(tail, kFarX / std::fabs(x), df, upper != right);
 }
 
 }  // namespace
@@ -181,7 +181,7 @@ NonCentralTail FindStudentTail(double x, double df, double nc, bool upper, SumCa
 NonCentralTail FindChiTail(double x, double df, double nc, bool upper, SumCare care) {
   const double half = 0.5 * x;
   if (half < kNearZero)
-    return PowerTail(FindChiTail(2.0 * kNearZero, df, nc, false, care), half, 0.5 * df, upper);
+    return PowerTail(FindChiTail(2.0 * kNearZero, df, nc, false, care), half / kNearZero, 0.5 * df, upper);
   // So far out the share above is too small for any number.
   if (half > 1e4 + 50.0 * (df + nc)) return {upper ? 0.0 : 1.0, 0.0, 0.0};
   const double lambda = 0.5 * nc;
@@ -194,18 +194,17 @@ NonCentralTail FindChiTail(double x, double df, double nc, bool upper, SumCare c
   return Turned(OfMixture(NonCentralGamma(half, 0.5 * df, lambda, above, care), above), above != upper);
 }
 
-NonCentralTail FindBetaTail(double ratio, double a, double b, double nc, bool upper, SumCare care) {
-  const double y = 1.0 / (1.0 + ratio);
-  const double x = ratio * y;
-  if (ratio < kNearZero) return PowerTail(FindBetaTail(kNearZero, a, b, nc, false, care), ratio, a, upper);
-  if (y == 0.0 || !std::isfinite(x)) return {upper ? 0.0 : 1.0, 0.0, 0.0};
-  const double lambda = 0.5 * nc;
-  const ChiQuotient quotient = ChiAgainstChi(2.0 * a, 2.0 * b, ratio);
+NonCentralTail FindBetaTail(DoubleDouble odds, double a, double b, double nc, bool upper, SumCare care) {
+  if (odds.high < kNearZero)
+    return PowerTail(FindBetaTail(kNearZero, a, b, nc, false, care), odds.high / kNearZero, a, upper);
+  if (odds.high > kFarOdds)
+    return PowerTail(FindBetaTail(kFarOdds, a, b, nc, true, care), kFarOdds / odds.high, b, !upper);
+  const ChiQuotient quotient = ChiAgainstChi(2.0 * a, 2.0 * b, odds);
   const ChiSaddle saddle = FindSaddle(quotient, nc);
   const bool above = saddle.u > 0.0;
   if (nc * saddle.w >= kIntegralFrom)
     return Turned(IntegrateSaddle(quotient, nc, saddle, care), above != upper);
-  return Turned(OfMixture(NonCentralBeta(x, y, a, b, lambda, above, care), above), above != upper);
+  return Turned(OfMixture(NonCentralBeta(odds, a, b, 0.5 * nc, above, care), above), above != upper);
 }
 
 }  // namespace MCMath_800

@@ -16,9 +16,9 @@ NonCentralTail FindStudentTail(double x, double df, double nc, bool upper, SumCa
 /// x > 0.
 NonCentralTail FindChiTail(double x, double df, double nc, bool upper, SumCare care);
 
-/// The non-central beta distribution at ratio / (1 + ratio), ratio >= 0; a and b are half the degrees of
+/// The non-central beta distribution at odds / (1 + odds), odds >= 0; a and b are half the degrees of
 /// freedom.
-NonCentralTail FindBetaTail(double ratio, double a, double b, double nc, bool upper, SumCare care);
+NonCentralTail FindBetaTail(DoubleDouble odds, double a, double b, double nc, bool upper, SumCare care);
 
 }  // namespace MCMath_800
 

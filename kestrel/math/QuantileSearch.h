@@ -8,6 +8,8 @@
 #include <cmath>
 #include <limits>
 
+#include "kestrel/math/DoubleDouble.h"
+
 namespace MCMath_800 {
 
 /// A distribution at a point x.
@@ -20,9 +22,11 @@ struct QuantilePoint {
 /// The x > 0 whose share is target, 0 < target <= 1/2.
 /// start  where to begin; taken as it is outside 1e-290 to 1e290, where the leading power is all there is to
 /// x. reach  the inverse of the distribution's width in ln x, at least 1. evaluate  gives the QuantilePoint
-/// of an x. At most 200 steps, at the edge of the format; elsewhere two to six.
+/// of an x. At most 200 steps, at the edge of the format; elsewhere two to six. What the last step adds comes
+/// beside x, so that what is made of it is rounded once.
 template <class Evaluate>
-double SearchQuantile(double start, double target, double reach, bool upper, const Evaluate& evaluate) {
+DoubleDouble SearchLongQuantile(double start, double target, double reach, bool upper,
+                                const Evaluate& evaluate) {
   constexpr int kStepLimit = 200;
   constexpr double kInfinity = std::numeric_limits<double>::infinity();
   // What is left after a step of this size is its cube.
@@ -40,7 +44,7 @@ double SearchQuantile(double start, double target, double reach, bool upper, con
     const double correction = 1.0 - 0.5 * newton * curvature;
     const double step = -newton / (correction < 0.5 ? 0.5 : correction > 2.0 ? 2.0 : correction);
     double next = x * std::exp(step);
-    if (std::fabs(step) * reach < kLastStep) return next;
+    if (std::fabs(step) * reach < kLastStep) return AddOrdered(x, x * std::expm1(step));
     // Also when a tail was too small to step by.
     if (!(next > low && next < high)) {
       next = high == kInfinity ? 16.0 * x : low == 0.0 ? x / 16.0 : std::sqrt(low) * std::sqrt(high);
@@ -49,6 +53,12 @@ double SearchQuantile(double start, double target, double reach, bool upper, con
     x = next;
   }
   return x;
+}
+
+/// The same, rounded.
+template <class Evaluate>
+double SearchQuantile(double start, double target, double reach, bool upper, const Evaluate& evaluate) {
+  return SearchLongQuantile(start, target, reach, upper, evaluate).high;
 }
 
 }  // namespace MCMath_800
