@@ -171,6 +171,23 @@ double Percentile(const Cases& cases, double sum, double p, MCDistFun::Percentil
   }
 }
 
+/// The share of the binomial distribution with prob 1/2 from `rank` to n - rank, 1 <= rank <= n / 2 or so: by
+/// its two tails, or, where little is left of 1, by what lies between them.
+double MiddleShare(double n, double rank) {
+  long err = 0;
+  const double tails = 2.0 * MCDistFun::CdfBin(rank - 1.0, n, 0.5, err);
+  if (tails <= 0.5) return 1.0 - tails;
+  double k = std::floor(n / 2.0);
+  double probability = MCDistFun::PdfBin(k, n, 0.5, err);
+  // Even n have one count in the middle, odd ones two.
+  double sum = k + k == n ? 0.5 * probability : probability;
+  for (; k > rank; k -= 1.0) {
+    probability *= k / (n - k + 1.0);
+    sum += probability;
+  }
+  return 2.0 * sum;
+}
+
 }  // namespace
 
 double MCDistFun::GPTile(long n, double* values, double* weights, double p, PercentileMethod method) {
@@ -207,7 +224,7 @@ double MCDistFun::Mednci(long n, double* values, double level, double& lower, do
   const long place = static_cast<long>(rank);
   lower = values[first + place - 1];
   upper = values[n - place];
-  return 1.0 - 2.0 * CdfBin(rank - 1.0, static_cast<double>(count), 0.5, err);
+  return MiddleShare(static_cast<double>(count), rank);
 }
 
 }  // namespace MCMath_800

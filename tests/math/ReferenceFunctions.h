@@ -19,6 +19,17 @@ struct AccuracyGoal {
 /// Probabilities below this are a tail.
 constexpr double kBodyFrom = 1e-5;
 
+/// The way back from an inverse's result.
+struct WayBack {
+  /// Which argument of the inverse is the probability.
+  int place;
+  /// The probability of a result; null for what is no inverse.
+  double (*call)(const double* arguments, double result);
+};
+
+/// What a round trip may differ by beyond the rounding of the inverse's result.
+constexpr double kTurnedBack = 1e-12;
+
 struct ReferenceFunction {
   /// As reports print it, with arguments.
   const char* name;
@@ -29,6 +40,7 @@ struct ReferenceFunction {
   const char* result;
   double (*call)(const double* arguments);
   AccuracyGoal goal;
+  WayBack back = {0, nullptr};
 };
 
 struct ReferencePoint {
@@ -45,6 +57,17 @@ std::vector<ReferencePoint> ReadReferencePoints(const ReferenceFunction& functio
 
 /// |value - point.value| / |point.value|; an infinity for a NaN. A right value of 0 has to be met exactly.
 double RelativeError(double value, const ReferencePoint& point);
+
+/// How far the probability of an inverse's result is from the one asked for.
+struct RoundTrip {
+  /// Relative to p.
+  double difference;
+  /// What half a unit in the result's last place makes of it: no double comes closer for sure.
+  double rounding;
+};
+
+/// For functions with a way back.
+RoundTrip TurnBack(const ReferenceFunction& function, const double* arguments);
 
 }  // namespace kestrel_tests
 

@@ -51,9 +51,20 @@ TEST_P(ReferenceTest, KeepsItsGoalAtEveryTwentiethPoint) {
   EXPECT_EQ(failures, 0) << "of " << points.size() << " points";
 }
 
+TEST_P(ReferenceTest, TurnsBackAsFarAsItsResultIsADouble) {
+  const ReferenceFunction& function = GetParam();
+  if (function.back.call == nullptr) return;
+  for (const ReferencePoint& point : ReadReferencePoints(function, 20)) {
+    const RoundTrip trip = TurnBack(function, point.arguments);
+    EXPECT_LE(trip.difference, trip.rounding + kTurnedBack) << function.name << " at" << ArgumentsOf(point);
+  }
+}
+
 std::string NameOf(const testing::TestParamInfo<ReferenceFunction>& info) {
   const std::string name = info.param.name;
-  return name.substr(0, name.find('('));
+  const size_t end = name.find(')');
+  const std::string part = name.size() > end + 2 ? "_" + name.substr(end + 2) : "";
+  return name.substr(0, name.find('(')) + part;
 }
 
 INSTANTIATE_TEST_SUITE_P(DistFun, ReferenceTest, testing::ValuesIn(ReferenceFunctions()), NameOf);
