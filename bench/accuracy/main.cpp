@@ -149,6 +149,29 @@ bool PrintErrors(const ReferenceFunction& function, const Points& points) {
   return ours[worst] < 1e-3;
 }
 
+bool HasWayBack(const ReferenceFunction& function) {
+  return function.back.call != nullptr;
+}
+
+void PrintRoundTrip(const ReferenceFunction& function, const Points& points) {
+  double largest = 0.0, rounding = 0.0, beyond = 0.0;
+  const ReferencePoint* worst = nullptr;
+  for (const ReferencePoint& point : points) {
+    const kestrel_tests::RoundTrip trip = TurnBack(function, point.arguments);
+    largest = std::max(largest, trip.difference);
+    rounding = std::max(rounding, trip.rounding);
+    if (worst == nullptr || trip.difference - trip.rounding > beyond) {
+      beyond = std::max(0.0, trip.difference - trip.rounding);
+      worst = &point;
+    }
+  }
+  std::printf("| `%s` | %zu | %s | %s | %s | %s |\n", function.name, points.size(),
+              Marked(largest, false).c_str(), Marked(rounding, false).c_str(),
+              Marked(beyond, beyond > kestrel_tests::kTurnedBack).c_str(),
+              Arguments(function, *worst).c_str());
+  std::fflush(stdout);
+}
+
 double SecondsSince(std::chrono::steady_clock::time_point start) {
   return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
 }
@@ -210,7 +233,7 @@ std::vector<double> MeanSeconds(const std::vector<Function>& functions, const Po
   for (const Function function : functions)
     contestants.push_back(
         {"", [function, &points, count, times] { CallAll(function, points, count, times); }});
-  std::vector<double> seconds = Compare(contestants, effort.rounds);
+  std::vector<double> seconds = Compare(contestants, effort.rounds, Least);
   for (double& one : seconds)
     one /= static_cast<double>(count) * times;
   return seconds;
@@ -241,10 +264,11 @@ void PrintTimes(const ReferenceFunction& function, const Points& points, const E
 constexpr char kIntroduction[] =
     R"(# Distribution functions: accuracy and time, measured
 
-Printed by `build/release/bench/bench_accuracy`, which judges the functions of `MCDistFun` by the tables in
+Printed by `bench/run build/release accuracy`, which judges the functions of `MCDistFun` by the tables in
 `tests/data/math/`. Their values were computed with 60 digits and more (`make_reference.py` there makes them,
-`check_reference.py` holds them against other methods) and have 25. Points cover both tails down to 1e-300, the
-neighbourhood of the mean, x near 0 and 1, and parameters from 0.1 to 1e7. `**Bold**` is what misses its goal.
+`check_reference.py` holds them against other methods) and have 25; those of samples are exact fractions
+(`make_samples.py`). Points cover both tails down to 1e-300, the neighbourhood of the mean, x near 0 and 1, and
+parameters from 0.1 to 1e7. `**Bold**` is what misses its goal.
 
 "Boost" is Boost.Math as it comes, which computes in long double here and rounds the result; "Boost, double" is
 held to double, as Kestrel always is, and as Boost.Math itself is where long double is double.
@@ -262,12 +286,26 @@ error over Boost's at the point where that is worst, an error of Boost's below 2
 |---|---|---|---|---|---|---|---|---|---|---|---|---|---|
 )";
 
+constexpr char kRoundTripHeading[] = R"(
+## Inverses turned back
+
+How far the distribution function at an inverse's result is from the p that was asked for, relative to p. An inverse can
+give no better than the double closest to the quantile, and half a unit in that double's last place is much where the
+distribution is narrow for its place: a chi-square of 1e7 degrees of freedom has a deviation of 4500. "Rounding" is the
+largest that this alone explains, "beyond" the largest rest above what it explains at that point. Goal for the rest:
+1e-12.
+
+| function | points | largest | rounding | beyond | at |
+|---|---|---|---|---|---|
+)";
+
 constexpr char kTimeHeading[] = R"(
 ## Time of a call
 
-Mean over the same points, in nanoseconds, user and system time, median of five interleaved rounds. Goals: the normal
+Mean over the same points, in nanoseconds, user and system time, best of five interleaved rounds. Goals: the normal
 functions at least as fast as Boost's, the others within 1.5 times; no call above 20 microseconds. Longest: the slowest
-point's best of five calls.
+point's best of five calls. Samples have up to 200 values, or 300 for the median's interval, and their time has that of
+making and sorting them.
 
 | function | Kestrel, ns | Boost, ns | ratio | Boost, double, ns | ratio | longest call, us | at |
 |---|---|---|---|---|---|---|---|
@@ -296,6 +334,10 @@ int Print(const std::vector<ReferenceFunction>& functions, const Effort& effort)
       std::fprintf(stderr, "bench_accuracy: %s gives a wrong answer\n", function.name);
       ++wrong;
     }
+  }
+  if (std::any_of(functions.begin(), functions.end(), HasWayBack)) std::fputs(kRoundTripHeading, stdout);
+  for (const ReferenceFunction& function : functions) {
+    if (HasWayBack(function)) PrintRoundTrip(function, ReadReferencePoints(function, effort.step));
   }
   std::fputs(kTimeHeading, stdout);
   for (const ReferenceFunction& function : functions)

@@ -37,8 +37,15 @@ inline double Median(std::vector<double> values) {
   return values[values.size() / 2];
 }
 
-/// Seconds of one turn of each contestant: the median over the rounds, after one round that does not count.
-inline std::vector<double> Compare(const std::vector<Contestant>& contestants, int rounds = 5) {
+/// What a machine that does other things as well did when it did the least of them.
+inline double Least(std::vector<double> values) {
+  return *std::min_element(values.begin(), values.end());
+}
+
+/// Seconds of one turn of each contestant: the median over the rounds, or what else `summary` makes of them,
+/// after one round that does not count.
+inline std::vector<double> Compare(const std::vector<Contestant>& contestants, int rounds = 5,
+                                   double (*summary)(std::vector<double>) = Median) {
   std::vector<std::vector<double>> seconds(contestants.size());
   for (int round = -1; round < rounds; ++round) {
     for (size_t i = 0; i < contestants.size(); ++i) {
@@ -49,10 +56,10 @@ inline std::vector<double> Compare(const std::vector<Contestant>& contestants, i
       if (round >= 0) seconds[i].push_back(spent);
     }
   }
-  std::vector<double> medians;
+  std::vector<double> summaries;
   for (const auto& one : seconds)
-    medians.push_back(Median(one));
-  return medians;
+    summaries.push_back(summary(one));
+  return summaries;
 }
 
 /// Prints each contestant's time and its ratio to the first, the baseline.
