@@ -2,8 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
+#include <random>
 
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/math/MCDistFun.h"
@@ -123,6 +125,28 @@ TEST(Binomial, InverseIsTheSmallestCountThatReachesP) {
           EXPECT_LT(Cdf(k - 1.0, n, prob), p) << n << " " << prob << " " << p;
         }
       }
+    }
+  }
+}
+
+// Also where p is a share itself, or a last digit beside it, and neighbouring counts differ by little more.
+TEST(Binomial, InverseKeepsTheRuleAtEveryShare) {
+  std::mt19937_64 random(1947);
+  std::uniform_real_distribution<double> uniform(0.0, 1.0);
+  for (int i = 0; i < 10000; ++i) {
+    const double n = std::floor(std::exp(uniform(random) * std::log(i % 3 == 0   ? 1e15
+                                                                    : i % 3 == 1 ? 1e7
+                                                                                 : 200.0)));
+    const double prob = i % 2 == 0 ? uniform(random) : std::exp(-25.0 * uniform(random));
+    const double away = (2.0 * uniform(random) - 1.0) * (i % 5 == 0 ? 36.0 : 4.0);
+    const double x = std::floor(n * prob + away * std::sqrt(n * prob * (1.0 - prob)));
+    const double share = Cdf(std::min(std::max(x, 0.0), n), n, prob);
+    for (const double p :
+         {share, std::nextafter(share, 0.0), std::nextafter(share, 1.0), share * (1.0 - 1e-13)}) {
+      if (!(p > 0.0 && p < 1.0)) continue;
+      const double k = Idf(p, n, prob);
+      ASSERT_GE(Cdf(k, n, prob), p) << n << " " << prob << " " << p;
+      ASSERT_LT(Cdf(k - 1.0, n, prob), p) << n << " " << prob << " " << p;
     }
   }
 }
