@@ -1,6 +1,7 @@
 #include "kestrel/transform/ApplyCompiler.h"
 
 #include <algorithm>
+#include <cmath>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/dictionary/ScoreValueLabelSet.h"
@@ -227,7 +228,7 @@ const double* ApplyCompiler::NumberOfValueList(Node node) {
     if (value == nullptr || KindOfValue(value) != kind) continue;
     if (kind == Kind::kText) {
       detail.listed_texts.emplace_back(WithoutTrailingBlanks(value->GetString()));
-    } else {
+    } else if (std::isfinite(value->GetDouble())) {  // anything else equals nothing
       detail.listed_numbers.push_back(value->GetDouble());
     }
   }
@@ -274,8 +275,8 @@ const double* ApplyCompiler::MethodOfOutliers(const FunctionTree* node) {
 
 const double* ApplyCompiler::NumberOfIf(Node node) {
   const double* const condition = Number(ChildOf(node, 0));
-  program_.numbers_.push_back(NumericValue::gSysmisValue);
-  double* const out = &program_.numbers_.back();
+  program_.numbers_.push_front(NumericValue::gSysmisValue);
+  double* const out = &program_.numbers_.front();
   const std::size_t test = program_.code_.size();
   Emit(ApplySteps::SkipUnlessOne).x = condition;
   const auto copy = [this, out](const double* from) {
@@ -346,8 +347,8 @@ ApplyText ApplyCompiler::TextOfReference(Node node) {
   ApplyDetail& detail = NewDetail();
   detail.source = &source;
   detail.texts = {&source.GetText(), NewConstant(TextOrEmpty(replacement))};
-  program_.text_places_.push_back(*detail.texts[1]);
-  detail.place_out = &program_.text_places_.back();
+  program_.text_places_.push_front(*detail.texts[1]);
+  detail.place_out = &program_.text_places_.front();
   Emit(ApplySteps::ReplaceMissingText).detail = &detail;
   return detail.place_out;
 }
@@ -370,19 +371,19 @@ ApplyText ApplyCompiler::TextOfFunction(Node node, const BuiltinFunction& functi
       start = Number(ChildOf(node, 1));
     }
   }
-  program_.texts_.emplace_back();
-  detail.text_out = &program_.texts_.back();
-  program_.text_places_.push_back(detail.text_out);
+  program_.texts_.emplace_front();
+  detail.text_out = &program_.texts_.front();
+  program_.text_places_.push_front(detail.text_out);
   ApplyInstruction& step = Emit(run, function.code);
   step.x = start;
   step.detail = &detail;
-  return &program_.text_places_.back();
+  return &program_.text_places_.front();
 }
 
 ApplyText ApplyCompiler::TextOfIf(Node node) {
   const double* const condition = Number(ChildOf(node, 0));
-  program_.text_places_.push_back(*EmptyText());
-  const StringValue** const out = &program_.text_places_.back();
+  program_.text_places_.push_front(*EmptyText());
+  const StringValue** const out = &program_.text_places_.front();
   const std::size_t test = program_.code_.size();
   Emit(ApplySteps::SkipUnlessOne).x = condition;
   const auto copy = [this, out](ApplyText from) {
@@ -405,8 +406,8 @@ ApplyText ApplyCompiler::TextOfImputation(Node node) {
   if (!ReadImputation(node, detail) || KindOf(ChildOf(node, 0)) != Kind::kText) return EmptyText();
   detail.texts = {Text(ChildOf(node, 0))};
   const double* const number = Number(ChildOf(node, 1));
-  program_.text_places_.push_back(*EmptyText());
-  detail.place_out = &program_.text_places_.back();
+  program_.text_places_.push_front(*EmptyText());
+  detail.place_out = &program_.text_places_.front();
   ApplyInstruction& step = Emit(ApplySteps::ImputeText, kImputeFunction);
   step.y = number;
   step.detail = &detail;
@@ -414,8 +415,8 @@ ApplyText ApplyCompiler::TextOfImputation(Node node) {
 }
 
 const double* ApplyCompiler::NewConstant(double number) {
-  program_.numbers_.push_back(number);
-  return &program_.numbers_.back();
+  program_.numbers_.push_front(number);
+  return &program_.numbers_.front();
 }
 
 const double* ApplyCompiler::MissingNumber() {
@@ -423,9 +424,9 @@ const double* ApplyCompiler::MissingNumber() {
 }
 
 ApplyText ApplyCompiler::NewConstant(const StringValue& text) {
-  program_.texts_.push_back(text);
-  program_.text_places_.push_back(&program_.texts_.back());
-  return &program_.text_places_.back();
+  program_.texts_.push_front(text);
+  program_.text_places_.push_front(&program_.texts_.front());
+  return &program_.text_places_.front();
 }
 
 ApplyText ApplyCompiler::EmptyText() {
@@ -433,8 +434,8 @@ ApplyText ApplyCompiler::EmptyText() {
 }
 
 ApplyDetail& ApplyCompiler::NewDetail() {
-  program_.details_.emplace_back();
-  return program_.details_.back();
+  program_.details_.emplace_front();
+  return program_.details_.front();
 }
 
 ApplyInstruction& ApplyCompiler::Emit(ApplyInstruction::Run run, TransformFunction function) {
@@ -446,11 +447,11 @@ ApplyInstruction& ApplyCompiler::Emit(ApplyInstruction::Run run, TransformFuncti
 
 const double* ApplyCompiler::EmitNumber(ApplyInstruction::Run run, TransformFunction function,
                                         const double* x, const double* y, ApplyDetail* detail) {
-  program_.numbers_.push_back(NumericValue::gSysmisValue);
+  program_.numbers_.push_front(NumericValue::gSysmisValue);
   ApplyInstruction& step = Emit(run, function);
   step.x = x;
   step.y = y;
-  step.out = &program_.numbers_.back();
+  step.out = &program_.numbers_.front();
   step.detail = detail;
   return step.out;
 }

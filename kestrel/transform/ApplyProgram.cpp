@@ -8,11 +8,11 @@
 namespace MCKestrel_800 {
 
 ApplyProgram::ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find) {
-  numbers_.push_back(NumericValue::gSysmisValue);
-  texts_.emplace_back();
-  text_places_.push_back(&texts_.back());
-  const double* const missing = &numbers_.back();
-  const ApplyText empty = &text_places_.back();
+  numbers_.push_front(NumericValue::gSysmisValue);
+  texts_.emplace_front();
+  text_places_.push_front(&texts_.front());
+  const double* const missing = &numbers_.front();
+  const ApplyText empty = &text_places_.front();
   number_ = missing;
   text_ = empty;
   ApplyCompiler compiler(*this, find);

@@ -4,7 +4,7 @@
 #define KESTREL_TRANSFORM_APPLYPROGRAM_H
 
 #include <cstddef>
-#include <deque>
+#include <forward_list>
 #include <functional>
 #include <string>
 #include <vector>
@@ -74,11 +74,11 @@ class ApplyProgram {
   std::vector<ApplyInstruction> code_;
   const double* number_;
   ApplyText text_;
-  // Deques, because addresses must stay.
-  std::deque<double> numbers_;
-  std::deque<StringValue> texts_;
-  std::deque<const StringValue*> text_places_;
-  std::deque<ApplyDetail> details_;
+  // Lists, because addresses must stay, and most programs hold little.
+  std::forward_list<double> numbers_;
+  std::forward_list<StringValue> texts_;
+  std::forward_list<const StringValue*> text_places_;
+  std::forward_list<ApplyDetail> details_;
 };
 
 }  // namespace MCKestrel_800

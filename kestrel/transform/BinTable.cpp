@@ -40,7 +40,7 @@ BinTable::BinTable(const std::vector<TransformVar::Bin>& bins) : bins_(bins) {
     if (range == nullptr || typeid(*range) != typeid(Range)) return;
     double low, high;
     if (!ReadEnd(range->GetMin(), -kInfinity, low) || !ReadEnd(range->GetMax(), kInfinity, high)) return;
-    if (low > high) continue;  // holds nothing
+    if (low > high) return;  // its ends may be in it, and nothing between them
     reaches.push_back({low - Tolerance(low), high + Tolerance(high), static_cast<const Range*>(range), bin});
   }
   std::sort(reaches.begin(), reaches.end(),

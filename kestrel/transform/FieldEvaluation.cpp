@@ -175,6 +175,8 @@ void FieldEvaluation::Take(const ScoreValue* value, ScoreValue& to) {
   const ScoreValue::ValueType type = value->GetType();
   if (type != to.GetType()) {
     GiveMissing(to);
+  } else if (type == ScoreValue::kDateTime && field_.GetDateTimeType() == kNoDateTime) {
+    to.SetValue(value);  // a field without a kind of its own takes the value's
   } else if (type != ScoreValue::kString) {
     GiveNumber(value->GetDouble(), to);
   } else if (typeid(*value) == typeid(StringValue)) {
