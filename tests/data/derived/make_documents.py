@@ -206,7 +206,8 @@ def bin_element(rng, field, low, high, value):
 
 
 class FunctionDeck:
-    """Deals the functions out, each of a kind before any comes again."""
+    """Deals the functions out, each of a kind before any comes again; "length" more often, since it alone shows the
+    lengths that texts have beside them."""
 
     def __init__(self, rng):
         self.rng, self.decks = rng, {NUMBER: [], TEXT: [], MOMENT: []}
@@ -214,6 +215,7 @@ class FunctionDeck:
     def __call__(self, kind):
         if not self.decks[kind]:
             self.decks[kind] = [name for name, result in all_functions() if result == kind]
+            self.decks[kind] += ["length"] * 8 if kind == NUMBER else []
             self.rng.shuffle(self.decks[kind])
         return self.decks[kind].pop()
 
@@ -223,6 +225,7 @@ def random_derived_field(rng, name, fields, functions):
     optype = rng.choice(["categorical", "ordinal"]) if data_type == "string" or rng.random() < 0.15 else "continuous"
     while True:
         field = RandomField(name, data_type, optype)
+        field.is_derived = True
         field.literals = [random_literal(rng, data_type) for _ in range(3)]
         make = RandomExpressions(rng, fields, functions)
         kinds = [make.constant, make.field_ref, make.norm_continuous, make.norm_discrete]
@@ -233,7 +236,7 @@ def random_derived_field(rng, name, fields, functions):
     expression, beside = found
     attributes = ""
     if field.kind == TEXT and rng.random() < 0.3:
-        name, width = rng.choice(["width", "stringLength"]), rng.choice([0, 1, 3, 5, 40])
+        name, width = rng.choice(["width", "stringLength"]), rng.choice([0, 1, 3, 3, 5, 40])
         if rng.random() < 0.5:
             beside.append(f'<Extension name="{name}" value="{width}"/>')
         else:

@@ -30,7 +30,7 @@ class RandomField:
         self.name, self.data_type, self.optype = name, data_type, optype
         self.kind = TEXT if data_type == "string" else MOMENT if data_type in DATE_TYPES else NUMBER
         self.literals, self.values = [], []
-        self.has_labels = False
+        self.has_labels = self.is_derived = False
 
     def literal(self, rng):
         return rng.choice(self.literals) if rng.random() < 0.8 else random_literal(rng, self.data_type)

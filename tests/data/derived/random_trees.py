@@ -153,6 +153,10 @@ class RandomTree:
                 return self.reference(field) + "".join(self.constant(field.kind, [text]) for text in literals)
             return self.reference(field) + self.array(field.kind, literals)
         if name == "length":
+            # That of a derived field may be another than its text's.
+            derived = [field for field in self.of_kind(TEXT) if field.is_derived]
+            if derived and rng.random() < 0.7:
+                return self.reference(rng.choice(derived))
             return self.argument(TEXT, depth - 1, TEXT_FUNCTIONS)
         if name == "concat":
             return self.arguments(rng.choice([1, 2, 3]), TEXT, depth, TEXT_FUNCTIONS)
