@@ -58,7 +58,7 @@ DoubleDouble ExponentAt(const ChiQuotient& q, double nc, double u) {
 /// The line through the saddle point, or a little beside it when that would lead through the pole at t = 0.
 Line ChooseLine(const ChiQuotient& q, double nc, const ChiSaddle& saddle) {
   const double square = 0.5 * (q.df1 + q.df2 * saddle.part * saddle.part) + nc * saddle.w;
-  const double gap = std::min(0.5 / std::sqrt(square), 0.3 / saddle.part);
+  const double gap = std::min(0.5 / std::sqrt(square), 0.3 / std::max(saddle.part, 1e-300));
   Line line{};
   if (std::fabs(saddle.u) >= gap) {
     line.u = saddle.u;
@@ -67,8 +67,11 @@ Line ChooseLine(const ChiQuotient& q, double nc, const ChiSaddle& saddle) {
   } else {
     line.u = std::copysign(gap, saddle.u);
     line.w = 1.0 + line.u;
-    line.part = q.df2 > 0.0 ? q.odds.high / (line.w + q.odds.high * line.u) : 0.0;
-    line.tilt = 0.5 * (q.df1 + nc * line.w - (q.df2 > 0.0 ? q.df2 * line.part : q.bound.high / line.w));
+    const double slant = q.df1 + nc * line.w;
+    const double divisor = line.w + q.odds.high * line.u;
+    const double below = (AddExactly(q.df1, nc) - q.bound).high;
+    line.part = q.df2 > 0.0 ? q.odds.high / divisor : 0.0;
+    line.tilt = 0.5 * (below + line.u * (slant + nc + slant * q.odds.high)) / divisor;
   }
   line.exponent = ExponentAt(q, nc, line.u);
   return line;
@@ -112,7 +115,7 @@ ChiSaddle FindSaddle(const ChiQuotient& q, double nc) {
 // descent there, so that nothing oscillates. The trapezoidal rule in theta, y = reach sinh(theta), converges
 // exponentially; the pole of 1 / t, which may be close, is taken out by its residue.
 NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle& saddle, SumCare care) {
-  const double digits = care == SumCare::kRough ? 17.0 : 36.0;
+  const double digits = care == SumCare::kRough ? 17.0 : 40.0;
   const Line line = ChooseLine(q, nc, saddle);
   const double pull = nc * line.w;
   const double spread = 0.5 * (q.df1 + q.df2 * line.part * line.part) + pull;
@@ -123,27 +126,29 @@ NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle&
     const double inside = 1.0 + 4.0 * bend * z;
     return inside > 0.0 ? 2.0 * std::fabs(z) / (1.0 + std::sqrt(inside)) : 0.5 / std::fabs(bend);
   };
-  const double reach = 0.85 * std::min(height(1.0), height(-1.0 / line.part));
+  const double reach =
+      0.85 * (line.part > 0.0 ? std::min(height(1.0), height(-1.0 / line.part)) : height(1.0));
   // Inside a strip of that width the integrand grows at most as e to the power of the square below.
   const double strip = std::min(0.7, 6.0 / (scale * reach));
   const double growth = scale * reach * strip;
   const double h = 2.0 * kPi * strip / (digits + growth * growth);
-  const double grow = std::exp(h);
-  const double shrink = 1.0 / grow;
+  // y and its derivative, hyperbolic sine and cosine, go on by their addition theorem: nothing cancels.
+  const double turn = std::sinh(h);
+  const double keep = std::cosh(h);
   double share = 0.5 * reach / line.u;
   double slope = 0.5 * reach;
   double curve = 0.25 * reach * line.u;
-  double up = 0.5 * reach, down = 0.5 * reach;
+  double y = 0.0, rate = reach;
   constexpr int kNodeLimit = 500;
   for (int node = 0; node < kNodeLimit; ++node) {
-    up *= grow;
-    down *= shrink;
-    const double y = up - down;
+    const double before = y;
+    y = keep * y + turn * rate;
+    rate = keep * rate + turn * before;
     const Complex z(-bend * y * y, y);
     const Complex inverse = Reciprocal(1.0 - z);
     Complex exponent = 0.5 * (q.df1 * Deviance(-z) + pull * (z * z * inverse)) + line.tilt * z;
     if (q.df2 > 0.0) exponent += 0.5 * q.df2 * Deviance(line.part * z);
-    const double weight = (up + down) * std::exp(exponent.real());
+    const double weight = rate * std::exp(exponent.real());
     const Complex power = Complex(weight * std::cos(exponent.imag()), weight * std::sin(exponent.imag())) *
                           Complex(1.0, 2.0 * bend * y);
     const Complex change = power * inverse;

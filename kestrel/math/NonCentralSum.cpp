@@ -77,7 +77,10 @@ class Mixture {
 
   MixtureShare Sum(double first, bool upper) const {
     const double u = first + std::floor(std::max(0.0, peak_ - first));
-    const double scale = Weight(u) * family_.Drop(start_ + u);
+    // A large start has a last digit that shows: the drop is taken from the rounded place to the right one.
+    const DoubleDouble place = AddExactly(start_, u);
+    const double moved = 1.0 + place.low * std::log(family_.Growth(place.high));
+    const double scale = Weight(u) * family_.Drop(place.high) * moved;
     if (!(scale > 0.0)) return {0.0, 0.0, 0.0};
     return Scaled(upper ? UpperRun(first, u) : LowerRun(first, u), scale);
   }
