@@ -117,7 +117,8 @@ class FieldRef(Expression):
         value = case.value(self.source)
         if value is not None and self.replacement is not None and self.source.is_missing(value):
             return self.replacement
-        return value
+        # A text is copied without the length beside it.
+        return text_of(value.data) if isinstance(value, Text) else value
 
 
 class NormContinuous(Expression):

@@ -240,6 +240,10 @@ class TestEvaluator(unittest.TestCase):
         self.expect(number('<FieldRef field="x"/>'), {"x": -99.0}, -99.0)
         self.expect('dataType="string"><Extension name="width" value="3"/><FieldRef field="u"/>',
                     {"u": text_of("abcd")}, "abc")
+        cut = text(f'<Apply function="substr">{constants("u 3")}</Apply>')
+        for copied, wanted in [("f0", 3.0), ("f1", 4.0)]:
+            length = number(f'<Apply function="length">{constants(copied)}</Apply>')
+            self.expect([cut, text('<FieldRef field="f0"/>'), length], {"u": text_of("abcdef")}, wanted)
         self.expect(number("<Constant>no number</Constant>"), {}, S)
         chain = [number('<FieldRef field="x"/>'), number(f'<Apply function="+">{constants("f0 1")}</Apply>'),
                  number('<FieldRef field="f1"/>')]
