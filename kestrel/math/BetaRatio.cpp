@@ -47,7 +47,7 @@ double LogGammaGrowth(double a, double b) {
 
 double PowerOfSmallA(DoubleDouble x, DoubleDouble y, double a, double b) {
   return a * ReciprocalGamma1(a) * std::pow(b * x.high, a) *
-         GuardedExpMinus(-(LogOf(y, x) * b + LogGammaGrowth(a, b)));
+         ExpMinus(-(LogOf(y, x) * b + LogGammaGrowth(a, b)));
 }
 
 double PowerOfSmallBoth(double x, double y, double a, double b) {
@@ -104,7 +104,7 @@ double LargeAExpansion(const BetaCase& c, int steps) {
   const double log_x = exact_log.high;
   const double z = exact_z.high;
   if (!(z > 0.0)) return 1.0;
-  const GammaShare gamma = FindGammaShare(exact_z, b, true);
+  const GammaShare gamma = FindSmallShare(exact_z, b);
   if (gamma.power == 0.0) return 0.0;
   const double scale = std::exp(LogGammaGrowth(b, a) - b * std::log1p(shift.high / a));
   const double v = 0.25 / nu / nu;
@@ -269,7 +269,7 @@ double NormalExpansion(const BetaCase& c) {
     before = integral;
     integral = next;
   }
-  return GuardedExpMinus(deviance + correction) * sum;
+  return ExpMinus(deviance + correction) * sum;
 }
 
 // The expansion for large a after as many steps of the recurrence as it takes to get there.
@@ -290,7 +290,7 @@ Tail FindSmallShape(const BetaCase& c) {
     if (c.b <= 1.0) return {ForwardSum(c, kTermLimit), false};
     if (c.at.x.high >= 0.29) return {ForwardSum(c.Reflected(), kTermLimit), true};
     // With x so small the sum in x is short, and its result is not so close to 1 that the rest would be lost.
-    if (c.at.x.high < 0.3 && c.b * c.at.x.high <= 0.7 && std::pow(c.at.x.high * c.b, c.a) <= 0.7) {
+    if (c.at.x.high < 0.3 && c.b * c.at.x.high <= 0.7 && std::pow(c.at.x.high * c.b, c.a) <= 0.6) {
       return {ForwardSum(c, kTermLimit), false};
     }
     return {ExpandLargeA(c.Reflected()), true};
@@ -345,7 +345,7 @@ double BetaPower(const BetaPoint& point, double a, double b) {
   if (a < 1.0) return PowerOfSmallA(point.x, point.y, a, b);
   if (b < 1.0) return PowerOfSmallA(point.y, point.x, b, a);
   const double correction = StirlingError(a) + StirlingError(b) - StirlingError(a + b);
-  return std::sqrt(a / (a + b) * (b / kTwoPi)) * GuardedExpMinus(BetaDeviance(point, a, b) + correction);
+  return std::sqrt(a / (a + b) * (b / kTwoPi)) * ExpMinus(BetaDeviance(point, a, b) + correction);
 }
 
 double BetaRatio(const BetaPoint& point, double a, double b, bool upper) {

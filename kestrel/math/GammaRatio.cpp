@@ -112,6 +112,14 @@ GammaShare ShareByTemme(double deviation, double a, DoubleDouble deviance, bool 
   return {Choose(tail, above, upper), exponential * a / scale * std::exp(-StirlingError(a))};
 }
 
+// Q(a, x) for a <= 1, given e^-x.
+GammaShare UpperShare(double x, double a, double exponential) {
+  const double power = a * ReciprocalGamma1(a) * std::pow(x, a) * exponential;
+  if (a < 1.0 && x < kSmallX) return {std::max(0.0, UpperOfSmallShape(x, a)), power};
+  if (a == 0.5) return {exponential * ScaledErfc(std::sqrt(x)), power};
+  return {power * UpperFraction(x, a), power};
+}
+
 }  // namespace
 
 double ReciprocalGamma1(double a) {
@@ -146,14 +154,17 @@ GammaShare FindGammaShare(DoubleDouble x, double a, bool upper) {
     if (deviance.high <= 0.5 * kTemmeReach * kTemmeReach * a)
       return ShareByTemme(deviation.high, a, deviance, upper);
   }
-  const double power = GammaPower(x, a);
   const double at = x.high;
-  if (a < 1.0 && at < kSmallX && upper) return {std::max(0.0, UpperOfSmallShape(at, a)), power};
-  if (a == 0.5 && upper) return {GuardedExpMinus(x) * ScaledErfc(std::sqrt(at)), power};
+  if (a < 1.0 && upper) return UpperShare(at, a, GuardedExpMinus(x));
+  const double power = GammaPower(x, a);
   if (at < std::max(a, kSmallX))
     return {Choose(std::min(1.0, power * LowerSeries(x, a)), false, upper), power};
   if (power == 0.0) return {upper ? 0.0 : 1.0, power};
   return {Choose(power * UpperFraction(at, a), true, upper), power};
+}
+
+GammaShare FindSmallShare(DoubleDouble x, double a) {
+  return UpperShare(x.high, a, ExpMinus(x));
 }
 
 double GammaRatio(DoubleDouble x, double a, bool upper) {

@@ -26,6 +26,9 @@ struct GammaShare {
 };
 GammaShare FindGammaShare(DoubleDouble x, double a, bool upper);
 
+/// The share above x for a <= 1, where parts too small for a result of their own count.
+GammaShare FindSmallShare(DoubleDouble x, double a);
+
 double GammaRatio(DoubleDouble x, double a, bool upper);
 
 }  // namespace MCMath_800

@@ -37,6 +37,13 @@ BetaPoint PointOfOdds(DoubleDouble odds, double a, double b) {
   return {odds * y, y, (odds * b - a) * y};
 }
 
+// f df1 / df2, in an order that keeps it in range where it can.
+DoubleDouble OddsOfF(double f, double df1, double df2) {
+  const double quotient = f / df2;
+  if (quotient > 1e-290 && quotient < 1e290) return DoubleDouble(f) / df2 * df1;
+  return MultiplyExactly(f, df1) / df2;
+}
+
 // Beyond this logarithm of the odds the leading power of that end is all there is to the beta distribution.
 constexpr double kExtremeLogOdds = -600.0;
 
@@ -154,6 +161,7 @@ double MCDistFun::cdfbet(const double& x, const double& a, const double& b, long
 double MCDistFun::betinv(const double& p, const double& a, const double& b, long& err) {
   const DoubleDouble odds = FindOdds(p, 1.0 - p, a, b, StartOdds(p, 1.0 - p, a, b));
   err = std::isnan(odds.high) ? 1 : 0;
+  if (std::isinf(odds.high)) return 1.0;
   const DoubleDouble one = 1.0;
   return odds.high <= 1.0 ? Rounded(odds / (one + odds)) : Rounded(one - one / (one + odds));
 }
@@ -191,7 +199,8 @@ double MCDistFun::vexaidft(const double& p, const double& df, long& err) {
   if (df == 1.0) {
     size = tail > 0.25 ? std::tan(kPi * (0.5 - tail)) : 1.0 / std::tan(kPi * tail);
   } else if (extreme.high < kExtremeLogOdds) {
-    size = GuardedExpMinus(extreme * 0.5) * std::sqrt(df);
+    constexpr double kInfinity = std::numeric_limits<double>::infinity();
+    size = std::isinf(extreme.high) ? kInfinity : GuardedExpMinus((extreme - Log(df)) * 0.5);
   } else {
     const double twice = 2.0 * tail;
     const double square = df > 1.0 && df < 1e9 ? HillSquare(twice, df, extreme.high) : 0.0;
@@ -204,7 +213,8 @@ double MCDistFun::vexaidft(const double& p, const double& df, long& err) {
 
 // Of x = df1 f / (df1 f + df2) the distance from the mean is formed of f - 1, which near the mean is exact.
 double MCDistFun::vexaratf(const double& f, const double& df1, const double& df2, bool upper, long& err) {
-  const DoubleDouble odds = DoubleDouble(f) / df2 * df1;
+  const DoubleDouble odds = OddsOfF(f, df1, df2);
+  if (!std::isfinite(odds.high)) return upper ? 0.0 : 1.0;
   const DoubleDouble y = DoubleDouble(1.0) / (odds + 1.0);
   return cbtaux({odds * y, y, y * AddExactly(f, -1.0) * (0.5 * df1)}, HalfOf(df1), HalfOf(df2), upper, err);
 }

@@ -6,8 +6,8 @@
 #include "kestrel/math/ErfcTable.h"
 #include "kestrel/math/ErrorFunction.h"
 #include "kestrel/math/MCDistFun.h"
-#include "kestrel/math/MCPower.h"
 #include "kestrel/math/Polynomial.h"
+#include "kestrel/math/SaddlePoint.h"
 
 namespace MCMath_800 {
 
@@ -109,14 +109,10 @@ constexpr double kF[] = {1.0,
 constexpr double kSqrt2 = 1.41421356237309504880;
 constexpr double kSqrtPi = 1.77245385090551602730;
 
-// y exp(-half_square), where y is the scaled complement and half_square = base^2 * factor (1 or 1/2). A
-// square of 700 is off by 1e-13 when it is rounded, and so would be the exponential: it is taken of a part of
-// base whose square is exact, and of the small rest.
+// y exp(-base^2 * factor), where y is the scaled complement and factor 1 or 1/2. A square of 700 is off by
+// 1e-13 when it is rounded, and so would be the exponential.
 double TailExponential(double y, double base, double factor) {
-  if (!(base * base * factor <= 708.39)) return 0.0;
-  const double head = std::floor(base * 16.0) * 0.0625;
-  const double rest = (base - head) * (base + head) * factor;
-  const double tail = y * std::exp(-head * head * factor) * std::exp(-rest);
+  const double tail = y * GuardedExpMinus(MultiplyExactly(base, base) * factor);
   return tail < kSmallestErfc ? 0.0 : tail;
 }
 

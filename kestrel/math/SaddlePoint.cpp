@@ -125,9 +125,12 @@ double LogDeviance(double u) {
 }
 
 double GuardedExpMinus(DoubleDouble x) {
-  if (!(x.high <= -MCPower::gMachineMinExp)) return 0.0;
+  return x.high <= -MCPower::gMachineMinExp ? ExpMinus(x) : 0.0;
+}
+
+double ExpMinus(DoubleDouble x) {
   const double main = std::exp(-x.high);
-  return main - main * x.low;
+  return main == 0.0 || std::isinf(main) ? main : main - main * x.low;
 }
 
 // The name and the use of this function are C. Loader's, "Fast and accurate computation of binomial

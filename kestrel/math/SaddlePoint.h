@@ -41,8 +41,10 @@ DoubleDouble Deviance(const Mean& mean, DoubleDouble distance, DoubleDouble coun
   return LogDeviance(Split(u)) * count;
 }
 
-/// exp(-x), 0 when x is past the exponential's limit (or no number). x > -709.
+/// exp(-x); 0 when x is past the exponential's limit, or no number.
 double GuardedExpMinus(DoubleDouble x);
+/// The same down to the smallest numbers that there are: what is added to something larger may be one.
+double ExpMinus(DoubleDouble x);
 
 /// ln Gamma(a) - ((a - 1/2) ln a - a + ln(2 pi) / 2), the error of Stirling's formula, for a > 0.
 double StirlingError(double a);

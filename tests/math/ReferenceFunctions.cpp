@@ -17,8 +17,8 @@ namespace {
 
 using MCMath_800::MCDistFun;
 
-constexpr AccuracyGoal kCentral = {1e-14, 1e-12};
-constexpr AccuracyGoal kInverse = {1e-12, 1e-12};
+constexpr AccuracyGoal kCentral = {2e-15, 2e-15};
+constexpr AccuracyGoal kInverse = {1e-14, 1e-14};
 constexpr AccuracyGoal kExact = {0.0, 0.0};
 constexpr AccuracyGoal kNonCentral = {1e-10, 1e-10};
 
@@ -228,6 +228,17 @@ double RelativeError(double value, const ReferencePoint& point) {
   const long double difference = std::fabs(static_cast<long double>(value) - point.value);
   const long double error = difference == 0.0L ? 0.0L : difference / std::fabs(point.value);
   return std::isnan(error) ? std::numeric_limits<double>::infinity() : static_cast<double>(error);
+}
+
+double Condition(const ReferenceFunction& function, const ReferencePoint& point) {
+  if (function.back.call == nullptr) return 0.0;
+  // So small that the probability is a straight line, so large that its rounding does not show.
+  constexpr double kStep = 0x1p-30;
+  const auto back = [&](double factor) {
+    return function.back.call(point.arguments, static_cast<double>(point.value) * factor);
+  };
+  return 2.0 * kStep * point.arguments[function.back.place] /
+         std::fabs(back(1.0 + kStep) - back(1.0 - kStep));
 }
 
 RoundTrip TurnBack(const ReferenceFunction& function, const double* arguments) {

@@ -58,6 +58,10 @@ std::vector<ReferencePoint> ReadReferencePoints(const ReferenceFunction& functio
 /// |value - point.value| / |point.value|; an infinity for a NaN. A right value of 0 has to be met exactly.
 double RelativeError(double value, const ReferencePoint& point);
 
+/// How many times the relative error of an inverse's p is found in its result; 0 for functions without a way
+/// back.
+double Condition(const ReferenceFunction& function, const ReferencePoint& point);
+
 /// How far the probability of an inverse's result is from the one asked for.
 struct RoundTrip {
   /// Relative to p.
