@@ -115,7 +115,7 @@ ChiSaddle FindSaddle(const ChiQuotient& q, double nc) {
 // descent there, so that nothing oscillates. The trapezoidal rule in theta, y = reach sinh(theta), converges
 // exponentially; the pole of 1 / t, which may be close, is taken out by its residue.
 NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle& saddle, SumCare care) {
-  const double digits = care == SumCare::kRough ? 17.0 : 40.0;
+  const double digits = care == SumCare::kRough ? 15.0 : 35.0;
   const Line line = ChooseLine(q, nc, saddle);
   const double pull = nc * line.w;
   const double spread = 0.5 * (q.df1 + q.df2 * line.part * line.part) + pull;
