@@ -113,6 +113,10 @@ const double* ApplyCompiler::Seconds(const FunctionTree* node) {
   if (ApplyProgram::IsReference(*node) && node->GetNodeStats().GetFieldrefRecodeMissValueTo() == nullptr) {
     return &find_(node->GetNodeStats().GetParameterName()).GetSeconds();
   }
+  if (FunctionOf(*node) == kIfFunction) {
+    const Level level(*this);
+    return is_too_deep_ ? MissingNumber() : Choose(*node, &ApplyCompiler::Seconds);
+  }
   return KindOf(node) == Kind::kDateTime ? Number(node) : MissingNumber();
 }
 
@@ -163,7 +167,7 @@ const double* ApplyCompiler::NumberOfSpecial(Node node, TransformFunction functi
     case kOutlierHandleFunction:
       return NumberOfOutlier(node);
     case kIfFunction:
-      return NumberOfIf(node);
+      return Choose(node, &ApplyCompiler::Number);
     case kImputeFunction:
       return NumberOfImputation(node);
     default: {  // the number of a value, unchanged
@@ -273,7 +277,8 @@ const double* ApplyCompiler::MethodOfOutliers(const FunctionTree* node) {
   return NewConstant(name == "asMissingValues" ? ScoreDictVar::kAsMissingValues : ScoreDictVar::kAsIs);
 }
 
-const double* ApplyCompiler::NumberOfIf(Node node) {
+// Both arguments are laid out as the kind that is needed, whatever the other one is.
+const double* ApplyCompiler::Choose(Node node, const double* (ApplyCompiler::*lay_out)(const FunctionTree*)) {
   const double* const condition = Number(ChildOf(node, 0));
   program_.numbers_.push_front(NumericValue::gSysmisValue);
   double* const out = &program_.numbers_.front();
@@ -284,11 +289,11 @@ const double* ApplyCompiler::NumberOfIf(Node node) {
     step.x = from;
     step.out = out;
   };
-  copy(Number(ChildOf(node, 1)));
+  copy((this->*lay_out)(ChildOf(node, 1)));
   const std::size_t jump = program_.code_.size();
   Emit(ApplySteps::Skip);
   program_.code_[test].skip = jump - test;
-  copy(Number(ChildOf(node, 2)));
+  copy((this->*lay_out)(ChildOf(node, 2)));
   program_.code_[jump].skip = program_.code_.size() - jump - 1;
   return out;
 }

@@ -44,7 +44,7 @@ class ApplyCompiler {
   const double* NumberOfValueList(Node node);
   const double* NumberOfMissingTest(Node node);
   const double* NumberOfOutlier(Node node);
-  const double* NumberOfIf(Node node);
+  const double* Choose(Node node, const double* (ApplyCompiler::*lay_out)(const FunctionTree*));
   const double* NumberOfImputation(Node node);
   const double* MethodOfOutliers(const FunctionTree* node);
   const double* Replaced(Node node, const double* result);

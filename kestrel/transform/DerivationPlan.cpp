@@ -197,7 +197,8 @@ void DerivationPlan::GiveCodes() {
 }
 
 void DerivationPlan::UseCodes(Step& step) {
-  if (step.reads.size() != 1) return;
+  // A table without rows has none.
+  if (step.reads.size() != 1 || sources_[step.reads.front()].codes == nullptr) return;
   const TextCodes& codes = *sources_[step.reads.front()].codes;
   const EncodingTable& encodings = step.evaluation->GetEncodings();
   const std::vector<const StringValue*> texts = encodings.GetTexts();

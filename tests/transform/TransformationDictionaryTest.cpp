@@ -193,6 +193,39 @@ TEST(DerivedValues, OfTreesThatAreTooDeepAreMissing) {
   }
 }
 
+TEST(DerivedValues, OfIfAreWhatItsChosenArgumentIs) {
+  Data data;
+  data.record.SetValue("t", "text");
+  data.record.SetValue("d", 1.0, kDateDaysSince1970);
+  TransformationDictionary dictionary;
+  const auto choose = [](const char* second, FunctionTree* third) {
+    return Call(kIfFunction, {FieldLeaf("x"), FieldLeaf(second), third});
+  };
+  AddDerived(dictionary, NewApply("text or number", choose("t", ConstantLeaf(Number(5)))));
+  AddDerived(dictionary, NewApply("date or number", choose("d", ConstantLeaf(Number(5)))));
+  AddDerived(dictionary,
+             NewApply("year", Call(kYearFromDateFunction, {choose("d", ConstantLeaf(Number(5)))})));
+  AddDerived(dictionary, NewApply("absent", Call(kIfFunction, {FieldLeaf("x"), ConstantLeaf(Number(3))})));
+  AddDerived(dictionary, NewApply("number or text", choose("y", FieldLeaf("t")), kText));
+  TransformVar* const empty_map = NewField("empty map", "t", TransExpression::kMapValues);
+  empty_map->SetRecodeDefaultValue(Number(9));
+  AddDerived(dictionary, empty_map);
+  dictionary.SetUpDerivedCaseRecord();
+  data.record.SetValue("x", 1);
+  EXPECT_EQ(NumberOf(dictionary, data, "text or number"), kSysmis);
+  EXPECT_EQ(NumberOf(dictionary, data, "date or number"), 86400);
+  EXPECT_EQ(NumberOf(dictionary, data, "year"), 1970);
+  EXPECT_EQ(NumberOf(dictionary, data, "absent"), 3);
+  EXPECT_EQ(dictionary.GetVarValue("number or text")->GetString(), "");
+  EXPECT_EQ(NumberOf(dictionary, data, "empty map"), 9);
+  data.record.SetValue("x", 0);
+  EXPECT_EQ(NumberOf(dictionary, data, "text or number"), 5);
+  EXPECT_EQ(NumberOf(dictionary, data, "date or number"), 5);
+  EXPECT_EQ(NumberOf(dictionary, data, "year"), kSysmis) << "a number is no date";
+  EXPECT_EQ(NumberOf(dictionary, data, "absent"), kSysmis);
+  EXPECT_EQ(dictionary.GetVarValue("number or text")->GetString(), "text");
+}
+
 TEST(DerivedValues, AreComputedWhereTheyAreWanted) {
   Data data;
   data.record.SetValue("x", 1);
