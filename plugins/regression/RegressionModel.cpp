@@ -4,7 +4,6 @@
 #include <ostream>
 #include <utility>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/foundation/NumberText.h"
 #include "kestrel/model/Results.h"
@@ -17,10 +16,10 @@ namespace MCKestrel_800 {
 
 using MCScore::MCStatus;
 
-RegressionModel::RegressionModel(std::unique_ptr<ScoreDictionary> dictionary, Definition definition,
+RegressionModel::RegressionModel(ModelDictionaries dictionaries, Definition definition,
                                  const std::string& target)
     : definition_(std::move(definition)) {
-  SetScoreDictionary(dictionary.release());
+  dictionaries.GiveTo(*this);
   definition_.schema.SetRoles(*this);
   if (!target.empty()) SetVarRole(target, kTarget);
   if (definition_.is_classification) {
@@ -44,7 +43,7 @@ void RegressionModel::CompileEquations(const std::vector<int>& tables) {
     equations_.emplace_back(table == CategoryPlan::kConstantZero ? constant_zero : definition_.tables[table],
                             inputs_);
   }
-  inputs_.Seal();
+  inputs_.Seal(definition_.schema, *GetDictionary(), GetTransformationDictionary());
   for (RegressionEquation& equation : equations_)
     equation.Compile(inputs_);
   y_.resize(equations_.size());
@@ -112,10 +111,7 @@ bool RegressionModel::Classify(ScoreResult& result) {
 }
 
 std::vector<const ScoreDictVar*> RegressionModel::GetPredictors() const {
-  std::vector<const ScoreDictVar*> variables;
-  for (const MiningField* field : inputs_.GetFields())
-    variables.push_back(field->variable);
-  return variables;
+  return inputs_.GetPredictors();
 }
 
 ScoreResult* RegressionModel::MakeResult() const {

@@ -16,6 +16,7 @@
 #include "plugins/regression/RegressionTable.h"
 #include "plugins/support/CaseVector.h"
 #include "plugins/support/MiningSchema.h"
+#include "plugins/support/ModelDictionaries.h"
 
 namespace MCKestrel_800 {
 
@@ -36,15 +37,15 @@ class RegressionModel : public BaseModel {
     std::vector<RegressionTable> tables;
   };
 
-  /// dictionary  taken over, whatever happens; the definition's schema and tables speak of its variables.
-  /// target      the name of the variable that is predicted; empty for none.
+  /// dictionaries  taken over, whatever happens; the definition's schema and tables speak of their variables.
+  /// target        the name of the variable that is predicted; empty for none.
   /// Errors (KestrelException without place): those of CategoryPlan; code 5 for "simplemax" in a regression.
-  RegressionModel(std::unique_ptr<ScoreDictionary> dictionary, Definition definition,
-                  const std::string& target);
+  RegressionModel(ModelDictionaries dictionaries, Definition definition, const std::string& target);
   ~RegressionModel() override;
 
   MCScore::MCStatus Score(const ScoreCaseRecord* record, ScoreResult* result) override;
-  /// The active fields that the equations use, in the order in which the document first names them.
+  /// The data fields that the equations use, in the order in which the document first names them; those that
+  /// a derived field is computed from stand in its place.
   std::vector<const ScoreDictVar*> GetPredictors() const override;
   /// A RegResult or, for a classification, a ClsResult.
   ScoreResult* MakeResult() const override;

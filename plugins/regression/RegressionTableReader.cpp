@@ -127,8 +127,8 @@ const MiningField* RegressionTableReader::FindField(const DOMElement* element, c
     FailAt(element, KestrelException::kStructure,
            "<" + Narrow(element->getTagName()) + ">'s " + attribute + " can't be null string !!");
   }
-  const MiningField* field = schema_.Find(name);
-  if (field == nullptr || field->role != ScoreModel::kPredictor) {
+  const MiningField* field = schema_.FindInput(name);
+  if (field == nullptr) {
     FailAt(element, KestrelException::kUnknownVariable,
            "Variable " + name + " not among the active fields of the MiningSchema!");
   }

@@ -26,7 +26,7 @@ namespace MCKestrel_800 {
 ///            `targetCategory`) and absent;
 ///   code 7   a `targetCategory` or a `CategoricalPredictor`'s value that is no value of its field, or not
 ///            one of the categories that the field lists;
-///   code 8   a predictor that is not one of the active fields;
+///   code 8   a predictor that is neither one of the active fields nor a derived field;
 ///   code 11  a text field where a number is needed.
 class RegressionTableReader {
  public:

@@ -4,7 +4,6 @@
 
 #include <utility>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -47,8 +46,8 @@ std::vector<RegressionTable> ReadTables(const DOMElement* element, const Regress
 RegressionTranslator::RegressionTranslator() : ModelTranslator(PMMLModelTags::XML_ELE_REGMODEL) {}
 
 std::unique_ptr<ScoreModel> RegressionTranslator::BuildModel(DOMElement* element,
-                                                             std::unique_ptr<ScoreDictionary> dictionary) {
-  ModelFrame frame = ReadFrame(element, *dictionary);
+                                                             ModelDictionaries dictionaries) {
+  ModelFrame frame = ReadFrame(element, dictionaries);
   RegressionModel::Definition definition;
   definition.is_classification = frame.is_classification;
   definition.normalization = ReadNormalization(element);
@@ -56,7 +55,7 @@ std::unique_ptr<ScoreModel> RegressionTranslator::BuildModel(DOMElement* element
   definition.tables = ReadTables(element, RegressionTableReader(definition.schema, frame.target_variable),
                                  definition.is_classification);
   try {
-    return std::make_unique<RegressionModel>(std::move(dictionary), std::move(definition), frame.target);
+    return std::make_unique<RegressionModel>(std::move(dictionaries), std::move(definition), frame.target);
   } catch (const KestrelException& fault) {
     FailAt(element, static_cast<KestrelException::ExceptionCode>(fault.GetErrorCode()),
            fault.GetErrorMessage());

@@ -9,8 +9,7 @@
 
 namespace MCKestrel_800 {
 
-/// Builds models from the `RegressionTable`s of a `RegressionModel` element. A predictor that names a derived
-/// field is an error.
+/// Builds models from the `RegressionTable`s of a `RegressionModel` element.
 ///
 /// Errors, all KestrelException with the place in the document where it is known, beside those of
 /// ModelTranslator, RegressionTableReader and CategoryPlan:
@@ -24,7 +23,7 @@ class RegressionTranslator : public ModelTranslator {
 
  protected:
   std::unique_ptr<ScoreModel> BuildModel(xercesc::DOMElement* element,
-                                         std::unique_ptr<ScoreDictionary> dictionary) override;
+                                         ModelDictionaries dictionaries) override;
 };
 
 }  // namespace MCKestrel_800

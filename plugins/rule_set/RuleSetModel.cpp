@@ -3,7 +3,6 @@
 #include <ostream>
 #include <utility>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/NumberText.h"
 #include "kestrel/model/ResultEntities.h"
 #include "kestrel/model/Results.h"
@@ -14,11 +13,11 @@ namespace MCKestrel_800 {
 
 using MCScore::MCStatus;
 
-RuleSetModel::RuleSetModel(std::unique_ptr<ScoreDictionary> dictionary, Definition definition)
+RuleSetModel::RuleSetModel(ModelDictionaries dictionaries, Definition definition)
     : definition_(std::move(definition)),
       rule_set_(*definition_.rule_set),
       selector_(rule_set_.selection, rule_set_.rules, static_cast<std::size_t>(rule_set_.scores.GetCount())) {
-  SetScoreDictionary(dictionary.release());
+  dictionaries.GiveTo(*this);
   definition_.frame.schema.SetRoles(*this);
   if (!definition_.frame.target.empty()) SetVarRole(definition_.frame.target, kTarget);
   if (definition_.frame.is_classification) {
@@ -95,10 +94,7 @@ bool RuleSetModel::FindProbabilities(const RuleSelector::Choice& choice) {
 }
 
 std::vector<const ScoreDictVar*> RuleSetModel::GetPredictors() const {
-  std::vector<const ScoreDictVar*> variables;
-  for (const MiningField* field : definition_.inputs->GetFields())
-    variables.push_back(field->variable);
-  return variables;
+  return definition_.inputs->GetPredictors();
 }
 
 ScoreResult* RuleSetModel::MakeResult() const {

@@ -42,12 +42,13 @@ class RuleSetModel : public BaseModel {
     std::unique_ptr<RuleSet> rule_set;
   };
 
-  /// dictionary  taken over, whatever happens; the definition speaks of its variables.
-  RuleSetModel(std::unique_ptr<ScoreDictionary> dictionary, Definition definition);
+  /// dictionaries  taken over, whatever happens; the definition speaks of their variables.
+  RuleSetModel(ModelDictionaries dictionaries, Definition definition);
   ~RuleSetModel() override;
 
   MCScore::MCStatus Score(const ScoreCaseRecord* record, ScoreResult* result) override;
-  /// The active fields that the predicates use, in the order in which the document first names them.
+  /// The data fields that the predicates use, in the order in which the document first names them; those that
+  /// a derived field is computed from stand in its place.
   std::vector<const ScoreDictVar*> GetPredictors() const override;
   /// A RegResult or, for a classification, a ClsResult.
   ScoreResult* MakeResult() const override;

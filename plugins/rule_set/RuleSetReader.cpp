@@ -4,7 +4,6 @@
 
 #include <cmath>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
@@ -116,8 +115,7 @@ int RuleSetReader::FindScore(const DOMElement* element, const char16_t* attribut
 }
 
 int RuleSetReader::AddRule(DOMElement* predicate, const RuleTable::Rule& rule, const std::string& id) {
-  return rule_set_.rules.Add(ReadCondition(predicate, dictionary_, inputs_, rule_set_.rules.GetConditions()),
-                             rule, id);
+  return rule_set_.rules.Add(ReadCondition(predicate, inputs_, rule_set_.rules.GetConditions()), rule, id);
 }
 
 void RuleSetReader::ReadDefault(DOMElement* element) {

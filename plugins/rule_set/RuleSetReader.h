@@ -18,8 +18,6 @@ XERCES_CPP_NAMESPACE_END
 
 namespace MCKestrel_800 {
 
-class ScoreDictionary;
-
 /// Reads one rule set. Its predicates are compiled one by one and dropped.
 ///
 /// Errors, all KestrelException with the place in the document, beside those of the readers of predicates and
@@ -30,17 +28,13 @@ class ScoreDictionary;
 ///   code 4   no `RuleSelectionMethod`, or one without `criterion`; a rule without predicate, a `SimpleRule`
 ///            without `score`;
 ///   code 6   an unknown `criterion`, a number that is not finite;
-///   code 8   a predicate's field that is not one of the active fields.
+///   code 8   a predicate's field that is neither one of the active fields nor a derived field.
 class RuleSetReader {
  public:
   /// All must outlive the reader. `inputs` gets the slots of the predicates' fields and may be sealed
   /// afterwards.
-  RuleSetReader(bool is_classification, const ScoreDictionary& dictionary, PredicateInputs& inputs,
-                RuleSet& rule_set)
-      : is_classification_(is_classification),
-        dictionary_(dictionary),
-        inputs_(inputs),
-        rule_set_(rule_set) {}
+  RuleSetReader(bool is_classification, PredicateInputs& inputs, RuleSet& rule_set)
+      : is_classification_(is_classification), inputs_(inputs), rule_set_(rule_set) {}
 
   /// To be called once.
   void Read(xercesc::DOMElement* element);
@@ -61,7 +55,6 @@ class RuleSetReader {
   int AddRule(xercesc::DOMElement* predicate, const RuleTable::Rule& rule, const std::string& id);
 
   const bool is_classification_;
-  const ScoreDictionary& dictionary_;
   PredicateInputs& inputs_;
   RuleSet& rule_set_;
   std::vector<Pending> pending_;

@@ -4,7 +4,6 @@
 
 #include <utility>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "plugins/rule_set/RuleSetModel.h"
 #include "plugins/rule_set/RuleSetReader.h"
@@ -14,18 +13,18 @@ namespace MCKestrel_800 {
 RuleSetTranslator::RuleSetTranslator() : ModelTranslator(PMMLModelTags::XML_ELE_RULESETMODEL) {}
 
 std::unique_ptr<ScoreModel> RuleSetTranslator::BuildModel(xercesc::DOMElement* element,
-                                                          std::unique_ptr<ScoreDictionary> dictionary) {
+                                                          ModelDictionaries dictionaries) {
   RuleSetModel::Definition definition;
-  definition.frame = ReadFrame(element, *dictionary);
+  definition.frame = ReadFrame(element, dictionaries);
   const ModelFrame& frame = definition.frame;
   definition.inputs = std::make_unique<CaseVector>();
   definition.rule_set = std::make_unique<RuleSet>(frame.is_classification, frame.target_variable);
-  PredicateInputs inputs(frame.schema, *dictionary, *definition.inputs);
-  RuleSetReader reader(frame.is_classification, *dictionary, inputs, *definition.rule_set);
+  PredicateInputs inputs(frame.schema, dictionaries, *definition.inputs);
+  RuleSetReader reader(frame.is_classification, inputs, *definition.rule_set);
   reader.Read(
       static_cast<xercesc::DOMElement*>(GetChildByTagForced(element, PMMLModelTags::XML_ELE_RULESET)));
-  definition.inputs->Seal();
-  return std::make_unique<RuleSetModel>(std::move(dictionary), std::move(definition));
+  definition.inputs->Seal(frame.schema, *dictionaries.data, dictionaries.derived.get());
+  return std::make_unique<RuleSetModel>(std::move(dictionaries), std::move(definition));
 }
 
 }  // namespace MCKestrel_800

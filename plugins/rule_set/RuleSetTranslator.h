@@ -17,7 +17,7 @@ class RuleSetTranslator : public ModelTranslator {
 
  protected:
   std::unique_ptr<ScoreModel> BuildModel(xercesc::DOMElement* element,
-                                         std::unique_ptr<ScoreDictionary> dictionary) override;
+                                         ModelDictionaries dictionaries) override;
 };
 
 }  // namespace MCKestrel_800

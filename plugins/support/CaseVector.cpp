@@ -6,34 +6,13 @@
 #include <typeinfo>
 
 #include "kestrel/dictionary/ScoreCaseRecord.h"
-#include "kestrel/foundation/DateTimeValue.h"
-#include "kestrel/foundation/NumberText.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
+#include "plugins/support/DerivedInputs.h"
+#include "plugins/support/FieldValue.h"
 
 namespace MCKestrel_800 {
 namespace {
-
-double NumberIn(const std::string& text) {
-  double number;
-  return ParseDouble(text.data(), text.data() + text.size(), number) ? number : NumericValue::gSysmisValue;
-}
-
-// The number that a value of the variable stands for: of a date/time the number in the variable's unit, of a
-// text the number that all of it reads as. Only the library's own text is read in place: hosts may have value
-// classes of their own.
-double NumberOf(const ScoreValue& value, const ScoreDictVar& variable) {
-  if (value.GetType() == ScoreValue::kDateTime && variable.GetDateTimeType() != kNoDateTime) {
-    return DateTimeValue(value.GetDouble(), kDateTimeVal).GetDoubleValue(variable.GetDateTimeType());
-  }
-  if (value.GetType() != ScoreValue::kString) return value.GetDouble();
-  if (typeid(value) != typeid(StringValue)) return NumberIn(value.GetString());
-  return NumberIn(static_cast<const StringValue&>(value).GetText());
-}
-
-bool IsEmptyText(const ScoreValue& value) {
-  return value.GetType() == ScoreValue::kString && value.GetString().empty();
-}
 
 std::uint64_t BitsOf(double number) {
   std::uint64_t bits;
@@ -99,6 +78,19 @@ void CaseVector::Seal() {
   field_positions_.clear();
 }
 
+void CaseVector::Seal(const MiningSchema& schema, const ScoreDictionary& data,
+                      TransformationDictionary* derived) {
+  Seal();
+  const bool reads_derived = std::any_of(fields_.begin(), fields_.end(), [](const MiningField* field) {
+    return field->variable->IsDerivedVariable();
+  });
+  if (derived == nullptr || !reads_derived) return;
+  derived_ = std::make_unique<DerivedInputs>(schema, data, *derived, fields_);
+  for (Slot& slot : slots_)
+    slot.position = derived_->GetPosition(slot.field_position);
+  PlaceSlots();
+}
+
 void CaseVector::Prepare(Slot& slot) {
   const MiningField& field = *slot.field;
   const ScoreDictVar& variable = *field.variable;
@@ -107,6 +99,7 @@ void CaseVector::Prepare(Slot& slot) {
                             : NumberOf(value, *slot.field->variable);
   };
   slot.is_text = variable.GetVarType() == ScoreDictVar::STRING_VAR;
+  slot.verdict_of_missing_text = VerdictOfMissingText(variable);
   slot.has_outliers =
       variable.GetMLevel() == ScoreDictVar::kContinuous && field.outliers != ScoreDictVar::kAsIs;
   if (slot.is_category) slot.missing_value = kMissingCategory;
@@ -123,6 +116,7 @@ double CaseVector::CodeValue(const Slot& slot, int code) {
 }
 
 unsigned CaseVector::Fill(const ScoreCaseRecord& record) {
+  if (derived_ != nullptr) return FillWithDerived(record);
   const unsigned long long stamp = record.GetLayoutStamp();
   if (stamp == 0) {
     layout_stamp_ = 0;
@@ -146,16 +140,29 @@ const ScoreValue* const* CaseVector::GatherValues(const ScoreCaseRecord& record)
   return gathered_.data();
 }
 
+// Positions are those among the values of DerivedInputs, where every field has one.
+unsigned CaseVector::FillWithDerived(const ScoreCaseRecord& record) {
+  if (derived_->Compute(record)) return FillFrom(derived_->GetValues());
+  invalid_slot_ = kNoSlot;
+  return kInvalidInput;
+}
+
 void CaseVector::LookUpPositions(const ScoreCaseRecord& record) {
   const int size = static_cast<int>(record.Size());
   positions_end_ = 0;
-  absent_outcome_ = kComplete;
-  plain_slots_.clear();
-  for (int i = 0; i < GetSlotCount(); ++i) {
-    Slot& slot = slots_[i];
+  for (Slot& slot : slots_) {
     const int position = record.GetIndex(slot.field->name);
     slot.position = position < size ? position : -1;
     positions_end_ = std::max(positions_end_, slot.position + 1);
+  }
+  PlaceSlots();
+}
+
+void CaseVector::PlaceSlots() {
+  absent_outcome_ = kComplete;
+  plain_slots_.clear();
+  for (int i = 0; i < GetSlotCount(); ++i) {
+    const Slot& slot = slots_[i];
     if (!slot.is_plain) continue;
     if (slot.position >= 0) {
       plain_slots_.push_back(
@@ -222,13 +229,14 @@ unsigned CaseVector::FillTreated(int number, const ScoreValue* value) {
   if (slot.is_text && typeid(*value) == typeid(StringValue)) {
     const std::string& text = static_cast<const StringValue*>(value)->GetText();
     verdict = slot.rules->JudgeText(text, code);
-    if (verdict == ValueRules::kInvalid && text.empty()) verdict = ValueRules::kMissing;
+    if (verdict == slot.verdict_of_missing_text && text.empty()) verdict = ValueRules::kMissing;
   } else {
     verdict = slot.rules->Judge(value);
     if (verdict == ValueRules::kValid && !slot.has_outliers) {
       if (!slot.is_category) return FillNumber(number, NumberOf(*value, *slot.field->variable));
       code = slot.rules->FindCode(*value);
-    } else if (verdict == ValueRules::kInvalid && slot.is_text && IsEmptyText(*value)) {
+    }
+    if (verdict == slot.verdict_of_missing_text && slot.is_text && IsEmptyText(*value)) {
       verdict = ValueRules::kMissing;
     }
   }
@@ -285,8 +293,18 @@ unsigned CaseVector::RefuseCase(int number) {
   return kInvalidInput;
 }
 
+std::vector<const ScoreDictVar*> CaseVector::GetPredictors() const {
+  if (derived_ != nullptr) return derived_->GetDataFields();
+  std::vector<const ScoreDictVar*> variables;
+  for (const MiningField* field : fields_)
+    variables.push_back(field->variable);
+  return variables;
+}
+
 int CaseVector::GetInvalidField() const {
-  return slots_[invalid_slot_].field_position;
+  if (invalid_slot_ == kNoSlot) return derived_->GetRefusedField();
+  const int field = slots_[invalid_slot_].field_position;
+  return derived_ == nullptr ? field : derived_->GetDataField(field);
 }
 
 }  // namespace MCKestrel_800

@@ -19,7 +19,11 @@
 
 namespace MCKestrel_800 {
 
+class DerivedInputs;
+class MiningSchema;
 class ScoreCaseRecord;
+class ScoreDictionary;
+class TransformationDictionary;
 
 /// The inputs of a model as slots, one double each.
 ///   A number slot holds the number itself (of a date/time the number in its field's unit) or the
@@ -28,9 +32,13 @@ class ScoreCaseRecord;
 ///     value that has no code: valid in a field that lists no categories, or invalid and used as it is.
 /// Values are treated as MiningSchema says. Two rules fill what it leaves open.
 ///   The empty text in a category slot is missing, rather than invalid, when the field lists categories and
-///     it is not one of them: it is what ScoreCaseRecord::SetMissingValue leaves behind.
+///     it is not one of them: it is what ScoreCaseRecord::SetMissingValue leaves behind. So it is when a
+///     derived field lists none.
 ///   An invalid value that a number slot uses as it is counts as the number that its text reads as, or as
 ///     missing when it reads as none.
+///
+/// A slot may hold a derived field: it is computed once a case (see DerivedInputs), and then its value is
+/// treated like any other.
 ///
 /// Building: AddNumber and AddCategory for each input that the model reads, in any order, repeated as it
 /// likes; then Seal. Fields and their variables must outlive the vector. Afterwards Fill is called for each
@@ -67,8 +75,14 @@ class CaseVector {
   /// The code of a value in a category slot; see ValueRules::AddCategory.
   int AddCategoryValue(int slot, const ScoreValue& value);
 
-  /// To be called once, after the last slot and category value.
+  /// To be called once, after the last slot and category value. The form without arguments is for vectors
+  /// without derived fields.
+  /// schema   may be gone afterwards, but not its fields.
+  /// data     the dictionary of the data fields; must outlive the vector.
+  /// derived  the one of the derived fields, which computes them for this vector alone and must outlive it;
+  ///          null when there are none.
   void Seal();
+  void Seal(const MiningSchema& schema, const ScoreDictionary& data, TransformationDictionary* derived);
 
   /// The number of codes of a category slot, from 0.
   int GetCodeCount(int slot) const;
@@ -82,12 +96,14 @@ class CaseVector {
   /// The values by slot, as the last Fill left them.
   const double* GetValues() const { return values_.data(); }
 
-  /// After Fill returned kInvalidInput: the position in GetFields() of the first field, by slot, whose value
-  /// made the case invalid.
-  int GetInvalidField() const;
+  /// The variables of the data fields that are read from a case, each once, in the order in which they were
+  /// first asked for; those that a derived field is computed from stand in its place. After Seal.
+  std::vector<const ScoreDictVar*> GetPredictors() const;
 
-  /// The fields that the slots read, each once, in the order in which they were first asked for.
-  const std::vector<const MiningField*>& GetFields() const { return fields_; }
+  /// After Fill returned kInvalidInput: the position in GetPredictors() of the first field, by slot, whose
+  /// value made the case invalid; first come those that derived fields read. For a derived field it is the
+  /// position of the first field that it is computed from, or the number of predictors when there is none.
+  int GetInvalidField() const;
 
  private:
   /// A number slot of a field whose numbers are all valid and none an outlier: what the loop over most slots
@@ -107,6 +123,7 @@ class CaseVector {
     bool is_plain = false;
     bool is_text = false;
     bool has_outliers = false;
+    ValueRules::Verdict verdict_of_missing_text = ValueRules::kInvalid;
     int position = -1;  ///< in the record; -1 when it does not have the name
     unsigned missing_outcome = kComplete;
     double missing_value = NumericValue::gSysmisValue;
@@ -117,6 +134,8 @@ class CaseVector {
   static void Prepare(Slot& slot);
   static double CodeValue(const Slot& slot, int code);
   void LookUpPositions(const ScoreCaseRecord& record);
+  void PlaceSlots();
+  unsigned FillWithDerived(const ScoreCaseRecord& record);
   const ScoreValue* const* GatherValues(const ScoreCaseRecord& record);
   unsigned FillFrom(const ScoreValue* const* record);
   const PlainSlot* CopyNumbers(const PlainSlot* slot, const ScoreValue* const* record,
@@ -139,12 +158,14 @@ class CaseVector {
   std::vector<const ScoreValue*> gathered_;  ///< by position, of a record without layout stamp
   std::vector<const MiningField*> fields_;
   std::vector<std::unique_ptr<ValueRules>> rules_;  ///< by field
+  std::unique_ptr<DerivedInputs> derived_;          ///< null when no slot holds a derived field
   // Needed until Seal alone.
   std::map<std::string, int> slot_numbers_;
   std::map<const MiningField*, int> field_positions_;
   unsigned long long layout_stamp_ = 0;
   int positions_end_ = 0;
   int invalid_slot_ = 0;
+  static constexpr int kNoSlot = -1;
 };
 
 }  // namespace MCKestrel_800

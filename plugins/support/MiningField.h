@@ -24,7 +24,7 @@ struct MiningField {
   };
 
   std::string name;
-  /// The field's variable; belongs to the dictionary that the schema was read with.
+  /// The field's variable; belongs to a dictionary that the schema was read with.
   const ScoreDictVar* variable = nullptr;
   ScoreModel::VarRole role = ScoreModel::kPredictor;
 

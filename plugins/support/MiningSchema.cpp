@@ -6,6 +6,7 @@
 
 #include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
+#include "kestrel/transform/TransformationDictionary.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -61,22 +62,23 @@ constexpr Word<MiningField::InvalidTreatment> kInvalidTreatments[] = {
 /// Reads one `MiningField`.
 class FieldReader {
  public:
-  FieldReader(const DOMElement* element, ScoreDictionary* dictionary) : element_(element) {
+  FieldReader(const DOMElement* element, ScoreDictionary* dictionary, TransformationDictionary* derived)
+      : element_(element) {
     field_.name =
         Narrow(BaseTranslator::GetAttributeForced(element, PMMLModelTags::XML_ATT_MININGFIELD_NAME));
     if (field_.name.empty()) {
       FailAt(element, KestrelException::kStructure, "<MiningField>'s name can't be null string !!");
     }
     variable_ = dictionary->GetVar(field_.name);
-    if (variable_ == nullptr) {
-      FailAt(element, KestrelException::kUnknownVariable,
-             "Variable " + field_.name + " not in the dictionary!");
-    }
+    if (variable_ == nullptr && derived != nullptr) variable_ = derived->GetVar(field_.name);
+    if (variable_ == nullptr) FailOnUnknownField();
     field_.variable = variable_;
   }
 
   MiningField Read() {
     ReadWord(Tags::XML_ATT_MININGFIELD_USAGETYPE, kUsageTypes, field_.role);
+    // What is predicted is a field of the data.
+    if (field_.role == ScoreModel::kTarget && variable_->IsDerivedVariable()) FailOnUnknownField();
     ReadOptype();
     ReadOutliers();
     ReadWord(Tags::XML_ATT_MININGFIELD_MISSTREATMENT, kMissingTreatments, field_.missing_is_invalid);
@@ -95,6 +97,11 @@ class FieldReader {
     const Word<T>* const word = FindWord(vocabulary, text);
     if (word == nullptr) Refuse(KestrelException::kInvalidDocument, attribute, text);
     meaning = word->meaning;
+  }
+
+  [[noreturn]] void FailOnUnknownField() const {
+    FailAt(element_, KestrelException::kUnknownVariable,
+           "Variable " + field_.name + " not in the dictionary!");
   }
 
   [[noreturn]] void Refuse(KestrelException::ExceptionCode code, const char16_t* attribute,
@@ -165,14 +172,15 @@ class FieldReader {
 
 }  // namespace
 
-MiningSchema MiningSchema::Read(const DOMElement* element, ScoreDictionary* dictionary) {
+MiningSchema MiningSchema::Read(const DOMElement* element, ScoreDictionary* dictionary,
+                                TransformationDictionary* derived) {
   MiningSchema schema;
   for (DOMElement* child : ChildElements(element)) {
     if (ElementIs(child, Tags::XML_ELE_EXTENSION)) continue;
     if (!ElementIs(child, Tags::XML_ELE_MININGFIELD)) {
       FailAt(child, KestrelException::kStructure, "<MiningField> or <Extension> is required here!!");
     }
-    FieldReader reader(child, dictionary);
+    FieldReader reader(child, dictionary, derived);
     MiningField field = reader.Read();
     if (!schema.positions_.emplace(field.name, schema.fields_.size()).second) {
       FailOnField(child, KestrelException::kStructure, field.name, ": Duplicated MiningField!");
@@ -186,6 +194,25 @@ MiningSchema MiningSchema::Read(const DOMElement* element, ScoreDictionary* dict
 const MiningField* MiningSchema::Find(const std::string& name) const {
   const auto found = positions_.find(name);
   return found == positions_.end() ? nullptr : &fields_[found->second];
+}
+
+void MiningSchema::AddDerivedFields(const TransformationDictionary& derived) {
+  for (const std::string& name : derived.GetDerivedVarNames()) {
+    if (Find(name) != nullptr || !derived_positions_.emplace(name, derived_fields_.size()).second) continue;
+    MiningField field;
+    field.name = name;
+    field.variable = derived.GetVar(name);
+    field.invalid = MiningField::InvalidTreatment::kAsIs;
+    derived_fields_.push_back(std::move(field));
+  }
+}
+
+const MiningField* MiningSchema::FindInput(const std::string& name) const {
+  if (const MiningField* const field = Find(name)) {
+    return field->role == ScoreModel::kPredictor ? field : nullptr;
+  }
+  const auto found = derived_positions_.find(name);
+  return found == derived_positions_.end() ? nullptr : &derived_fields_[found->second];
 }
 
 void MiningSchema::SetRoles(ScoreModel& model) const {

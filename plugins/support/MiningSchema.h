@@ -20,8 +20,10 @@ XERCES_CPP_NAMESPACE_END
 namespace MCKestrel_800 {
 
 class ScoreDictionary;
+class TransformationDictionary;
 
-/// The fields of a `MiningSchema` element in document order.
+/// The fields of a `MiningSchema` element in document order, and the derived fields that a model may name
+/// without having them there.
 ///
 /// Treatment of a value, in this order:
 ///   missing (absent, system-missing or user-missing, which includes numbers outside a field's `Interval`)
@@ -32,15 +34,16 @@ class ScoreDictionary;
 ///     listed category nor an outlier.
 ///   outlier (a valid number of a continuous field below `lowValue` or above `highValue`)
 ///     The margin takes its place, or it counts as missing and is replaced like a missing one.
-/// `importance` is not used. `optype` replaces the data field's measurement level in this model's dictionary.
+/// `importance` is not used. `optype` replaces the field's measurement level in this model's dictionary.
 class MiningSchema {
  public:
   MiningSchema() = default;
   MiningSchema(MiningSchema&&) = default;
   MiningSchema& operator=(MiningSchema&&) = default;
 
-  /// Reads the element. `dictionary` must belong to this model alone, because `optype` changes its variables;
-  /// it must outlive the schema. Errors, all KestrelException with the place in the document:
+  /// Reads the element. The dictionaries must belong to this model alone, because `optype` changes their
+  /// variables; they must outlive the schema. `derived` has the derived fields that may be mining fields;
+  /// null for none. Errors, all KestrelException with the place in the document:
   ///   code 1   another element than `MiningField` or `Extension`, no field at all, an empty name, a field
   ///            given twice;
   ///   code 3   `lowValue` or `highValue` is not a number;
@@ -48,12 +51,21 @@ class MiningSchema {
   ///   code 6   an attribute outside its vocabulary, "asValue" without `invalidValueReplacement`, or a
   ///            `lowValue` above the `highValue`;
   ///   code 7   a replacement that is not a value of the field's type;
-  ///   code 8   a field that is not in the dictionary;
+  ///   code 8   a field that is in neither dictionary, and a target that is not in the first;
   ///   code 11  a text field made continuous.
-  static MiningSchema Read(const xercesc::DOMElement* element, ScoreDictionary* dictionary);
+  static MiningSchema Read(const xercesc::DOMElement* element, ScoreDictionary* dictionary,
+                           TransformationDictionary* derived = nullptr);
+
+  /// Makes the derived fields known that are no mining fields. They have no treatment: a value that is none
+  /// of a field's categories stands for itself. To be called once; `derived` must outlive the schema.
+  void AddDerivedFields(const TransformationDictionary& derived);
 
   /// The field of that name, or null. Valid as long as the schema lives.
   const MiningField* Find(const std::string& name) const;
+
+  /// What a predictor or predicate may name: an active field, or a derived field that is no mining field.
+  /// Null for every other name. Valid as long as the schema lives, wherever it is moved to.
+  const MiningField* FindInput(const std::string& name) const;
 
   const std::vector<MiningField>& GetFields() const { return fields_; }
 
@@ -64,6 +76,8 @@ class MiningSchema {
  private:
   std::vector<MiningField> fields_;
   std::unordered_map<std::string, std::size_t> positions_;
+  std::vector<MiningField> derived_fields_;
+  std::unordered_map<std::string, std::size_t> derived_positions_;
 };
 
 }  // namespace MCKestrel_800

@@ -29,6 +29,14 @@ bool ReadIsClassification(const DOMElement* element) {
   FailAt(element, KestrelException::kUnsupported, "functionName -- " + Narrow(function) + ": Not supported!");
 }
 
+// Adds the derived fields of an element, which may be null, to those that are there.
+void ReadDerivedFields(DOMElement* element, ModelDictionaries& dictionaries) {
+  if (FirstChild(element, Tags::XML_ELE_DERIVEDFIELD) == nullptr) return;
+  if (dictionaries.derived == nullptr) dictionaries.derived = std::make_unique<TransformationDictionary>();
+  PMMLTranslator::HandleTransformationDictionary(element, dictionaries.data.get(),
+                                                 dictionaries.derived.get());
+}
+
 // The target's name; empty when the document names none.
 std::string ReadTarget(const DOMElement* element, const MiningSchema& schema,
                        const ScoreDictionary& dictionary) {
@@ -60,8 +68,10 @@ ScoreModel* ModelTranslator::ParseFromTree(DOMElement* root, const std::string&)
   if (dictionaryElement == nullptr) {
     FailAt(root, KestrelException::kStructure, "<DataDictionary is required !!");
   }
-  std::unique_ptr<ScoreDictionary> dictionary(ParseDictionary(dictionaryElement, false));
-  std::unique_ptr<ScoreModel> model = BuildModel(RequiredChild(root, tag_), std::move(dictionary));
+  ModelDictionaries dictionaries;
+  dictionaries.data.reset(ParseDictionary(dictionaryElement, false));
+  ReadDerivedFields(FirstChild(root, Tags::XML_ELE_TRANSFORMATION), dictionaries);
+  std::unique_ptr<ScoreModel> model = BuildModel(RequiredChild(root, tag_), std::move(dictionaries));
   const std::string version = AttributeText(root, Tags::XML_ATT_VERSION);
   model->SetVersionInfo(version.empty() ? new VersionInfo : new VersionInfo(version));
   return model.release();
@@ -70,20 +80,29 @@ ScoreModel* ModelTranslator::ParseFromTree(DOMElement* root, const std::string&)
 ScoreModel* ModelTranslator::ParseFromTree(DOMElement* modelElement, ScoreDictionary* dictionary,
                                            ScoreDictionary* resultDictionary, const std::string&) {
   if (dictionary == nullptr) Fail(KestrelException::kStructure, "<DataDictionary is required !!");
-  std::unique_ptr<ScoreModel> model =
-      BuildModel(modelElement, std::unique_ptr<ScoreDictionary>(dictionary->Clone()));
+  ModelDictionaries dictionaries;
+  dictionaries.data.reset(dictionary->Clone());
+  std::unique_ptr<ScoreModel> model = BuildModel(modelElement, std::move(dictionaries));
   if (resultDictionary != nullptr) model->SetResultScoreDictionary(resultDictionary->Clone());
   return model.release();
 }
 
-ModelFrame ModelTranslator::ReadFrame(DOMElement* element, ScoreDictionary& dictionary) {
+ModelFrame ModelTranslator::ReadFrame(DOMElement* element, ModelDictionaries& dictionaries) {
   if (Equals(Attribute(element, Tags::XML_ATT_RM_IS_SCORABLE), u"false")) {
     FailAt(element, KestrelException::kUnsupported,
            Narrow(element->getTagName()) + " is marked as not scorable!");
   }
   ModelFrame frame;
   frame.is_classification = ReadIsClassification(element);
-  frame.schema = MiningSchema::Read(RequiredChild(element, PMMLModelTags::XML_ELE_MININGSCHEMA), &dictionary);
+  ScoreDictionary& dictionary = *dictionaries.data;
+  frame.schema = MiningSchema::Read(RequiredChild(element, PMMLModelTags::XML_ELE_MININGSCHEMA), &dictionary,
+                                    dictionaries.derived.get());
+  // Behind the schema, because its optypes count for them.
+  ReadDerivedFields(FirstChild(element, Tags::XML_ELE_LOCALTRANSFORMATIONS), dictionaries);
+  if (dictionaries.derived != nullptr) {
+    dictionaries.derived->SetUpDerivedCaseRecord();
+    frame.schema.AddDerivedFields(*dictionaries.derived);
+  }
   frame.target = ReadTarget(element, frame.schema, dictionary);
   if (!frame.target.empty()) frame.target_variable = dictionary.GetVar(frame.target);
   if (!frame.is_classification && frame.target_variable != nullptr &&

@@ -8,6 +8,7 @@
 
 #include "kestrel/translate/PMMLTranslator.h"
 #include "plugins/support/MiningSchema.h"
+#include "plugins/support/ModelDictionaries.h"
 
 namespace MCKestrel_800 {
 
@@ -24,12 +25,13 @@ struct ModelFrame {
   const ScoreDictVar* target_variable = nullptr;
 };
 
-/// Reads `DataDictionary` and a model element and leaves the model itself to the derived class.
-/// `TransformationDictionary` and `LocalTransformations` are not read. `modelName` and `algorithmName` play
-/// no part.
+/// Reads `DataDictionary`, `TransformationDictionary` and a model element and leaves the model itself to the
+/// derived class. The model's derived fields are those of the document and those of its own
+/// `LocalTransformations`, which may read the former; of a name there is one. Fields of the mining schema are
+/// data fields and derived fields of the document. `modelName` and `algorithmName` play no part.
 ///
 /// Errors, all KestrelException with the place in the document where it is known, beside those of the readers
-/// of dictionary and mining schema:
+/// of dictionary, derived fields and mining schema:
 ///   code 1   no `DataDictionary`, several targets without a choice;
 ///   code 4   no model element as a child of the root, no `MiningSchema`, no `functionName`;
 ///   code 5   another function than regression and classification, a model marked as not scorable;
@@ -47,17 +49,21 @@ class ModelTranslator : public PMMLTranslator {
   ScoreModel* ParseFromTree(xercesc::DOMElement* root, const std::string& arg) override;
 
   /// Builds the model of one element with a dictionary at hand. The model gets copies of the dictionaries;
-  /// the result dictionary may be null. Returns a new model that the caller deletes.
+  /// the result dictionary may be null. Its derived fields are those of the element. Returns a new model that
+  /// the caller deletes.
   ScoreModel* ParseFromTree(xercesc::DOMElement* modelElement, ScoreDictionary* dictionary,
                             ScoreDictionary* resultDictionary, const std::string& arg) override;
 
  protected:
-  /// Reads the model element, with a dictionary that becomes the model's own.
+  /// Reads the model element, with dictionaries that become the model's own once ReadFrame has completed
+  /// them.
   virtual std::unique_ptr<ScoreModel> BuildModel(xercesc::DOMElement* element,
-                                                 std::unique_ptr<ScoreDictionary> dictionary) = 0;
+                                                 ModelDictionaries dictionaries) = 0;
 
-  /// Reads the frame of a model element; the schema speaks of the dictionary's variables.
-  static ModelFrame ReadFrame(xercesc::DOMElement* element, ScoreDictionary& dictionary);
+  /// Reads the frame of a model element and adds its own derived fields to the dictionaries; the schema
+  /// speaks of their variables. Afterwards `derived` is null when there are none, else set up for its first
+  /// case.
+  static ModelFrame ReadFrame(xercesc::DOMElement* element, ModelDictionaries& dictionaries);
 
  private:
   const char* tag_;

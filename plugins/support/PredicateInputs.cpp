@@ -1,23 +1,40 @@
 #include "plugins/support/PredicateInputs.h"
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "plugins/support/CaseVector.h"
 #include "plugins/support/MiningSchema.h"
+#include "plugins/support/ModelDictionaries.h"
 
 namespace MCKestrel_800 {
+namespace {
 
-PredicateInputs::PredicateInputs(const MiningSchema& schema, ScoreDictionary& dictionary, CaseVector& inputs)
-    : schema_(schema), dictionary_(dictionary), inputs_(inputs) {
+void ForgetIndexes(const ScoreDictionary& dictionary) {
   for (ScoreDictVar* variable : dictionary.GetScoreDictVars())
     variable->SetEncodedValueIndex(-1);
 }
 
+}  // namespace
+
+PredicateInputs::PredicateInputs(const MiningSchema& schema, const ModelDictionaries& dictionaries,
+                                 CaseVector& inputs)
+    : schema_(schema), dictionaries_(dictionaries), inputs_(inputs) {
+  ForgetIndexes(*dictionaries.data);
+  if (dictionaries.derived != nullptr) ForgetIndexes(*dictionaries.derived);
+}
+
+const ScoreDictionary* PredicateInputs::GetData() const {
+  return dictionaries_.data.get();
+}
+
+const ScoreDictionary* PredicateInputs::GetDerived() const {
+  return dictionaries_.derived.get();
+}
+
 int PredicateInputs::SlotOf(const ScoreDictVar& variable) {
   if (variable.GetEncodedValueIndex() >= 0) return variable.GetEncodedValueIndex();
-  const MiningField* field = schema_.Find(variable.GetName());
-  if (field == nullptr || field->role != ScoreModel::kPredictor) {
+  const MiningField* field = schema_.FindInput(variable.GetName());
+  if (field == nullptr) {
     Fail(KestrelException::kUnknownVariable,
          "Variable " + variable.GetName() + " not among the active fields of the MiningSchema!");
   }
@@ -32,7 +49,9 @@ int PredicateInputs::SlotOf(const ScoreDictVar& variable) {
     default:
       slot = inputs_.AddCategory(*field, CaseVector::kMissingCategory);
   }
-  dictionary_.GetVar(variable.GetName())->SetEncodedValueIndex(slot);
+  ScoreDictionary* dictionary = dictionaries_.data.get();
+  if (variable.IsDerivedVariable()) dictionary = dictionaries_.derived.get();
+  dictionary->GetVar(variable.GetName())->SetEncodedValueIndex(slot);
   return slot;
 }
 

@@ -11,6 +11,7 @@
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/XmlText.h"
+#include "plugins/support/PredicateInputs.h"
 
 namespace MCKestrel_800 {
 namespace {
@@ -18,7 +19,7 @@ namespace {
 using xercesc::DOMElement;
 using Tags = PMMLTagText;
 
-using Reader = ScorePredicate* (*)(DOMElement*, const ScoreDictionary*);
+using Reader = ScorePredicate* (*)(DOMElement*, const PredicateInputs&);
 
 struct Kind {
   const char16_t* tag;
@@ -27,21 +28,21 @@ struct Kind {
 
 constexpr Kind kKinds[] = {
     {Tags::XML_ELE_PREDICATE,
-     [](DOMElement* element, const ScoreDictionary* dictionary) -> ScorePredicate* {
-       return PMMLTranslator::ParsePredicate(element, dictionary, nullptr, false);
+     [](DOMElement* element, const PredicateInputs& inputs) -> ScorePredicate* {
+       return PMMLTranslator::ParsePredicate(element, inputs.GetData(), inputs.GetDerived(), false);
      }},
     {Tags::XML_ELE_SETPREDICATE,
-     [](DOMElement* element, const ScoreDictionary* dictionary) -> ScorePredicate* {
-       return PMMLTranslator::ParseSetPredicate(element, dictionary, nullptr);
+     [](DOMElement* element, const PredicateInputs& inputs) -> ScorePredicate* {
+       return PMMLTranslator::ParseSetPredicate(element, inputs.GetData(), inputs.GetDerived());
      }},
     {Tags::XML_ELE_COMPOUNDPREDICATE,
-     [](DOMElement* element, const ScoreDictionary* dictionary) -> ScorePredicate* {
-       return PMMLTranslator::ParseCompoundPredicate(element, dictionary, nullptr, false);
+     [](DOMElement* element, const PredicateInputs& inputs) -> ScorePredicate* {
+       return PMMLTranslator::ParseCompoundPredicate(element, inputs.GetData(), inputs.GetDerived(), false);
      }},
     {Tags::XML_ELE_TRUE,
-     [](DOMElement*, const ScoreDictionary*) -> ScorePredicate* { return new TruePredicate; }},
+     [](DOMElement*, const PredicateInputs&) -> ScorePredicate* { return new TruePredicate; }},
     {Tags::XML_ELE_FALSE,
-     [](DOMElement*, const ScoreDictionary*) -> ScorePredicate* { return new FalsePredicate; }},
+     [](DOMElement*, const PredicateInputs&) -> ScorePredicate* { return new FalsePredicate; }},
 };
 
 const Kind* FindKind(const DOMElement* element) {
@@ -74,9 +75,8 @@ DOMElement* FindPredicate(const DOMElement* element) {
   return predicate;
 }
 
-Condition ReadCondition(DOMElement* predicate, const ScoreDictionary& dictionary, PredicateInputs& inputs,
-                        ConditionTable& conditions) {
-  const std::unique_ptr<ScorePredicate> object(FindKind(predicate)->read(predicate, &dictionary));
+Condition ReadCondition(DOMElement* predicate, PredicateInputs& inputs, ConditionTable& conditions) {
+  const std::unique_ptr<ScorePredicate> object(FindKind(predicate)->read(predicate, inputs));
   try {
     return conditions.Compile(object.get(), inputs);
   } catch (const KestrelException& fault) {

@@ -14,7 +14,6 @@ XERCES_CPP_NAMESPACE_END
 namespace MCKestrel_800 {
 
 class PredicateInputs;
-class ScoreDictionary;
 
 /// Whether the element is one of the five predicates.
 bool IsPredicate(const xercesc::DOMElement* element);
@@ -23,11 +22,10 @@ bool IsPredicate(const xercesc::DOMElement* element);
 /// code 4 when there is none.
 xercesc::DOMElement* FindPredicate(const xercesc::DOMElement* element);
 
-/// Reads a predicate element and compiles it; ordinal numbers are compared by the positions of their
-/// categories. Errors: those of PMMLTranslator's predicate readers, and code 8, at the predicate, for a field
-/// that is not an active field of the mining schema.
-Condition ReadCondition(xercesc::DOMElement* predicate, const ScoreDictionary& dictionary,
-                        PredicateInputs& inputs, ConditionTable& conditions);
+/// Reads a predicate element on the fields of `inputs` and compiles it; ordinal numbers are compared by the
+/// positions of their categories. Errors: those of PMMLTranslator's predicate readers, and code 8, at the
+/// predicate, for a field that is neither an active field of the mining schema nor a derived field.
+Condition ReadCondition(xercesc::DOMElement* predicate, PredicateInputs& inputs, ConditionTable& conditions);
 
 }  // namespace MCKestrel_800
 

@@ -4,7 +4,6 @@
 
 #include <algorithm>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
@@ -76,7 +75,7 @@ void NodeReader::Read(DOMElement* root) {
 
 int NodeReader::OpenNode(DOMElement* element) {
   CheckChildren(element);
-  const Condition condition = ReadCondition(FindPredicate(element), dictionary_, inputs_, tree_.conditions);
+  const Condition condition = ReadCondition(FindPredicate(element), inputs_, tree_.conditions);
   NodeScores::Node node;
   const std::string id = AttributeText(element, Tags::XML_VAL_NAME_ID);
   node.id = id;

@@ -18,8 +18,6 @@ XERCES_CPP_NAMESPACE_END
 
 namespace MCKestrel_800 {
 
-class ScoreDictionary;
-
 /// Adds nodes to a tree. Walks the elements without recursion, so that depth costs no stack; predicates are
 /// compiled one by one and dropped.
 ///
@@ -33,12 +31,11 @@ class ScoreDictionary;
 ///   code 6  a negative or infinite `recordCount` or an infinite `score`, a `defaultChild` that is no child's
 ///           `id`;
 ///   code 7  a score or distribution value that is no category of the target;
-///   code 8  a predicate's field that is not an active field of the mining schema.
+///   code 8  a predicate's field that is neither an active field of the mining schema nor a derived field.
 class NodeReader {
  public:
-  /// All three must outlive the reader.
-  NodeReader(const ScoreDictionary& dictionary, PredicateInputs& inputs, Tree& tree)
-      : dictionary_(dictionary), inputs_(inputs), tree_(tree) {}
+  /// Both must outlive the reader.
+  NodeReader(PredicateInputs& inputs, Tree& tree) : inputs_(inputs), tree_(tree) {}
 
   /// Reads the root's `Node` element and all below it.
   void Read(xercesc::DOMElement* root);
@@ -50,7 +47,6 @@ class NodeReader {
   void CheckLeaf(const xercesc::DOMElement* element, int node) const;
   void FindDefaultChild(const xercesc::DOMElement* element, int node);
 
-  const ScoreDictionary& dictionary_;
   PredicateInputs& inputs_;
   Tree& tree_;
   // Kept from node to node.

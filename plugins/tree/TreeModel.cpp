@@ -6,7 +6,6 @@
 #include <typeinfo>
 #include <utility>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/NumberText.h"
 #include "kestrel/model/ResultEntities.h"
 #include "kestrel/model/Results.h"
@@ -17,10 +16,10 @@ namespace MCKestrel_800 {
 
 using MCScore::MCStatus;
 
-TreeModel::TreeModel(std::unique_ptr<ScoreDictionary> dictionary, MiningSchema schema,
-                     const std::string& target, std::unique_ptr<Tree> tree)
+TreeModel::TreeModel(ModelDictionaries dictionaries, MiningSchema schema, const std::string& target,
+                     std::unique_ptr<Tree> tree)
     : schema_(std::move(schema)), tree_(std::move(tree)), walker_(*tree_) {
-  SetScoreDictionary(dictionary.release());
+  dictionaries.GiveTo(*this);
   schema_.SetRoles(*this);
   if (!target.empty()) SetVarRole(target, kTarget);
 }
@@ -149,10 +148,7 @@ void TreeModel::PredictTogether(ScoreResult& result) {
 }
 
 std::vector<const ScoreDictVar*> TreeModel::GetPredictors() const {
-  std::vector<const ScoreDictVar*> variables;
-  for (const MiningField* field : tree_->inputs.GetFields())
-    variables.push_back(field->variable);
-  return variables;
+  return tree_->inputs.GetPredictors();
 }
 
 ScoreResult* TreeModel::MakeResult() const {

@@ -11,6 +11,7 @@
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/model/BaseModel.h"
 #include "plugins/support/MiningSchema.h"
+#include "plugins/support/ModelDictionaries.h"
 #include "plugins/tree/Tree.h"
 #include "plugins/tree/TreeWalker.h"
 
@@ -30,16 +31,18 @@ class ResultEntities;
 /// predicts, or the path.
 class TreeModel : public BaseModel {
  public:
-  /// All are taken over; `tree` and `schema` speak of the dictionary's variables.
-  TreeModel(std::unique_ptr<ScoreDictionary> dictionary, MiningSchema schema, const std::string& target,
+  /// All are taken over; `tree` and `schema` speak of the dictionaries' variables.
+  TreeModel(ModelDictionaries dictionaries, MiningSchema schema, const std::string& target,
             std::unique_ptr<Tree> tree);
   ~TreeModel() override;
 
   MCScore::MCStatus Score(const ScoreCaseRecord* record, ScoreResult* result) override;
-  /// Scores a case that is a flat vector: a value for each of the tree's inputs, as CaseVector has them.
+  /// Scores a case that is a flat vector: a value for each of the tree's inputs, as CaseVector has them,
+  /// derived fields included.
   MCScore::MCStatus ScoreVector(const double* values, ScoreResult* result);
 
-  /// The active fields that the predicates use, in the order in which the document first names them.
+  /// The data fields that the predicates use, in the order in which the document first names them; those that
+  /// a derived field is computed from stand in its place.
   std::vector<const ScoreDictVar*> GetPredictors() const override;
   /// A RegResult or, for a classification, a ClsResult.
   ScoreResult* MakeResult() const override;

@@ -4,7 +4,6 @@
 
 #include <utility>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "plugins/support/PredicateInputs.h"
 #include "plugins/tree/NodeReader.h"
@@ -15,19 +14,19 @@ namespace MCKestrel_800 {
 TreeTranslator::TreeTranslator() : ModelTranslator(PMMLModelTags::XML_ELE_TREEMODEL) {}
 
 std::unique_ptr<ScoreModel> TreeTranslator::BuildModel(xercesc::DOMElement* element,
-                                                       std::unique_ptr<ScoreDictionary> dictionary) {
-  ModelFrame frame = ReadFrame(element, *dictionary);
+                                                       ModelDictionaries dictionaries) {
+  ModelFrame frame = ReadFrame(element, dictionaries);
   TreeOptions options;
   options.is_classification = frame.is_classification;
   options.Read(element);
   auto tree = std::make_unique<Tree>(options, frame.target_variable);
-  PredicateInputs inputs(frame.schema, *dictionary, tree->inputs);
+  PredicateInputs inputs(frame.schema, dictionaries, tree->inputs);
   auto* const root =
       static_cast<xercesc::DOMElement*>(GetChildByTagForced(element, PMMLModelTags::XML_ELE_NODE));
-  NodeReader(*dictionary, inputs, *tree).Read(root);
-  tree->inputs.Seal();
+  NodeReader(inputs, *tree).Read(root);
+  tree->inputs.Seal(frame.schema, *dictionaries.data, dictionaries.derived.get());
   tree->table.Seal(tree->inputs);
-  return std::make_unique<TreeModel>(std::move(dictionary), std::move(frame.schema), frame.target,
+  return std::make_unique<TreeModel>(std::move(dictionaries), std::move(frame.schema), frame.target,
                                      std::move(tree));
 }
 

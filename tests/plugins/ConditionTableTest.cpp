@@ -22,6 +22,7 @@
 #include "kestrel/predicates/SimplePredicate.h"
 #include "plugins/support/CaseVector.h"
 #include "plugins/support/MiningSchema.h"
+#include "plugins/support/ModelDictionaries.h"
 #include "plugins/support/PredicateInputs.h"
 #include "tests/plugins/TreePredicates.h"
 #include "tests/support/ExpectFault.h"
@@ -61,19 +62,19 @@ class Inputs {
         names += "<MiningField name='" + name + "'/>";
       }
     }
-    dictionary_ = kestrel_test::ReadDictionary(kestrel_test::DictionaryOf(10, fields));
+    dictionaries_.data = kestrel_test::ReadDictionary(kestrel_test::DictionaryOf(10, fields));
     const auto parsed = kestrel_test::ReadTree("<MiningSchema>" + names + "</MiningSchema>");
-    schema_ = MiningSchema::Read(parsed->GetRoot(), dictionary_.get());
-    inputs_ = std::make_unique<PredicateInputs>(schema_, *dictionary_, vector_);
-    for (const ScoreDictVar* variable : dictionary_->GetScoreDictVars())
+    schema_ = MiningSchema::Read(parsed->GetRoot(), dictionaries_.data.get());
+    inputs_ = std::make_unique<PredicateInputs>(schema_, dictionaries_, vector_);
+    for (const ScoreDictVar* variable : dictionaries_.data->GetScoreDictVars())
       inputs_->SlotOf(*variable);
   }
 
   std::unique_ptr<ScorePredicate> Read(const std::string& text) const {
-    return ReadAnyPredicate(kestrel_test::ReadTree(text)->GetRoot(), *dictionary_);
+    return ReadAnyPredicate(kestrel_test::ReadTree(text)->GetRoot(), *dictionaries_.data);
   }
   Condition Compile(const ScorePredicate* predicate) { return table.Compile(predicate, *inputs_); }
-  const ScoreDictVar& Variable(const std::string& name) const { return *dictionary_->GetVar(name); }
+  const ScoreDictVar& Variable(const std::string& name) const { return *dictionaries_.data->GetVar(name); }
   size_t SlotOf(const std::string& name) const {
     return static_cast<size_t>(Variable(name).GetEncodedValueIndex());
   }
@@ -87,7 +88,7 @@ class Inputs {
   ConditionTable table;
 
  private:
-  std::unique_ptr<ScoreDictionary> dictionary_;
+  ModelDictionaries dictionaries_;
   MiningSchema schema_;
   CaseVector vector_;
   std::unique_ptr<PredicateInputs> inputs_;

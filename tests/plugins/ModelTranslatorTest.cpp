@@ -23,8 +23,8 @@ using namespace MCKestrel_800;
 /// Keeps what its translator was told.
 class FrameModel : public BaseModel {
  public:
-  FrameModel(ModelFrame frame, std::unique_ptr<ScoreDictionary> dictionary) : frame_(std::move(frame)) {
-    SetScoreDictionary(dictionary.release());
+  FrameModel(ModelFrame frame, ModelDictionaries dictionaries) : frame_(std::move(frame)) {
+    dictionaries.GiveTo(*this);
   }
 
   MCScore::MCStatus Score(const ScoreCaseRecord*, ScoreResult*) override { return MCScore::MCStatus(); }
@@ -46,9 +46,9 @@ class FrameTranslator : public ModelTranslator {
 
  protected:
   std::unique_ptr<ScoreModel> BuildModel(xercesc::DOMElement* element,
-                                         std::unique_ptr<ScoreDictionary> dictionary) override {
-    ModelFrame frame = ReadFrame(element, *dictionary);
-    return std::make_unique<FrameModel>(std::move(frame), std::move(dictionary));
+                                         ModelDictionaries dictionaries) override {
+    ModelFrame frame = ReadFrame(element, dictionaries);
+    return std::make_unique<FrameModel>(std::move(frame), std::move(dictionaries));
   }
 };
 

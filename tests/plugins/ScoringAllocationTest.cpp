@@ -9,16 +9,12 @@
 
 #include "kestrel/model/Results.h"
 #include "tests/model/AllocationCount.h"
-#include "tests/plugins/ModelText.h"
+#include "tests/plugins/DerivedModelText.h"
 
 namespace {
 
 using namespace MCKestrel_800;
-using kestrel_tests::BuildModel;
-using kestrel_tests::CountAllocations;
-using kestrel_tests::DocumentOf;
-using kestrel_tests::ModelOf;
-using kestrel_tests::RecordOf;
+using namespace kestrel_tests;
 
 TEST(ScoringAllocation, IsCountedHere) {
   const size_t before = CountAllocations();
@@ -71,6 +67,48 @@ TEST(ScoringAllocation, NoneAfterTheFirstCase) {
     }
     EXPECT_EQ(CountAllocations(), before);
     EXPECT_EQ(scored, 200);
+  }
+}
+
+// Derived numbers and categories, present, missing and refused, through fields that the schema treats.
+TEST(ScoringAllocation, NoneForDerivedFields) {
+  const DerivedDocument document{
+      Derived("d", "continuous double", Apply("*", FieldRef("x") + Constant("2"))) +
+          Derived("bin", "categorical string", Bins("d", "3", "5")),
+      Derived("e", "continuous double", NormDiscrete("g", "b")) +
+          Derived("f", "continuous double", NormContinuous("d", LinearNorm("0", "0") + LinearNorm("9", "1"))),
+      "<MiningField name='x' missingValueReplacement='2'/><MiningField name='z' outliers='asExtremeValues' "
+      "highValue='9'/><MiningField name='g' invalidValueTreatment='asMissing'/><MiningField name='n'/>"
+      "<MiningField name='d' outliers='asExtremeValues' highValue='8'/>"};
+  const std::string both = "<CompoundPredicate booleanOperator='surrogate'>" +
+                           Compare("f", "greaterThan", "0.5") + Compare("bin", "equal", "mid") +
+                           "</CompoundPredicate>";
+  const std::string documents[] = {
+      document.Regression(Number("d") + Number("f") + Category("bin", "mid") + Number("e") + Number("z")),
+      document.Tree(both),
+      document.Rules(both),
+  };
+  const std::string text = "a text that is too long to be kept in place";
+  for (const std::string& wanted : documents) {
+    const std::unique_ptr<ScoreModel> model = BuildAny(wanted);
+    const std::unique_ptr<ScoreResult> result(model->MakeResult());
+    const CaseRecord records[] = {
+        RecordOf({{"x", 1.0}, {"z", 2.0}, {"n", 3.0}, {"g", "a"}}),
+        RecordOf({{"t", text}, {"x", 20.0}, {"z", 70.0}, {"n", 2.0}, {"g", "b  "}}),
+        RecordOf({{"x", {}}, {"z", NumericValue::gSysmisValue}, {"n", {}}, {"g", {}}}),
+        RecordOf({{"x", text}, {"z", 2.0}, {"n", 3.0}, {"g", text}}),
+    };
+    for (const CaseRecord& record : records)
+      model->Score(&record, result.get());
+    const size_t before = CountAllocations();
+    int scored = 0;
+    for (int i = 0; i < 100; ++i) {
+      for (const CaseRecord& record : records)
+        scored += model->Score(&record, result.get()).IsOK() ? 1 : 0;
+    }
+    EXPECT_EQ(CountAllocations(), before);
+    EXPECT_GE(scored, 200);
+    EXPECT_LE(scored, 300);
   }
 }
 
