@@ -3,6 +3,7 @@
 #include <cmath>
 #include <unordered_map>
 
+#include "apps/kestrel/NameChoice.h"
 #include "apps/kestrel/ProgramError.h"
 #include "apps/kestrel/ShownText.h"
 #include "kestrel/dictionary/ScoreDictVar.h"
@@ -35,32 +36,16 @@ bool ReadNumber(std::string_view cell, double& number) {
   return std::isfinite(number);
 }
 
-std::string ListNames(const std::vector<std::string>& names) {
-  constexpr std::size_t kMost = 30;
-  std::string list;
-  for (std::size_t i = 0; i < names.size() && i < kMost; ++i)
-    list += (i == 0 ? "" : ", ") + ShownText(names[i]);
-  if (names.size() > kMost) list += " and " + std::to_string(names.size() - kMost) + " more";
-  return list;
-}
-
-std::string InLowerCase(std::string text) {
-  for (char& c : text) {
-    if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
-  }
-  return text;
-}
-
 /// What may be the matter when inputs have no column.
-std::string HintForAbsent(const std::vector<std::string>& absent, const std::vector<std::string>& header) {
-  std::unordered_map<std::string, const std::string*> columns;
-  for (const std::string& name : header)
-    columns.emplace(InLowerCase(name), &name);
-  for (const std::string& name : absent) {
-    const auto found = columns.find(InLowerCase(name));
-    if (found == columns.end()) continue;
-    return "\n  hint: upper and lower case count; the table has " + ShownText(*found->second) +
-           " where the model reads " + ShownText(name);
+std::string HintForAbsent(const std::vector<std::string>& absent, const std::vector<std::string>& header,
+                          const char* reader) {
+  // So many names are compared that a table of hundreds of thousands of columns takes no time to speak of.
+  constexpr std::size_t kMost = 30;
+  for (std::size_t i = 0; i < absent.size() && i < kMost; ++i) {
+    const std::string* found = FindInAnyCase(header, absent[i]);
+    if (found == nullptr) continue;
+    return "\n  hint: upper and lower case count; the table has " + ShownText(*found) + " where " + reader +
+           " " + ShownText(absent[i]);
   }
   return header.size() == 1 ? "\n  hint: --delimiter tells what separates the cells" : "";
 }
@@ -68,7 +53,7 @@ std::string HintForAbsent(const std::vector<std::string>& absent, const std::vec
 }  // namespace
 
 CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*>& inputs,
-                       const std::vector<std::string>& missing_texts)
+                       const std::vector<std::string>& missing_texts, const char* reader)
     : is_number_(table.GetHeader().size(), false),
       missing_texts_(missing_texts),
       record_(static_cast<int>(inputs.size())) {
@@ -89,9 +74,10 @@ CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*
     AddSlot(inputs_.back());
   }
   if (absent.empty()) return;
-  throw ProgramError(kData, table.DescribePlace(table.GetHeaderLine()) + "the model reads " +
-                                ListNames(absent) + ", for which there is no column; the columns are " +
-                                ListNames(table.GetHeader()) + HintForAbsent(absent, table.GetHeader()));
+  throw ProgramError(kData, table.DescribePlace(table.GetHeaderLine()) + reader + " " + ListNames(absent) +
+                                ", for which there is no column; the columns are " +
+                                ListNames(table.GetHeader()) +
+                                HintForAbsent(absent, table.GetHeader(), reader));
 }
 
 CaseReader::~CaseReader() = default;

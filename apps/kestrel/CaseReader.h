@@ -1,4 +1,4 @@
-// From the rows of a table to the cases of a model.
+// From the rows of a table to the cases of a model, or of derived fields.
 
 #ifndef KESTREL_APPS_KESTREL_CASEREADER_H
 #define KESTREL_APPS_KESTREL_CASEREADER_H
@@ -32,11 +32,12 @@ class CaseReader {
     std::string text;
   };
 
-  /// inputs         the variables that the model reads; they must outlive this object
+  /// inputs         the variables that are read; they must outlive this object
   /// missing_texts  what stands for a missing value beside the empty cell
+  /// reader         who reads them, as messages put it: "the model reads"
   /// Errors: ProgramError kData that names the inputs without a column and the columns that are there.
   CaseReader(TableReader& table, const std::vector<const MCKestrel_800::ScoreDictVar*>& inputs,
-             const std::vector<std::string>& missing_texts);
+             const std::vector<std::string>& missing_texts, const char* reader);
   ~CaseReader();
   CaseReader(const CaseReader&) = delete;
   CaseReader& operator=(const CaseReader&) = delete;

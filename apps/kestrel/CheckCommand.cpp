@@ -1,24 +1,35 @@
 #include "apps/kestrel/CheckCommand.h"
 
-#include <memory>
-
 #include "apps/kestrel/InputFile.h"
 #include "apps/kestrel/LoadedModel.h"
 #include "apps/kestrel/OutputFile.h"
 #include "kestrel/dictionary/ScoreDictVar.h"
-#include "kestrel/model/ScoreModel.h"
 
 namespace kestrel_program {
 
+namespace {
+
+std::string Counted(std::size_t count, const char* what) {
+  return std::to_string(count) + " " + what + (count == 1 ? "" : "s");
+}
+
+std::string Summarize(const LoadedDocument& document) {
+  if (document.model == nullptr) {
+    return Counted(document.fields.derived->GetDerivedVarNames().size(), "derived field") + ", no model";
+  }
+  const MCKestrel_800::ScoreDictVar* target = document.model->GetTargetVar();
+  return document.model->GetModelKind() + " with " +
+         Counted(document.model->GetPredictors().size(), "input") +
+         (target == nullptr ? std::string(", no target") : ", target " + target->GetName());
+}
+
+}  // namespace
+
 ExitCode Check(const std::string& model, const std::string& names_file) {
-  const std::unique_ptr<MCKestrel_800::ScoreModel> loaded = LoadModel(model, names_file);
-  const std::size_t inputs = loaded->GetPredictors().size();
-  const MCKestrel_800::ScoreDictVar* target = loaded->GetTargetVar();
+  const LoadedDocument document = LoadDocument(model, names_file);
   OutputFile output("-");
   output.GetBuffer() +=
-      (IsStandardStream(model) ? "standard input" : model) + ": good: " + loaded->GetModelKind() + " with " +
-      std::to_string(inputs) + (inputs == 1 ? " input" : " inputs") +
-      (target == nullptr ? std::string(", no target") : ", target " + target->GetName()) + "\n";
+      (IsStandardStream(model) ? "standard input" : model) + ": good: " + Summarize(document) + "\n";
   output.Finish();
   return kDone;
 }

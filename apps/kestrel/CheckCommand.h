@@ -9,8 +9,8 @@
 
 namespace kestrel_program {
 
-/// Reads the model and says on the standard output that it is good, with its kind and size.
-/// Errors: ProgramError that says what is wrong and where.
+/// Reads the model, or the derived fields of a document without one, and says on the standard output that it
+/// is good, with its kind and size. Errors: ProgramError that says what is wrong and where.
 ExitCode Check(const std::string& model, const std::string& names_file);
 
 }  // namespace kestrel_program

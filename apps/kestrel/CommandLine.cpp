@@ -8,6 +8,7 @@
 
 #include "apps/kestrel/CheckCommand.h"
 #include "apps/kestrel/CopyCommand.h"
+#include "apps/kestrel/DeriveCommand.h"
 #include "apps/kestrel/DescribeCommand.h"
 #include "apps/kestrel/OutputFile.h"
 #include "apps/kestrel/ProgramError.h"
@@ -19,16 +20,17 @@ namespace {
 
 constexpr const char* kVersionText = "kestrel " KESTREL_VERSION;
 
-constexpr const char* kScoreHelp =
+constexpr const char* kTableHelp =
     "The table has a line with the columns' names first; cells are separated by commas, tabs, semicolons or "
     "vertical\n"
-    "bars. Columns may stand in any order, those that the model does not read are ignored. A cell in "
-    "quotation marks\n"
+    "bars. Columns may stand in any order, those that are not read are ignored. A cell in quotation marks\n"
     "may hold separators, line ends and quotation marks written twice; blanks around a cell do not count "
     "unless they\n"
     "are in quotation marks. Numbers have a decimal point (not inf or nan), dates and times are written as\n"
     "2024-02-29, 13:05:59 and 2024-02-29T13:05:59. All text is UTF-8.\n"
-    "\n"
+    "\n";
+
+constexpr const char* kScoreHelp =
     "The output has the columns that are kept, then\n"
     "  prediction              the predicted number or category\n"
     "  probability             of the predicted category (classifications)\n"
@@ -38,6 +40,14 @@ constexpr const char* kScoreHelp =
     "that a\n"
     "kept column has already gets \"_2\" behind it. A file that is written appears when it is complete, not "
     "before.\n";
+
+constexpr const char* kDeriveHelp =
+    "The output has the columns that are kept, then one for each derived field, named like it. A missing "
+    "value is an\n"
+    "empty cell (null in jsonl). A name that a kept column has already gets \"_2\" behind it. A file that is "
+    "written\n"
+    "appears when it is complete, not before. Derived fields in a model's LocalTransformations are not "
+    "read.\n";
 
 /// Shows an option that may have a value behind "=" as such; the parser's own way shows its stand-in for no
 /// value.
@@ -60,6 +70,7 @@ struct Values {
   std::string on_error = "stop";
   std::vector<std::string> keep;
   std::vector<std::string> missing;
+  std::vector<std::string> fields;
   bool explains = false;
   bool shows_statistics = false;
   bool as_json = false;
@@ -87,10 +98,12 @@ TableWriter::Format FormatOf(const Values& values) {
   return values.format == "jsonl" ? TableWriter::Format::kJsonLines : TableWriter::Format::kCsv;
 }
 
+void AddDocument(CLI::App& command, Values& values, const char* text) {
+  command.add_option("MODEL", values.model, text)->required()->type_name("FILE");
+}
+
 void AddModel(CLI::App& command, Values& values) {
-  command.add_option("MODEL", values.model, "The model's document; - for the standard input")
-      ->required()
-      ->type_name("FILE");
+  AddDocument(command, values, "The model's document; - for the standard input");
   command
       .add_option("--models", values.names_file,
                   "A file with the model elements to look for, instead of all that PMML has")
@@ -115,13 +128,12 @@ void AddTable(CLI::App& command, Values& values) {
       ->type_name("FORMAT");
 }
 
-void AddScore(CLI::App& program, Values& values) {
-  CLI::App& command = *program.add_subcommand("score", "Score the cases of a table");
-  AddModel(command, values);
-  AddTable(command, values);
+/// What is done with the cases of a table.
+/// added  what stands beside the kept columns: "predictions"
+void AddCases(CLI::App& command, Values& values, const std::string& added) {
   command.add_flag(
       "--keep{*}", values.keep,
-      "Copy the table's columns beside the predictions: all with --keep, some with --keep=NAME,NAME");
+      "Copy the table's columns beside the " + added + ": all with --keep, some with --keep=NAME,NAME");
   command
       .add_option(
           "--missing", values.missing,
@@ -130,17 +142,37 @@ void AddScore(CLI::App& program, Values& values) {
       ->allow_extra_args(false)
       ->type_name("TEXT");
   command
-      .add_option(
-          "--on-error", values.on_error,
-          "A case that cannot be read or scored: stop (the default) there, or null: leave its prediction "
-          "empty and go on")
+      .add_option("--on-error", values.on_error,
+                  "A case that cannot be read or scored: stop (the default) there, or null: leave its " +
+                      added + " empty and go on")
       ->check(CLI::IsMember({"stop", "null"}))
       ->type_name("WHAT");
-  command.add_flag("--explain", values.explains,
-                   "Tell which nodes of a tree, or rules of a rule set, led to each prediction");
   command.add_flag("--stats", values.shows_statistics,
                    "Tell in the end how many cases there were and how fast it went");
-  command.footer(std::string(kScoreHelp) + "\n" + kExitCodesHelp);
+}
+
+void AddScore(CLI::App& program, Values& values) {
+  CLI::App& command = *program.add_subcommand("score", "Score the cases of a table");
+  AddModel(command, values);
+  AddTable(command, values);
+  AddCases(command, values, "predictions");
+  command.add_flag("--explain", values.explains,
+                   "Tell which nodes of a tree, or rules of a rule set, led to each prediction");
+  command.footer(std::string(kTableHelp) + kScoreHelp + "\n" + kExitCodesHelp);
+}
+
+void AddDerive(CLI::App& program, Values& values) {
+  CLI::App& command = *program.add_subcommand(
+      "derive", "Compute a document's derived fields for the cases of a table, without a model");
+  AddDocument(command, values, "The document with the derived fields; - for the standard input");
+  AddTable(command, values);
+  AddCases(command, values, "derived fields");
+  command
+      .add_option("--fields", values.fields,
+                  "The derived fields to compute, with commas between them, instead of all")
+      ->allow_extra_args(false)
+      ->type_name("NAME,...");
+  command.footer(std::string(kTableHelp) + kDeriveHelp + "\n" + kExitCodesHelp);
 }
 
 void AddDescribe(CLI::App& program, Values& values) {
@@ -174,7 +206,8 @@ std::string ExplainUsage(const CLI::App& program, const std::vector<std::string>
   if (arguments.empty() || !HasCommand(program, arguments[0])) {
     return (arguments.empty() ? std::string("a command is missing")
                               : "\"" + ShownText(arguments[0]) + "\" is no command") +
-           "; accepted is score, describe, check or copy-table\n  hint: kestrel --help tells what they do";
+           "; accepted is score, derive, describe, check or copy-table\n  hint: kestrel --help tells what "
+           "they do";
   }
   const auto keep = std::find(arguments.begin(), arguments.end(), "--keep");
   if (dynamic_cast<const CLI::ExtrasError*>(&fault) != nullptr && arguments.end() - keep > 1 &&
@@ -185,25 +218,26 @@ std::string ExplainUsage(const CLI::App& program, const std::vector<std::string>
   return std::string(fault.what()) + "\n  hint: kestrel " + arguments[0] + " --help lists what is accepted";
 }
 
-ExitCode RunScore(const Values& values) {
-  ScoreOptions options;
-  options.model = values.model;
-  options.data = values.data;
-  options.output = values.output;
-  options.names_file = values.names_file;
-  options.delimiter = DelimiterOf(values);
-  options.keep_all = std::count(values.keep.begin(), values.keep.end(), kAllColumns) > 0;
-  options.keep = values.keep;
-  options.missing = values.missing;
-  options.goes_on_after_faults = values.on_error == "null";
-  options.format = FormatOf(values);
-  options.explains = values.explains;
-  options.shows_statistics = values.shows_statistics;
-  return Score(options);
+TableOptions TableOf(const Values& values) {
+  TableOptions table;
+  table.document = values.model;
+  table.data = values.data;
+  table.output = values.output;
+  table.delimiter = DelimiterOf(values);
+  table.keep_all = std::count(values.keep.begin(), values.keep.end(), kAllColumns) > 0;
+  table.keep = values.keep;
+  table.missing = values.missing;
+  table.goes_on_after_faults = values.on_error == "null";
+  table.format = FormatOf(values);
+  table.shows_statistics = values.shows_statistics;
+  return table;
 }
 
 ExitCode Run(const CLI::App& program, const Values& values) {
-  if (program.got_subcommand("score")) return RunScore(values);
+  if (program.got_subcommand("score")) {
+    return Score({TableOf(values), values.names_file, values.explains});
+  }
+  if (program.got_subcommand("derive")) return Derive({TableOf(values), values.fields});
   if (program.got_subcommand("describe")) return Describe(values.model, values.names_file, values.as_json);
   if (program.got_subcommand("check")) return Check(values.model, values.names_file);
   CopyOptions options;
@@ -218,9 +252,10 @@ ExitCode Run(const CLI::App& program, const Values& values) {
 
 ExitCode RunCommandLine(const std::vector<std::string>& arguments) {
   Values values;
-  CLI::App program("Scores predictive models (PMML documents).", "kestrel");
+  CLI::App program("Scores predictive models and computes derived fields (PMML documents).", "kestrel");
   program.formatter(std::make_shared<HelpFormatter>());
   AddScore(program, values);
+  AddDerive(program, values);
   AddDescribe(program, values);
   AddCheck(program, values);
   AddCopy(program, values);

@@ -1,17 +1,15 @@
 #include "apps/kestrel/DescribeCommand.h"
 
 #include <algorithm>
-#include <array>
-#include <memory>
 #include <nlohmann/json.hpp>
 #include <string>
 #include <vector>
 
+#include "apps/kestrel/ExpressionText.h"
 #include "apps/kestrel/LoadedModel.h"
 #include "apps/kestrel/ModelDescription.h"
 #include "apps/kestrel/OutputFile.h"
 #include "apps/kestrel/ShownText.h"
-#include "kestrel/model/ScoreModel.h"
 
 namespace kestrel_program {
 namespace {
@@ -25,8 +23,12 @@ Json ToJson(const FieldDescription& field) {
   if (!field.label.empty()) object["label"] = field.label;
   object["type"] = field.type;
   object["level"] = field.level;
-  object["role"] = field.role;
-  object["read"] = field.is_read;
+  if (field.expression.empty()) {
+    object["role"] = field.role;
+    object["read"] = field.is_read;
+  } else {
+    object["expression"] = field.expression;
+  }
   object["categories"] = Json::array();
   for (const FieldDescription::Category& category : field.categories) {
     Json entry;
@@ -40,16 +42,19 @@ Json ToJson(const FieldDescription& field) {
 
 Json ToJson(const ModelDescription& model) {
   Json object;
-  object["kind"] = model.kind;
+  object["kind"] = model.kind.empty() ? Json() : Json(model.kind);
   object["version"] = model.version;
   object["target"] = model.has_target ? ToJson(model.target) : Json();
   object["inputs"] = Json::array();
   for (const FieldDescription& field : model.inputs)
     object["inputs"].push_back(ToJson(field));
+  object["derived"] = Json::array();
+  for (const FieldDescription& field : model.derived)
+    object["derived"].push_back(ToJson(field));
   return object;
 }
 
-using TableLine = std::array<std::string, 6>;
+using TableLine = std::vector<std::string>;
 
 /// A line stays readable; who needs them all takes the other form.
 std::string Join(const std::vector<std::string>& texts, std::size_t most) {
@@ -84,7 +89,7 @@ std::size_t WidthOf(const std::string& text) {
 }
 
 void AppendAligned(const std::vector<TableLine>& lines, std::string& out) {
-  std::array<std::size_t, 6> widths{};
+  std::vector<std::size_t> widths(lines.front().size());
   for (const TableLine& line : lines) {
     for (std::size_t i = 0; i < line.size(); ++i)
       widths[i] = std::max(widths[i], WidthOf(line[i]));
@@ -100,7 +105,7 @@ void AppendAligned(const std::vector<TableLine>& lines, std::string& out) {
 }
 
 void AppendText(const ModelDescription& model, std::string& out) {
-  out += "kind:    " + model.kind + "\n";
+  out += "kind:    " + (model.kind.empty() ? std::string("none, derived fields alone") : model.kind) + "\n";
   out += "version: " + (model.version.empty() ? std::string("-") : ShownText(model.version)) + "\n";
   const TableLine kHeading = {"name", "type", "level", "role", "missing values", "categories"};
   out += "target:\n";
@@ -110,18 +115,31 @@ void AppendText(const ModelDescription& model, std::string& out) {
     out += "  none\n";
   }
   out += "inputs: " + std::to_string(model.inputs.size()) + "\n";
-  if (model.inputs.empty()) return;
-  std::vector<TableLine> lines = {kHeading};
-  for (const FieldDescription& field : model.inputs)
-    lines.push_back(ToLine(field));
+  if (!model.inputs.empty()) {
+    std::vector<TableLine> lines = {kHeading};
+    for (const FieldDescription& field : model.inputs)
+      lines.push_back(ToLine(field));
+    AppendAligned(lines, out);
+  }
+  if (model.derived.empty()) return;
+  out += "derived fields: " + std::to_string(model.derived.size()) + "\n";
+  std::vector<TableLine> lines = {{"name", "type", "level", "expression"}};
+  for (const FieldDescription& field : model.derived)
+    lines.push_back({ShownText(field.name), field.type, field.level, field.expression});
   AppendAligned(lines, out);
 }
 
 }  // namespace
 
 ExitCode Describe(const std::string& model, const std::string& names_file, bool as_json) {
-  const std::unique_ptr<MCKestrel_800::ScoreModel> loaded = LoadModel(model, names_file);
-  const ModelDescription description(*loaded);
+  // A line stays readable; who needs it all takes the other form.
+  constexpr std::size_t kMostRows = 10;
+  const LoadedDocument loaded = LoadDocument(model, names_file);
+  const ExpressionText expressions = as_json ? ExpressionText() : ExpressionText::Short(kMostRows);
+  const ModelDescription description =
+      loaded.model != nullptr
+          ? ModelDescription(*loaded.model, expressions)
+          : ModelDescription(*loaded.fields.dictionary, *loaded.fields.derived, expressions);
   OutputFile output("-");
   if (as_json) {
     output.GetBuffer() += ToJson(description).dump(2, ' ', false, Json::error_handler_t::replace) + "\n";

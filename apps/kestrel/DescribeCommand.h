@@ -9,8 +9,8 @@
 
 namespace kestrel_program {
 
-/// Writes the model's kind, version, target and inputs to the standard output, as a table for people or as
-/// one JSON object. Errors: ProgramError.
+/// Writes the model's kind, version, target, inputs and derived fields to the standard output, as a table for
+/// people or as one JSON object. A document without a model has derived fields alone. Errors: ProgramError.
 ExitCode Describe(const std::string& model, const std::string& names_file, bool as_json);
 
 }  // namespace kestrel_program

@@ -18,7 +18,7 @@ enum ExitCode : int {
 constexpr const char* kExitCodesHelp =
     "Exit codes:\n"
     "  0  done\n"
-    "  1  done, but some cases have no prediction because they could not be read or scored\n"
+    "  1  done, but some cases have no answer because they could not be read or scored\n"
     "  2  the command line is not right\n"
     "  3  the model's document cannot be used\n"
     "  4  the table cannot be used\n"

@@ -6,12 +6,12 @@
 #include <new>
 
 #include "apps/kestrel/DocumentHints.h"
+#include "apps/kestrel/DocumentInput.h"
 #include "apps/kestrel/InputFile.h"
 #include "apps/kestrel/ProgramError.h"
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ModelNames.h"
-#include "kestrel/model/ScoreModel.h"
 
 namespace kestrel_program {
 namespace {
@@ -52,10 +52,35 @@ std::vector<std::string> ModelElements(const std::string& names_file) {
   return names;
 }
 
-std::unique_ptr<ScoreModel> ReadModel(std::istream& document, const std::string& name,
-                                      const std::vector<std::string>& elements) {
+std::unique_ptr<ScoreModel> MakeModel(std::istream& document, const std::vector<std::string>& elements) {
+  return std::unique_ptr<ScoreModel>(ModelFactory::MakeModelFromXML(document, elements, std::string()));
+}
+
+LoadedFields MakeFields(std::istream& document) {
+  ScoreDictionary* dictionary = nullptr;
+  LoadedFields fields;
+  fields.derived.reset(ModelFactory::GetTransformationDictionaryFromXML(document, dictionary, std::string()));
+  fields.dictionary.reset(dictionary);
+  return fields;
+}
+
+bool HasFields(const LoadedFields& fields) {
+  return !fields.derived->GetDerivedVarNames().empty();
+}
+
+/// Whether the document was looked through and has none of the models that were looked for.
+bool IsWithoutModel(const KestrelException& fault) {
+  return fault.GetErrorCode() == KestrelException::kUnsupported &&
+         std::string(fault.GetErrorMessage()).find("Unsupported Model found!") != std::string::npos;
+}
+
+/// Calls a reader of the document and puts into words what it throws: a model's library may throw anything.
+template <class Reader>
+auto Guard(const std::string& name, const Reader& reader) {
   try {
-    return std::unique_ptr<ScoreModel>(ModelFactory::MakeModelFromXML(document, elements, std::string()));
+    return reader();
+  } catch (const ProgramError&) {
+    throw;
   } catch (const KestrelException& fault) {
     throw Describe(name, fault);
   } catch (const std::bad_alloc&) {
@@ -66,6 +91,19 @@ std::unique_ptr<ScoreModel> ReadModel(std::istream& document, const std::string&
     throw ProgramError(kDocument, name + ": the model's library failed without saying why");
   }
 }
+
+std::unique_ptr<ScoreModel> RequireModel(std::unique_ptr<ScoreModel> model, const std::string& name) {
+  if (model == nullptr) throw ProgramError(kDocument, name + ": the model's library made no model of it");
+  return model;
+}
+
+std::unique_ptr<ScoreModel> ReadModel(std::istream& document, const std::string& name,
+                                      const std::vector<std::string>& elements) {
+  return RequireModel(Guard(name, [&] { return MakeModel(document, elements); }), name);
+}
+
+constexpr char kAcceptedFields[] =
+    "accepted are DerivedField elements in a TransformationDictionary directly below PMML";
 
 }  // namespace
 
@@ -98,16 +136,38 @@ const std::vector<std::string>& StandardModelElements() {
 
 std::unique_ptr<ScoreModel> LoadModel(const std::string& path, const std::string& names_file) {
   const std::vector<std::string> elements = ModelElements(names_file);
-  std::unique_ptr<ScoreModel> model;
-  const std::string name = IsStandardStream(path) ? "standard input" : path;
-  if (IsStandardStream(path)) {
-    model = ReadModel(std::cin, name, elements);
-  } else {
-    std::ifstream document = OpenForReading(path);
-    model = ReadModel(document, name, elements);
-  }
-  if (model == nullptr) throw ProgramError(kDocument, name + ": the model's library made no model of it");
-  return model;
+  if (IsStandardStream(path)) return ReadModel(std::cin, "standard input", elements);
+  std::ifstream document = OpenForReading(path);
+  return ReadModel(document, path, elements);
+}
+
+LoadedFields LoadFields(const std::string& path) {
+  DocumentInput document(path);
+  const std::string& name = document.GetName();
+  LoadedFields fields = Guard(name, [&] { return MakeFields(document.Open()); });
+  if (HasFields(fields)) return fields;
+  const char* text = document.Holds("DerivedField")
+                         ? ": the derived fields are those of a model alone (LocalTransformations), which "
+                           "kestrel score computes for the model\n  hint: "
+                         : ": the document has no derived fields\n  hint: ";
+  throw ProgramError(kDocument, name + text + kAcceptedFields);
+}
+
+LoadedDocument LoadDocument(const std::string& path, const std::string& names_file) {
+  const std::vector<std::string> elements = ModelElements(names_file);
+  DocumentInput document(path);
+  const std::string& name = document.GetName();
+  return Guard(name, [&] {
+    LoadedDocument loaded;
+    try {
+      loaded.model = RequireModel(MakeModel(document.Open(), elements), name);
+    } catch (const KestrelException& fault) {
+      if (!names_file.empty() || !IsWithoutModel(fault)) throw;
+      loaded.fields = MakeFields(document.Open());
+      if (!HasFields(loaded.fields)) throw;
+    }
+    return loaded;
+  });
 }
 
 }  // namespace kestrel_program

@@ -1,4 +1,4 @@
-// A model read from its document, with the words for what can go wrong on the way.
+// What a document holds, with the words for what can go wrong on the way.
 
 #ifndef KESTREL_APPS_KESTREL_LOADEDMODEL_H
 #define KESTREL_APPS_KESTREL_LOADEDMODEL_H
@@ -7,11 +7,24 @@
 #include <string>
 #include <vector>
 
-namespace MCKestrel_800 {
-class ScoreModel;
-}  // namespace MCKestrel_800
+#include "kestrel/dictionary/ScoreDictionary.h"
+#include "kestrel/model/ScoreModel.h"
+#include "kestrel/transform/TransformationDictionary.h"
 
 namespace kestrel_program {
+
+/// The data dictionary of a document and the derived fields that stand directly below its root. There is at
+/// least one of these. They refer to the dictionary's fields, so they go first.
+struct LoadedFields {
+  std::unique_ptr<MCKestrel_800::ScoreDictionary> dictionary;
+  std::unique_ptr<MCKestrel_800::TransformationDictionary> derived;
+};
+
+/// A document's model or, when it has none, its derived fields.
+struct LoadedDocument {
+  std::unique_ptr<MCKestrel_800::ScoreModel> model;
+  LoadedFields fields;  ///< null when there is a model
+};
 
 /// The tags of the model elements that PMML knows, those that may hold others first, because the first one
 /// that a document has decides which model it is.
@@ -23,6 +36,14 @@ const std::vector<std::string>& StandardModelElements();
 /// Errors: ProgramError kDocument with place, code, text and a hint what to do; kInputOutput for files that
 /// cannot be read.
 std::unique_ptr<MCKestrel_800::ScoreModel> LoadModel(const std::string& path, const std::string& names_file);
+
+/// Reads the derived fields of a document, whatever model it has; no model library is needed.
+/// Errors as above, also for a document without derived fields.
+LoadedFields LoadFields(const std::string& path);
+
+/// Reads the model as LoadModel does. A document without any of the standard's models is looked at for
+/// derived fields. Errors as above; for a document with neither, that there is no model.
+LoadedDocument LoadDocument(const std::string& path, const std::string& names_file);
 
 }  // namespace kestrel_program
 

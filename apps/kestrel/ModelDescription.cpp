@@ -4,12 +4,15 @@
 #include <set>
 #include <unordered_set>
 
+#include "apps/kestrel/DerivedInputs.h"
+#include "apps/kestrel/ExpressionText.h"
 #include "apps/kestrel/PredictionColumns.h"
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/dictionary/ScoreDictionary.h"
-#include "kestrel/foundation/NumericValue.h"
 #include "kestrel/model/ScoreModel.h"
 #include "kestrel/model/ScoreVersionInfo.h"
+#include "kestrel/transform/TransformVar.h"
+#include "kestrel/transform/TransformationDictionary.h"
 
 namespace kestrel_program {
 namespace {
@@ -58,21 +61,6 @@ std::string LevelOf(const ScoreDictVar& variable) {
   return NameOf(variable.GetMLevel(), kLevels);
 }
 
-std::string EndOf(const ScoreValue* end, const char* unbounded) {
-  if (end == nullptr || end->IsSystemMissingValue()) return unbounded;
-  const std::string text = TextOf(*end);
-  return text == "inf" || text == "-inf" ? unbounded : text;
-}
-
-/// A single value, or an interval with brackets at the ends that belong to it.
-std::string RangeText(const ScoreValueRange& range) {
-  const ScoreValue* low = range.GetMin();
-  const ScoreValue* high = range.GetMax();
-  if (low != nullptr && high != nullptr && *low == *high) return TextOf(*low);
-  return (range.GetLowEnd() ? "[" : "(") + EndOf(low, "-inf") + ", " + EndOf(high, "inf") +
-         (range.GetHighEnd() ? "]" : ")");
-}
-
 FieldDescription Describe(const ScoreDictVar& variable) {
   FieldDescription field;
   field.name = variable.GetName();
@@ -94,9 +82,25 @@ FieldDescription Describe(const ScoreDictVar& variable) {
   return field;
 }
 
+/// Their names are those of the derived fields, in the document's order.
+std::vector<FieldDescription> DescribeDerived(const TransformationDictionary& dictionary,
+                                              const ExpressionText& expressions) {
+  std::vector<FieldDescription> fields;
+  for (const std::string& name : dictionary.GetDerivedVarNames()) {
+    const auto* variable = dynamic_cast<const TransformVar*>(dictionary.GetVar(name));
+    if (variable == nullptr) continue;
+    fields.push_back(Describe(*variable));
+    fields.back().expression = expressions.Of(*variable);
+  }
+  return fields;
+}
+
 }  // namespace
 
-ModelDescription::ModelDescription(const ScoreModel& model) : kind(model.GetModelKind()) {
+ModelDescription::ModelDescription(const ScoreModel& model, const ExpressionText& expressions)
+    : kind(model.GetModelKind()) {
+  if (const TransformationDictionary* transformations = model.GetTransformationDictionary())
+    derived = DescribeDerived(*transformations, expressions);
   if (const ScoreVersionInfo* info = model.GetVersionInfo()) version = info->GetVersionInfo();
   const ScoreDictVar* target_variable = model.GetTargetVar();
   if (target_variable != nullptr) {
@@ -120,6 +124,23 @@ ModelDescription::ModelDescription(const ScoreModel& model) : kind(model.GetMode
     field.role = role < 0 ? "predictor" : NameOf(role, kRoles);
     field.is_read = is_read;
     inputs.push_back(std::move(field));
+  }
+}
+
+ModelDescription::ModelDescription(const ScoreDictionary& dictionary,
+                                   const TransformationDictionary& transformations,
+                                   const ExpressionText& expressions)
+    : derived(DescribeDerived(transformations, expressions)) {
+  std::unordered_set<const ScoreDictVar*> read;
+  for (const ScoreDictVar* variable :
+       FindDerivedInputs(transformations.GetDerivedVarNames(), transformations, dictionary))
+    read.insert(variable);
+  for (const std::string& name : dictionary.GetVarNames()) {
+    const ScoreDictVar* variable = dictionary.GetVar(name);
+    if (variable == nullptr) continue;
+    inputs.push_back(Describe(*variable));
+    inputs.back().role = "data field";
+    inputs.back().is_read = read.count(variable) != 0;
   }
 }
 

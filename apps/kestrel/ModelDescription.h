@@ -7,11 +7,14 @@
 #include <vector>
 
 namespace MCKestrel_800 {
-class ScoreDictVar;
+class ScoreDictionary;
 class ScoreModel;
+class TransformationDictionary;
 }  // namespace MCKestrel_800
 
 namespace kestrel_program {
+
+class ExpressionText;
 
 /// One variable of the model.
 struct FieldDescription {
@@ -22,24 +25,31 @@ struct FieldDescription {
 
   std::string name;
   std::string label;
-  std::string type;      ///< "number", "integer", "text", or the name of the date or time type
-  std::string level;     ///< "continuous", "ordinal" or "nominal"
-  std::string role;      ///< "predictor", "target", "supplementary", "order", "group", ...
+  std::string type;   ///< "number", "integer", "text", or the name of the date or time type
+  std::string level;  ///< "continuous", "ordinal" or "nominal"
+  std::string
+      role;  ///< "predictor", "target", "supplementary", "order", "group", ...; empty for derived fields
   bool is_read = false;  ///< whether the table must have a column for it
   std::vector<Category> categories;
   std::vector<std::string> missing;  ///< single values ("-99") and intervals ("[900, 999)")
+  std::string expression;            ///< of derived fields
 };
 
 struct ModelDescription {
-  explicit ModelDescription(const MCKestrel_800::ScoreModel& model);
+  ModelDescription(const MCKestrel_800::ScoreModel& model, const ExpressionText& expressions);
+  /// Of a document that has derived fields and no model.
+  ModelDescription(const MCKestrel_800::ScoreDictionary& dictionary,
+                   const MCKestrel_800::TransformationDictionary& transformations,
+                   const ExpressionText& expressions);
   ~ModelDescription();
 
-  std::string kind;
+  std::string kind;  ///< empty without a model
   std::string version;
   bool has_target = false;
   FieldDescription target;
   /// The model's other fields, in the document's order.
   std::vector<FieldDescription> inputs;
+  std::vector<FieldDescription> derived;
 };
 
 }  // namespace kestrel_program

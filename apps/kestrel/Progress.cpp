@@ -47,6 +47,11 @@ void Progress::Clear() {
   is_shown_ = false;
 }
 
+void Progress::Say(const std::string& text) {
+  Clear();
+  std::fprintf(stderr, "kestrel: %s\n", text.c_str());
+}
+
 std::string Progress::Summarize() const {
   const double seconds = GetSeconds();
   return std::to_string(cases_) + (cases_ == 1 ? " case, " : " cases, ") + std::to_string(failures_) +

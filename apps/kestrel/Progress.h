@@ -27,6 +27,8 @@ class Progress {
 
   /// Takes the line away, so that something else can be written.
   void Clear();
+  /// Writes a message in the place of the line: "kestrel: " and the text.
+  void Say(const std::string& text);
   /// "150 cases, 2 failed, 0.012 s, 12500 cases a second".
   std::string Summarize() const;
 

@@ -11,8 +11,8 @@ using Arguments = std::vector<std::string>;
 
 TEST(KestrelCommandLine, HasHelpEverywhereWithTheExitCodes) {
   const Arguments rows[] = {
-      {"--help"},          {"-h"},          {"score", "--help"},     {"describe", "--help"},
-      {"check", "--help"}, {"score", "-h"}, {"copy-table", "--help"}};
+      {"--help"},          {"-h"},          {"score", "--help"},      {"describe", "--help"},
+      {"check", "--help"}, {"score", "-h"}, {"copy-table", "--help"}, {"derive", "--help"}};
   for (const Arguments& arguments : rows) {
     const ProgramOutcome outcome = RunKestrel(arguments);
     EXPECT_EQ(outcome.exit_code, 0) << arguments[0];
@@ -20,7 +20,7 @@ TEST(KestrelCommandLine, HasHelpEverywhereWithTheExitCodes) {
     EXPECT_NE(
         outcome.output.find("Exit codes:\n"
                             "  0  done\n"
-                            "  1  done, but some cases have no prediction because they could not be read or "
+                            "  1  done, but some cases have no answer because they could not be read or "
                             "scored\n"
                             "  2  the command line is not right\n"
                             "  3  the model's document cannot be used\n"
@@ -42,10 +42,22 @@ TEST(KestrelCommandLine, HelpOfScoreTellsOfEveryOption) {
   }
 }
 
+TEST(KestrelCommandLine, HelpOfDeriveTellsOfEveryOption) {
+  const std::string help = RunKestrel({"derive", "--help"}).output;
+  for (const char* word : {"MODEL", "DATA", "-o,--output", "--delimiter", "--format", "{csv,jsonl}",
+                           "--keep[=NAME,...]", "--missing", "--on-error", "{stop,null}", "--fields",
+                           "--stats", "--version", "LocalTransformations"}) {
+    EXPECT_NE(help.find(word), std::string::npos) << word;
+  }
+  EXPECT_EQ(help.find("--models"), std::string::npos);
+  EXPECT_EQ(help.find("--explain"), std::string::npos);
+}
+
 TEST(KestrelCommandLine, HasTheVersionEverywhere) {
   for (const Arguments& arguments :
        {Arguments{"--version"}, Arguments{"score", "--version"}, Arguments{"describe", "--version"},
-        Arguments{"check", "--version"}, Arguments{"copy-table", "--version"}}) {
+        Arguments{"check", "--version"}, Arguments{"derive", "--version"},
+        Arguments{"copy-table", "--version"}}) {
     const ProgramOutcome outcome = RunKestrel(arguments);
     EXPECT_EQ(outcome.exit_code, 0);
     EXPECT_EQ(outcome.output, "kestrel 8.0.0\n");
@@ -63,10 +75,21 @@ const char kCommands[] = "kestrel --help tells what they do";
 const char kScore[] = "kestrel score --help lists what is accepted";
 
 const UsageRow kUsageRows[] = {
-    {{}, "a command is missing; accepted is score, describe, check or copy-table", kCommands},
-    {{"scare"}, "\"scare\" is no command; accepted is score, describe, check or copy-table", kCommands},
-    {{"--fast"}, "\"--fast\" is no command; accepted is score, describe, check or copy-table", kCommands},
+    {{}, "a command is missing; accepted is score, derive, describe, check or copy-table", kCommands},
+    {{"scare"},
+     "\"scare\" is no command; accepted is score, derive, describe, check or copy-table",
+     kCommands},
+    {{"--fast"},
+     "\"--fast\" is no command; accepted is score, derive, describe, check or copy-table",
+     kCommands},
     {{"score"}, "MODEL is required", kScore},
+    {{"derive"}, "MODEL is required", "kestrel derive --help lists what is accepted"},
+    {{"derive", "m", "--fields"},
+     "--fields: 1 required NAME,... missing",
+     "kestrel derive --help lists what is accepted"},
+    {{"derive", "m", "--explain"},
+     "The following argument was not expected: --explain",
+     "kestrel derive --help lists what is accepted"},
     {{"describe"}, "MODEL is required", "kestrel describe --help lists what is accepted"},
     {{"check"}, "MODEL is required", "kestrel check --help lists what is accepted"},
     {{"score", "m", "d", "e"}, "The following argument was not expected: e", kScore},

@@ -32,9 +32,11 @@ TEST_F(KeptColumns, AreFoundByName) {
 
 TEST_F(KeptColumns, AreRefusedWhenTheyAreNotThereOrAskedForTwice) {
   const std::pair<Names, const char*> rows[] = {
-      {{"x"}, "--keep: the table has no column \"x\""},
-      {{"a,"}, "--keep: the table has no column \"\""},
-      {{"A"}, "--keep: the table has no column \"A\""},
+      {{"x"}, "--keep: the table has no column \"x\"; the columns are a, b, c,d, e"},
+      {{"a,"}, "--keep: the table has no column \"\"; the columns are a, b, c,d, e"},
+      {{"A"},
+       "--keep: the table has no column \"A\"; the columns are a, b, c,d, e\n  hint: upper and lower case "
+       "count; there is a"},
       {{"a,b,a"}, "--keep: the column \"a\" is asked for twice"},
       {{"a", "a"}, "--keep: the column \"a\" is asked for twice"},
   };

@@ -371,7 +371,7 @@ TEST(KestrelScore, KeepsColumnsBesideThePredictions) {
        "x\n1\n",
        2,
        "",
-       "kestrel: --keep: the table has no column \"y\"\n"},
+       "kestrel: --keep: the table has no column \"y\"; the columns are x\n"},
   });
 }
 

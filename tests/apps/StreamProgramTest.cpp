@@ -37,9 +37,13 @@ std::string LongTable() {
   return table;
 }
 
-const std::vector<std::string> kCommands[] = {
-    {"score", "D/line.xml"}, {"check", "D/line.xml"}, {"describe", "D/line.xml"}, {"--help"},
-    {"--version"},           {"copy-table"}};
+const std::vector<std::string> kCommands[] = {{"score", "D/line.xml"},
+                                              {"check", "D/line.xml"},
+                                              {"describe", "D/line.xml"},
+                                              {"--help"},
+                                              {"--version"},
+                                              {"copy-table"},
+                                              {"derive", "D/derived.xml", "--fields", "twice"}};
 
 TEST(KestrelStreams, ReportAFullDisk) {
   const TempFolder folder;
