@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdint>
 
 #include "kestrel/math/MCPower.h"
 #include "kestrel/math/SaddlePoint.h"
@@ -139,11 +138,6 @@ double EndCorrection(const FourFold& table) {
 }
 
 }  // namespace
-
-bool IsCount(double n) {
-  // The conversion there and back is shorter than std::floor.
-  return n >= 0.0 && n <= kLargestCount && static_cast<double>(static_cast<std::int64_t>(n)) == n;
-}
 
 double BinomialProbability(double k, double n, double prob) {
   FactorialQuotient factorials;

@@ -3,13 +3,18 @@
 #ifndef KESTREL_MATH_POINTPROBABILITY_H
 #define KESTREL_MATH_POINTPROBABILITY_H
 
+#include <cstdint>
+
 namespace MCMath_800 {
 
 /// The largest count: up to 2^53 every whole number is a double of its own.
 constexpr double kLargestCount = 9007199254740992.0;
 
 /// Whether n is a whole number from 0 to kLargestCount.
-bool IsCount(double n);
+inline bool IsCount(double n) {
+  // The conversion there and back is shorter than std::floor.
+  return n >= 0.0 && n <= kLargestCount && static_cast<double>(static_cast<std::int64_t>(n)) == n;
+}
 
 /// The probability of k successes in n trials, k <= n both counts, 0 < prob < 1. 0 when it is too small.
 double BinomialProbability(double k, double n, double prob);

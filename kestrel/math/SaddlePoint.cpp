@@ -145,8 +145,11 @@ double StirlingError(double a) {
 
 double StirlingErrorOfCount(double m) {
   if (m < 16.0) return kStirlingOfCount[static_cast<int>(m)];
+  // As much of Stirling's series as counts from 16 on.
+  constexpr double kSeries[] = {kStirlingSeries[0], kStirlingSeries[1], kStirlingSeries[2],
+                                kStirlingSeries[3], kStirlingSeries[4], kStirlingSeries[5]};
   const double v = 1.0 / m;
-  return v * Polynomial(kStirlingSeries, v * v);
+  return v * Polynomial(kSeries, v * v);
 }
 
 }  // namespace MCMath_800

@@ -23,13 +23,14 @@ double LogDeviance(double u);
 /// From here to -1 a distance over the count, though right to 2^-79, has too few digits of the mean.
 constexpr double kFarBelow = -0.99;
 
-/// count ln(count / mean) + mean - count for count > 0, where distance = mean - count is known better than
+/// count ln(count / mean) + mean - count for count >= 1, where distance = mean - count is known better than
 /// the subtraction gives it. mean  a function that gives it; it is seldom needed.
 template <class Mean>
 DoubleDouble Deviance(const Mean& mean, DoubleDouble distance, double count) {
   const HeadAndTail n = Split(count);
-  const double head = HeadOf(distance.high / count);
-  const double tail = ((distance.high - head * n.head) - head * n.tail + distance.low) / count;
+  const double inverse = 1.0 / count;
+  const double head = HeadOf(distance.high * inverse);
+  const double tail = ((distance.high - head * n.head) - head * n.tail + distance.low) * inverse;
   if (head < kFarBelow) return distance - Log(mean() / count) * count;
   const HeadAndTail deviance = Split(LogDeviance({head, tail}));
   return AddOrdered(deviance.head * n.head, deviance.head * n.tail + deviance.tail * count);
