@@ -1,6 +1,8 @@
 #!/usr/bin/env python3
 """What the program costs beside reading and writing the same table: 1,000,000 rows of 20 numeric columns.
 
+The model is a linear one; the derived field is its prediction, as a function tree.
+
 usage: bench/program/run.py [--smoke] PROGRAM
 
 Both sides run in turns; figures are medians of five rounds of user and system time, and the largest memory seen.
@@ -25,6 +27,18 @@ def write_model(path):
                   f'<RegressionModel functionName="regression"><MiningSchema>{schema}'
                   '<MiningField name="y" usageType="target"/></MiningSchema>'
                   f'<RegressionTable intercept="0.25">{terms}</RegressionTable></RegressionModel></PMML>')
+
+
+def write_derived(path):
+    """The same sum as a derived field."""
+    fields = "".join(f'<DataField name="x{i}" optype="continuous" dataType="double"/>' for i in range(INPUTS))
+    terms = "".join(f'<Apply function="*"><FieldRef field="x{i}"/><Constant>{0.5 + i / 8}</Constant></Apply>'
+                    for i in range(INPUTS))
+    with open(path, "w", encoding="utf-8") as out:
+        out.write(f'<PMML version="4.4"><Header/><DataDictionary numberOfFields="{INPUTS}">{fields}</DataDictionary>'
+                  '<TransformationDictionary><DerivedField name="y" optype="continuous" dataType="double">'
+                  f'<Apply function="sum">{terms}<Constant>0.25</Constant></Apply></DerivedField>'
+                  '</TransformationDictionary></PMML>')
 
 
 def write_table(path, rows):
@@ -63,20 +77,23 @@ def main():
     program = sys.argv[-1]
     rows = 10_000 if smoke else 1_000_000
     with tempfile.TemporaryDirectory() as folder:
-        model, table, out = (os.path.join(folder, name) for name in ("model.xml", "table.csv", "out.csv"))
+        model, derived, table, out = (os.path.join(folder, name)
+                                      for name in ("model.xml", "derived.xml", "table.csv", "out.csv"))
         write_model(model)
+        write_derived(derived)
         write_table(table, rows)
         megabytes = os.path.getsize(table) / 1e6
         sides = {
             "read and write the table, no model": [program, "copy-table", table, "-o", out],
             "score": [program, "score", model, table, "-o", out],
             "score, table copied beside the predictions": [program, "score", model, table, "--keep", "-o", out],
+            "derive": [program, "derive", derived, table, "-o", out],
         }
         figures = {name: [] for name in sides}
         for _ in range(1 if smoke else 5):
             for name, command in sides.items():
                 figures[name].append(run(command))
-                if name == "score":
+                if name in ("score", "derive"):
                     check(out, table)
         print(f"{rows} rows of {INPUTS} columns, {megabytes:.0f} MB")
         baseline = None
