@@ -182,8 +182,8 @@ double MCDistFun::vexasigt(const double& size, const double& df, long& err) {
   const DoubleDouble square =
       size > 1e100 ? DoubleDouble(size) / df * size : MultiplyExactly(size, size) / df;
   const DoubleDouble w = DoubleDouble(1.0) / (square + 1.0);
-  const DoubleDouble above = AddExactly(1.0, -size) * AddExactly(1.0, size);
-  return 0.5 * cbtaux({w, w * square, above * w * 0.5}, a, 0.5, false, err);
+  const DoubleDouble deviation = AddExactly(1.0, -size) * w * AddExactly(1.0, size) * 0.5;
+  return 0.5 * cbtaux({w, w * square, deviation}, a, 0.5, false, err);
 }
 
 double MCDistFun::vexacdft(const double& x, const double& df, long& err) {

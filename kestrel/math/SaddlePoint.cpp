@@ -129,8 +129,10 @@ double GuardedExpMinus(DoubleDouble x) {
 }
 
 double ExpMinus(DoubleDouble x) {
+  // Where e^-x has come to 0. No number is what a product beyond the format leaves.
+  if (!(x.high < 746.0)) return 0.0;
   const double main = std::exp(-x.high);
-  return main == 0.0 || std::isinf(main) ? main : main - main * x.low;
+  return std::isinf(main) ? main : main - main * x.low;
 }
 
 // The name and the use of this function are C. Loader's, "Fast and accurate computation of binomial

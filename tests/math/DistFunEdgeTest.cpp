@@ -42,6 +42,13 @@ TEST(DistFunEdge, TellsTheSidesOfAMeanBeside1) {
   EXPECT_EQ(MCDistFun::CdfBeta(0.99999999999970224, 4.5061458980597502e+232, 1.3418997578011918e+220), 1.0);
 }
 
+TEST(DistFunEdge, TakesAsManyDegreesOfFreedomAsThereAre) {
+  // With so many t is normal; the square of x leaves the format, its quotient by df does not.
+  EXPECT_EQ(MCDistFun::CdfT(-1.5249991873269134e+231, 2.6331632542201074e+306), 0.0);
+  EXPECT_EQ(MCDistFun::SigT(3.2449679431321667e+282, 1.2836550084475334e+306), 0.0);
+  EXPECT_NEAR(MCDistFun::SigT(1.5, 1.2836550084475334e+306), MCDistFun::CdfStdNorm(-1.5), 1e-15);
+}
+
 TEST(DistFunEdge, PutsQuantilesAtTheEndOfTheFormat) {
   EXPECT_EQ(MCDistFun::IdfBeta(0.44788739676632855, 1.8253825604672876e+83, 1.7358391982700955e-08), 1.0);
   EXPECT_EQ(MCDistFun::IdfT(3.9018641310086452e-85, 2.2443465892275746e-307), kMissing);
