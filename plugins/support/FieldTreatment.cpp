@@ -22,7 +22,7 @@ FieldTreatment::FieldTreatment(const MiningField& field)
 bool FieldTreatment::Treat(const ScoreValue* value, const ScoreValue*& treated) {
   treated = value;
   const ValueRules::Verdict verdict = rules_.Judge(value);
-  if (verdict == ValueRules::kMissing) return TreatMissing(value, treated);
+  if (verdict == ValueRules::kMissing) return TreatMissing(value == nullptr ? missing_ : value, treated);
   if (is_text_ && verdict == verdict_of_missing_text_ && IsEmptyText(*value)) {
     return TreatMissing(missing_, treated);
   }

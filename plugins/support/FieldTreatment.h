@@ -16,9 +16,9 @@ namespace MCKestrel_800 {
 /// hold the two against each other.
 ///
 /// A value that is missing by itself and not replaced stays as it is. One that the treatment makes missing,
-/// and an empty text that stands for a missing one, becomes the system-missing number (date/time) or, of a
-/// text, nothing; of a derived field's text the empty one, which is missing there. A number that is given for
-/// a date/time becomes one.
+/// an empty text that stands for a missing one, and no value at all become the system-missing number
+/// (date/time) or, of a text, nothing; of a derived field's text the empty one, which is missing there. A
+/// number that is given for a date/time becomes one.
 ///
 /// Serves one case at a time. The field and its variable must outlive the treatment.
 class FieldTreatment {

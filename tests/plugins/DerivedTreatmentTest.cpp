@@ -35,6 +35,7 @@ const TreatmentRow kNumberRows[] = {
      NormContinuous("x", kCurve, "mapMissingTo='7'"), kMissing, "0.4"},
     {"the expression's where the schema has none", "", NormContinuous("x", kCurve, "mapMissingTo='7'"),
      kMissing, "7"},
+    {"and where the case has no value", "", NormContinuous("x", kCurve, "mapMissingTo='7'"), {}, "7"},
     {"an outlier as it is", "outliers='asIs' lowValue='0' highValue='10'", NormContinuous("x", kCurve), 20.0,
      "3"},
     {"cut off before the curve", "outliers='asExtremeValues' lowValue='0' highValue='10'",
