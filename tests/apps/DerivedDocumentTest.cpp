@@ -1,4 +1,4 @@
-// What `kestrel describe` and `kestrel check` say of derived fields.
+// What `kestrel describe` and `kestrel check` say of derived fields, and models that read them.
 
 #include <gtest/gtest.h>
 
@@ -77,6 +77,56 @@ TEST(KestrelDescribe, ShowsSoManyRowsOfATableAsCanBeRead) {
   const nlohmann::json all = nlohmann::json::parse(RunKestrel({"describe", "-", "--json"}, document).output);
   const std::string expression = all["derived"][2]["expression"];
   EXPECT_NE(expression.find(", \"1000\" -> \"-1000\", else missing"), std::string::npos);
+}
+
+/// line.xml with a derived field of the document, and one of the model that reads it and is read in the place
+/// of x.
+std::string ModelThatReadsDerivedFields() {
+  const std::string field =
+      "<DerivedField name=\"NAME\" optype=\"continuous\" dataType=\"double\"><Apply "
+      "function=\"*\"><FieldRef field=\"SOURCE\"/><Constant>FACTOR</Constant></Apply>"
+      "</DerivedField>";
+  const auto field_of = [&field](const char* name, const char* source, const char* factor) {
+    return Replaced(Replaced(Replaced(field, "NAME", name), "SOURCE", source), "FACTOR", factor);
+  };
+  std::string document = Replaced(FileText(DataPath("line.xml")), "</DataDictionary>",
+                                  "</DataDictionary><TransformationDictionary>" + field_of("two", "x", "2") +
+                                      "</TransformationDictionary>");
+  document = Replaced(
+      document, "</MiningSchema>",
+      "</MiningSchema><LocalTransformations>" + field_of("six", "two", "3") + "</LocalTransformations>");
+  return Replaced(document, "NumericPredictor name=\"x\"", "NumericPredictor name=\"six\"");
+}
+
+TEST(KestrelDescribe, ShowsTheDerivedFieldsOfAModel) {
+  const ProgramOutcome outcome = RunKestrel({"describe", "-"}, ModelThatReadsDerivedFields());
+  EXPECT_EQ(outcome.exit_code, 0) << outcome.errors;
+  EXPECT_EQ(outcome.output,
+            "kind:    RegressionModel\n"
+            "version: 4.4\n"
+            "target:\n"
+            "  name  type    level       role    missing values  categories\n"
+            "  y     number  continuous  target  -               -\n"
+            "inputs: 1\n"
+            "  name  type    level       role       missing values  categories\n"
+            "  x     number  continuous  predictor  -               -\n"
+            "derived fields: 2\n"
+            "  name  type    level       expression\n"
+            "  two   number  continuous  x * 2\n"
+            "  six   number  continuous  two * 3\n");
+}
+
+TEST(KestrelScore, ComputesTheDerivedFieldsOfAModel) {
+  const TempFolder folder;
+  folder.Write("m.xml", ModelThatReadsDerivedFields());
+  RunOptions options;
+  options.input = "x\n1\n-0.5\n";
+  ProgramOutcome outcome = RunKestrel(folder, {"score", "T/m.xml"}, options);
+  EXPECT_EQ(outcome.exit_code, 0) << outcome.errors;
+  EXPECT_EQ(outcome.output, "prediction\n13\n-5\n");
+  outcome = RunKestrel(folder, {"derive", "T/m.xml"}, options);
+  EXPECT_EQ(outcome.exit_code, 0) << outcome.errors;
+  EXPECT_EQ(outcome.output, "two\n2\n-1\n");
 }
 
 TEST(KestrelDescribe, HasNoDerivedFieldsWhereThereAreNone) {
