@@ -6,6 +6,7 @@
 #include <typeinfo>
 
 #include "kestrel/dictionary/ScoreCaseRecord.h"
+#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
 #include "plugins/support/DerivedInputs.h"
@@ -81,8 +82,8 @@ void CaseVector::Seal() {
 void CaseVector::Seal(const MiningSchema& schema, const ScoreDictionary& data,
                       TransformationDictionary* derived) {
   Seal();
-  const bool reads_derived = std::any_of(fields_.begin(), fields_.end(), [](const MiningField* field) {
-    return field->variable->IsDerivedVariable();
+  const bool reads_derived = std::any_of(fields_.begin(), fields_.end(), [&data](const MiningField* field) {
+    return data.GetVar(field->name) == nullptr;
   });
   if (derived == nullptr || !reads_derived) return;
   derived_ = std::make_unique<DerivedInputs>(schema, data, *derived, fields_);

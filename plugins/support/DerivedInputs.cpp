@@ -24,11 +24,15 @@ DerivedInputs::DerivedInputs(const MiningSchema& schema, const ScoreDictionary& 
   ChooseWanted(fields);
 }
 
+// By the name: a host's data dictionary may hold variables that once were derived.
+bool DerivedInputs::IsDerived(const MiningField& field) const {
+  return data_.GetVar(field.name) == nullptr;
+}
+
 void DerivedInputs::PlaceFields(const std::vector<const MiningField*>& fields, DerivedNeeds& needs) {
   std::vector<int> numbers;
   for (const MiningField* field : fields) {
-    numbers.push_back(field->variable->IsDerivedVariable() ? needs.AddDerived(field->name)
-                                                           : needs.AddData(*field->variable));
+    numbers.push_back(IsDerived(*field) ? needs.AddDerived(field->name) : needs.AddData(*field->variable));
   }
   data_fields_ = needs.GetDataFields();
   case_positions_.assign(data_fields_.size(), -1);
@@ -36,7 +40,7 @@ void DerivedInputs::PlaceFields(const std::vector<const MiningField*>& fields, D
   const std::vector<int> first_data = needs.FindFirstData();
   for (std::size_t i = 0; i < fields.size(); ++i) {
     const ScoreDictVar& variable = *fields[i]->variable;
-    if (!variable.IsDerivedVariable()) {
+    if (!IsDerived(*fields[i])) {
       positions_.push_back(numbers[i]);
       data_of_fields_.push_back(numbers[i]);
       continue;
@@ -88,7 +92,7 @@ void DerivedInputs::AddTreatedFields(const MiningSchema& schema, const DerivedNe
 void DerivedInputs::ChooseWanted(const std::vector<const MiningField*>& fields) {
   std::vector<std::string> names;
   for (const MiningField* field : fields) {
-    if (field->variable->IsDerivedVariable()) names.push_back(field->name);
+    if (IsDerived(*field)) names.push_back(field->name);
   }
   for (const TreatedField& field : treated_fields_)
     names.push_back(field.treatment->GetField().name);

@@ -76,6 +76,7 @@ class DerivedInputs {
     std::size_t value_index;
   };
 
+  bool IsDerived(const MiningField& field) const;
   void PlaceFields(const std::vector<const MiningField*>& fields, DerivedNeeds& needs);
   void AddSources(const MiningSchema& schema, const DerivedNeeds& needs);
   void AddTreatedFields(const MiningSchema& schema, const DerivedNeeds& needs);

@@ -70,7 +70,8 @@ class FieldReader {
       FailAt(element, KestrelException::kStructure, "<MiningField>'s name can't be null string !!");
     }
     variable_ = dictionary->GetVar(field_.name);
-    if (variable_ == nullptr && derived != nullptr) variable_ = derived->GetVar(field_.name);
+    is_derived_ = variable_ == nullptr;
+    if (is_derived_ && derived != nullptr) variable_ = derived->GetVar(field_.name);
     if (variable_ == nullptr) FailOnUnknownField();
     field_.variable = variable_;
   }
@@ -78,7 +79,7 @@ class FieldReader {
   MiningField Read() {
     ReadWord(Tags::XML_ATT_MININGFIELD_USAGETYPE, kUsageTypes, field_.role);
     // What is predicted is a field of the data.
-    if (field_.role == ScoreModel::kTarget && variable_->IsDerivedVariable()) FailOnUnknownField();
+    if (field_.role == ScoreModel::kTarget && is_derived_) FailOnUnknownField();
     ReadOptype();
     ReadOutliers();
     ReadWord(Tags::XML_ATT_MININGFIELD_MISSTREATMENT, kMissingTreatments, field_.missing_is_invalid);
@@ -167,6 +168,7 @@ class FieldReader {
 
   const DOMElement* element_;
   ScoreDictVar* variable_ = nullptr;
+  bool is_derived_ = false;
   MiningField field_;
 };
 

@@ -49,9 +49,9 @@ int PredicateInputs::SlotOf(const ScoreDictVar& variable) {
     default:
       slot = inputs_.AddCategory(*field, CaseVector::kMissingCategory);
   }
-  ScoreDictionary* dictionary = dictionaries_.data.get();
-  if (variable.IsDerivedVariable()) dictionary = dictionaries_.derived.get();
-  dictionary->GetVar(variable.GetName())->SetEncodedValueIndex(slot);
+  ScoreDictVar* own = dictionaries_.data->GetVar(variable.GetName());
+  if (own == nullptr) own = dictionaries_.derived->GetVar(variable.GetName());
+  own->SetEncodedValueIndex(slot);
   return slot;
 }
 

@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "kestrel/model/Results.h"
+#include "kestrel/transform/TransformVar.h"
 #include "kestrel/transform/TransformationDictionary.h"
 #include "tests/plugins/DerivedModelText.h"
 #include "tests/plugins/TreePredicates.h"
@@ -251,6 +252,31 @@ TEST(DerivedModels, AnElementHasItsOwnDerivedFields) {
   const std::unique_ptr<ScoreModel> model(translator.ParseFromTree(
       FirstChild(parsed->GetRoot(), u"RegressionModel"), dictionary.get(), nullptr, std::string()));
   EXPECT_EQ(ScoreOf(*model, {{"x", 2.0}}), "6");
+}
+
+// Such as one that keeps computed columns: in this model they are columns like any other.
+TEST(DerivedModels, AHostsDictionaryMayHoldDerivedVariables) {
+  const std::string local = Derived("d", "continuous double", Apply("*", FieldRef("kept") + Constant("3")));
+  const std::string fields = "<MiningField name='kept'/><MiningField name='x'/>";
+  const DerivedDocument document{"", local, fields};
+  const auto dictionary = kestrel_test::ReadDictionary(document.Rules("<True/>"));
+  auto kept = std::make_unique<TransformVar>("kept", ScoreDictVar::kNUMERIC_VAR);
+  dictionary->AddVar("kept", kept.release());
+  const DerivedDocument without{"", "", fields};
+  const auto build = [&dictionary](const std::string& text) {
+    const auto parsed = kestrel_test::ReadTree(text);
+    TreeTranslator translator;
+    return std::unique_ptr<ScoreModel>(translator.ParseFromTree(FirstChild(parsed->GetRoot(), u"TreeModel"),
+                                                                dictionary.get(), nullptr, std::string()));
+  };
+  const Case cells = {{"kept", 2.0}, {"x", 1.0}};
+  EXPECT_EQ(ScoreOf(*build(without.Tree(Compare("kept", "equal", "2"))), cells), "1");
+  EXPECT_EQ(ScoreOf(*build(document.Tree(Compare("d", "equal", "6"))), cells), "1");
+  EXPECT_EQ(ScoreOf(*build(document.Tree("<CompoundPredicate booleanOperator='and'>" +
+                                         Compare("kept", "equal", "2") + Compare("d", "equal", "6") +
+                                         "</CompoundPredicate>")),
+                    cells),
+            "1");
 }
 
 TEST(DerivedModels, TwoModelsServeTwoThreads) {
