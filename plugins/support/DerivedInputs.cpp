@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <string>
+#include <tuple>
 #include <utility>
 
 #include "kestrel/dictionary/ScoreCaseRecord.h"
@@ -85,8 +86,9 @@ void DerivedInputs::AddTreatedFields(const MiningSchema& schema, const DerivedNe
                                first == DerivedNeeds::kNone ? static_cast<int>(data_fields_.size()) : first,
                                std::make_unique<FieldTreatment>(*mining_field)});
   }
-  std::stable_sort(treated_fields_.begin(), treated_fields_.end(),
-                   [](const TreatedField& a, const TreatedField& b) { return a.level < b.level; });
+  std::sort(treated_fields_.begin(), treated_fields_.end(), [](const TreatedField& a, const TreatedField& b) {
+    return std::tie(a.level, a.shown) < std::tie(b.level, b.shown);
+  });
 }
 
 void DerivedInputs::ChooseWanted(const std::vector<const MiningField*>& fields) {
