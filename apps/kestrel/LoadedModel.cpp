@@ -24,7 +24,9 @@ std::string WithoutLeadingLineEnds(const std::string& text) {
   return first == std::string::npos ? std::string() : text.substr(first);
 }
 
-ProgramError Describe(const std::string& name, const KestrelException& fault) {
+/// own_hint  takes the place of the general one.
+ProgramError Describe(const std::string& name, const KestrelException& fault,
+                      const char* own_hint = nullptr) {
   std::string text = name;
   if (fault.GetLine() != 0) {
     text += ":" + std::to_string(fault.GetLine()) + ":" + std::to_string(fault.GetColumn());
@@ -35,7 +37,8 @@ ProgramError Describe(const std::string& name, const KestrelException& fault) {
   if (code == KestrelException::kUnsupported && !reason.empty()) {
     text += "\n  the system says: " + reason +
             "\n  hint: install the library for this kind of model beside the others, in lib/kestrel/plugins";
-  } else if (const char* hint = HintForFault(code, fault.GetErrorMessage())) {
+  } else if (const char* hint =
+                 own_hint != nullptr ? own_hint : HintForFault(code, fault.GetErrorMessage())) {
     text += std::string("\n  hint: ") + hint;
   }
   return ProgramError(code == KestrelException::kFile ? kInputOutput : kDocument, text);
@@ -144,7 +147,15 @@ std::unique_ptr<ScoreModel> LoadModel(const std::string& path, const std::string
 LoadedFields LoadFields(const std::string& path) {
   DocumentInput document(path);
   const std::string& name = document.GetName();
-  LoadedFields fields = Guard(name, [&] { return MakeFields(document.Open()); });
+  LoadedFields fields = Guard(name, [&] {
+    try {
+      return MakeFields(document.Open());
+    } catch (const KestrelException& fault) {
+      // The general hint tells of models.
+      if (IsWithoutModel(fault)) throw Describe(name, fault, "accepted is PMML as the root element");
+      throw;
+    }
+  });
   if (HasFields(fields)) return fields;
   const char* text = document.Holds("DerivedField")
                          ? ": the derived fields are those of a model alone (LocalTransformations), which "

@@ -373,6 +373,12 @@ TEST(KestrelDerive, SaysWhatIsWrongWithADocumentAndWhere) {
               "kestrel: T/m.xml" + std::string(row.want));
     EXPECT_NE(outcome.errors.find("  hint: "), std::string::npos) << row.want;
   }
+  folder.Write("m.xml", "<Table/>");
+  const ProgramOutcome other = RunKestrel(folder, {"derive", "T/m.xml", "T/data.csv"});
+  EXPECT_EQ(other.exit_code, 3);
+  EXPECT_EQ(other.errors,
+            "kestrel: T/m.xml:1:9: Unsupported Model found! (code 5)\n"
+            "  hint: accepted is PMML as the root element\n");
   const ProgramOutcome outcome = RunKestrel(folder, {"derive", "T/absent.xml", "T/data.csv"});
   EXPECT_EQ(outcome.exit_code, 5);
   EXPECT_EQ(outcome.errors, "kestrel: T/absent.xml: cannot be opened: No such file or directory\n");
