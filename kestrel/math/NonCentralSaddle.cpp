@@ -44,36 +44,39 @@ struct Line {
 };
 
 /// The cumulant function at 2 t / (1 - 2 t) = u, without its sign. Near the mean every term is small.
-DoubleDouble ExponentAt(const ChiQuotient& q, double nc, double u) {
+DoubleDouble ExponentAt(const ChiQuotient& q, DoubleDouble nc, double u) {
   const DoubleDouble w = AddExactly(1.0, u);
   const DoubleDouble v = q.odds * u / w;
-  if (v.high > 1.0 || v.high < -0.5)
-    return (Log(v + 1.0) * q.df2 - Log(w) * q.df1 - MultiplyExactly(nc, u)) * 0.5;
-  const DoubleDouble mean = AddExactly(q.df1, nc);
+  if (v.high > 1.0 || v.high < -0.5) return (Log(v + 1.0) * q.df2 - Log(w) * q.df1 - nc * u) * 0.5;
+  const DoubleDouble mean = nc + q.df1;
   const DoubleDouble twice =
       LogDeviance(Split(u)) * q.df1 + DoubleDouble(u) / w * ((q.bound - mean) - mean * u);
   return (q.df2 > 0.0 ? twice - LogDeviance(Split(v)) * q.df2 : twice) * 0.5;
 }
 
-/// The line through the saddle point, or a little beside it when that would lead through the pole at t = 0.
-Line ChooseLine(const ChiQuotient& q, double nc, const ChiSaddle& saddle) {
+/// The line through the saddle point, or a little beside it when that would lead through the pole at t = 0,
+/// or past it on the wrong side.
+Line ChooseLine(const ChiQuotient& q, DoubleDouble exact_nc, const ChiSaddle& saddle, bool upper) {
+  const double nc = exact_nc.high;
   const double square = 0.5 * (q.df1 + q.df2 * saddle.part * saddle.part) + nc * saddle.w;
-  const double gap = std::min(0.5 / std::sqrt(square), 0.3 / std::max(saddle.part, 1e-300));
+  // Not far towards the next singularities: below the pole there is one at u = -y.
+  const double room = std::min(1.0 / std::max(saddle.part, 1e-300), upper ? 1.0 : q.y);
+  const double gap = std::min(1.0 / std::sqrt(square), 0.3 * room);
   Line line{};
-  if (std::fabs(saddle.u) >= gap) {
+  if (std::fabs(saddle.u) >= gap && (saddle.u > 0.0) == upper) {
     line.u = saddle.u;
     line.w = saddle.w;
     line.part = saddle.part;
   } else {
-    line.u = std::copysign(gap, saddle.u);
+    line.u = upper ? gap : -gap;
     line.w = 1.0 + line.u;
     const double slant = q.df1 + nc * line.w;
     const double divisor = line.w + q.odds.high * line.u;
-    const double below = (AddExactly(q.df1, nc) - q.bound).high;
+    const double below = (exact_nc + q.df1 - q.bound).high;
     line.part = q.df2 > 0.0 ? q.odds.high / divisor : 0.0;
     line.tilt = 0.5 * (below + line.u * (slant + nc + slant * q.odds.high)) / divisor;
   }
-  line.exponent = ExponentAt(q, nc, line.u);
+  line.exponent = ExponentAt(q, exact_nc, line.u);
   return line;
 }
 
@@ -109,15 +112,22 @@ ChiSaddle FindSaddle(const ChiQuotient& q, double nc) {
   return {u, w, part, deviance};
 }
 
+bool ReachesBothSides(const ChiQuotient& q, double nc, const ChiSaddle& saddle) {
+  // The distance of that singularity in deviations at the pole; below a quarter the integral fails.
+  const double x = q.odds.high * q.y;
+  return saddle.u < 0.0 || std::sqrt(0.5 * q.df2 * x * x + (0.5 * q.df1 + nc) * q.y * q.y) > 0.3;
+}
+
 // The tail is an integral of e^K(t) / t over a path across the real axis, K the cumulant function (S. O. Rice
 // 1980, "Distribution of quadratic forms in normal random variables - evaluation by numerical integration").
 // With 1 - 2 t = (1 - z) / w the saddle point is at z = 0. The path z = i y - bend y^2 follows the steepest
 // descent there, so that nothing oscillates. The trapezoidal rule in theta, y = reach sinh(theta), converges
 // exponentially; the pole of 1 / t, which may be close, is taken out by its residue.
-NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle& saddle, SumCare care) {
+NonCentralTail IntegrateSaddle(const ChiQuotient& q, DoubleDouble nc, const ChiSaddle& saddle, bool upper,
+                               SumCare care) {
   const double digits = care == SumCare::kRough ? 15.0 : 35.0;
-  const Line line = ChooseLine(q, nc, saddle);
-  const double pull = nc * line.w;
+  const Line line = ChooseLine(q, nc, saddle, upper);
+  const double pull = nc.high * line.w;
   const double spread = 0.5 * (q.df1 + q.df2 * line.part * line.part) + pull;
   const double scale = std::sqrt(spread);
   const double bend = (q.df2 * line.part * line.part * line.part - q.df1 - 3.0 * pull) / (6.0 * spread);
@@ -131,19 +141,22 @@ NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle&
   // Inside a strip of that width the integrand grows at most as e to the power of the square below.
   const double strip = std::min(0.7, 6.0 / (scale * reach));
   const double growth = scale * reach * strip;
-  const double h = 2.0 * kPi * strip / (digits + growth * growth);
-  // y and its derivative, hyperbolic sine and cosine, go on by their addition theorem: nothing cancels.
-  const double turn = std::sinh(h);
-  const double keep = std::cosh(h);
-  double share = 0.5 * reach / line.u;
+  // y and its derivative, hyperbolic sine and cosine, go on by their addition theorem: nothing cancels. The
+  // step's sine is the rounded number, its cosine has what rounding leaves, or the two would drift apart.
+  const double turn = std::sinh(2.0 * kPi * strip / (digits + growth * growth));
+  const DoubleDouble keep_square = MultiplyExactly(turn, turn) + 1.0;
+  const double keep = std::sqrt(keep_square.high);
+  const double keep_rest = (keep_square - MultiplyExactly(keep, keep)).high / (2.0 * keep);
+  const double h = Log(DoubleDouble(keep, keep_rest) + turn).high;
+  DoubleDouble share = 0.5 * reach / line.u;
   double slope = 0.5 * reach;
   double curve = 0.25 * reach * line.u;
   double y = 0.0, rate = reach;
   constexpr int kNodeLimit = 500;
   for (int node = 0; node < kNodeLimit; ++node) {
     const double before = y;
-    y = keep * y + turn * rate;
-    rate = keep * rate + turn * before;
+    y = keep * y + (turn * rate + keep_rest * y);
+    rate = keep * rate + (turn * before + keep_rest * rate);
     const Complex z(-bend * y * y, y);
     const Complex inverse = Reciprocal(1.0 - z);
     Complex exponent = 0.5 * (q.df1 * Deviance(-z) + pull * (z * z * inverse)) + line.tilt * z;
@@ -152,7 +165,8 @@ NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle&
     const Complex power = Complex(weight * std::cos(exponent.imag()), weight * std::sin(exponent.imag())) *
                           Complex(1.0, 2.0 * bend * y);
     const Complex change = power * inverse;
-    share += (power * Reciprocal(line.u + z)).real();
+    const DoubleDouble sum = AddExactly(share.high, (power * Reciprocal(line.u + z)).real());
+    share = {sum.high, share.low + sum.low};
     slope += change.real();
     curve += 0.5 * (change * (line.w * inverse - 1.0)).real();
     if (exponent.real() < -digits) break;
@@ -161,7 +175,8 @@ NonCentralTail IntegrateSaddle(const ChiQuotient& q, double nc, const ChiSaddle&
   const double distance = std::asin(std::min(1.0, height(-line.u) / reach));
   const double pole = distance < strip ? 1.0 / std::expm1(2.0 * kPi * distance / h) : 0.0;
   const double sign = std::copysign(1.0, line.u);
-  return {sign * front * share - pole, sign * 0.5 * front * slope, sign * 0.5 * front * curve};
+  return {sign * front * (share.high + share.low) - pole, sign * 0.5 * front * slope,
+          sign * 0.5 * front * curve};
 }
 
 }  // namespace MCMath_800

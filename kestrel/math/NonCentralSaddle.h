@@ -41,9 +41,15 @@ struct NonCentralTail {
   double bend;
 };
 
-/// The share above the bound if u > 0, below it otherwise. For nc w of at least some hundred, so that the
-/// integrand fades before it comes to its singularities.
-NonCentralTail IntegrateSaddle(const ChiQuotient& quotient, double nc, const ChiSaddle& saddle, SumCare care);
+/// Whether the integral may be taken on the other side of the pole than the saddle point is. With few degrees
+/// of freedom below, another singularity comes too close there.
+bool ReachesBothSides(const ChiQuotient& quotient, double nc, const ChiSaddle& saddle);
+
+/// The share above the bound (`upper`) or below it; more exact on the side of u's sign. For nc w of at least
+/// sixty, so that the integrand fades before it comes to its singularities. nc has two doubles, since t's is
+/// a square.
+NonCentralTail IntegrateSaddle(const ChiQuotient& quotient, DoubleDouble nc, const ChiSaddle& saddle,
+                               bool upper, SumCare care);
 
 }  // namespace MCMath_800
 

@@ -32,15 +32,16 @@ enum class SumCare {
 // sides: their number grows with the root of where the largest is.
 
 /// The sum over j = 0, 1, ... of Poisson(j; lambda) P(a + j, x), x > 0.
-MixtureShare NonCentralGamma(double x, double a, double lambda, bool upper, SumCare care);
+MixtureShare NonCentralGamma(double x, double a, DoubleDouble lambda, bool upper, SumCare care);
 
 /// The sum over j of Poisson(j; lambda) I_x(a + j, b), for odds = x / (1 - x) > 0.
-MixtureShare NonCentralBeta(DoubleDouble odds, double a, double b, double lambda, bool upper, SumCare care);
+MixtureShare NonCentralBeta(DoubleDouble odds, double a, double b, DoubleDouble lambda, bool upper,
+                            SumCare care);
 
 /// Half the sum over k = 0, 1, ... of w(k / 2) I_x((k + 1) / 2, b) with w(u) = e^-lambda lambda^u / Gamma(u +
 /// 1), the share of a non-central t distribution between 0 and the point, or above it. drop and next are half
 /// the sums over the drops as above. lambda >= kSmallestPoissonMean.
-MixtureShare NonCentralStudent(DoubleDouble odds, double b, double lambda, bool upper, SumCare care);
+MixtureShare NonCentralStudent(DoubleDouble odds, double b, DoubleDouble lambda, bool upper, SumCare care);
 
 }  // namespace MCMath_800
 

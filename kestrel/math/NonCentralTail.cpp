@@ -6,6 +6,7 @@
 #include "kestrel/math/ErrorFunction.h"
 #include "kestrel/math/GammaRatio.h"
 #include "kestrel/math/MCDistFun.h"
+#include "kestrel/math/Polynomial.h"
 #include "kestrel/math/SaddlePoint.h"
 
 namespace MCMath_800 {
@@ -17,8 +18,10 @@ constexpr double kRootTwoPi = 2.50662827463100050242;
 
 /// Where the largest term's place, twice, makes the integral faster than the sum of all terms that count; t
 /// takes two sums.
-constexpr double kIntegralFrom = 600.0;
-constexpr double kStudentIntegralFrom = 250.0;
+constexpr double kIntegralFrom = 120.0;
+constexpr double kStudentIntegralFrom = 60.0;
+/// The largest parameter whose sum takes no more time than a call may.
+constexpr double kLongSumTo = 600.0;
 
 /// So close to an end a distribution of squares is as good as a power; the sums' quotients are no numbers
 /// there.
@@ -34,6 +37,18 @@ NonCentralTail Turned(const NonCentralTail& tail, bool turn) {
   return turn ? NonCentralTail{1.0 - tail.share, -tail.slope, -tail.bend} : tail;
 }
 
+/// What is taken from 1 loses as many digits as it leaves; beyond this the other side is worth its time.
+constexpr double kLargeShare = 0.6;
+
+/// The share below, or above (`upper`), from a tail of either side. `above` is the side that is likely the
+/// smaller; a skew distribution may prove it wrong, and is asked again if `both` sides are open.
+template <class Side>
+NonCentralTail FromSmaller(bool above, bool upper, bool both, const Side& side) {
+  const NonCentralTail tail = side(above);
+  if (both && tail.share > kLargeShare) return Turned(side(!above), above == upper);
+  return Turned(tail, above != upper);
+}
+
 /// The tail of the smaller side as that of the other parameter of a mixture: nc is twice lambda.
 NonCentralTail OfMixture(const MixtureShare& mixture, bool upper) {
   const double sign = upper ? 0.5 : -0.5;
@@ -41,15 +56,77 @@ NonCentralTail OfMixture(const MixtureShare& mixture, bool upper) {
 }
 
 /// The integral across zero: what the strip and the width ask of the inverse of the step's square, and where
-/// the sum ends. Thirteen digits, or five.
+/// the sum ends. All digits, or five.
 struct Mesh {
   double strip;
   double bent_strip;
   double width;
   double negligible;
 };
-constexpr Mesh kFineMesh = {72.0, 105.0, 1.85, 1e-17};
+constexpr Mesh kFineMesh = {110.0, 160.0, 2.3, 1e-18};
 constexpr Mesh kCoarseMesh = {10.0, 17.0, 0.65, 1e-6};
+
+/// 2 (e^d - 1 - d) / d^2 in d.
+constexpr double kExponentialSeries[] = {1.0,
+                                         1.0 / 3,
+                                         1.0 / 12,
+                                         1.0 / 60,
+                                         1.0 / 360,
+                                         1.0 / 2520,
+                                         1.0 / 20160,
+                                         1.0 / 181440,
+                                         1.0 / 1814400,
+                                         1.0 / 19958400,
+                                         1.0 / 239500800,
+                                         1.0 / 3113510400.,
+                                         1.0 / 43589145600.};
+
+/// s^2 - 1 - ln s^2 for s > 0.
+DoubleDouble SquareDeviance(double s) {
+  if (s < 0.1) return MultiplyExactly(s, s) - 1.0 - Log(s) * 2.0;
+  return LogDeviance(Split(MultiplyExactly(s, s) - 1.0));
+}
+
+/// What the integral across zero is taken of: minus its exponent where ln S is d from its peak. In the tails
+/// the exponent is large: it has two doubles at the peak, and elsewhere only what is beyond that is computed.
+class StudentExponent {
+ public:
+  StudentExponent(double x, double df, double nc) : df_(df) {
+    const double lean = x * nc;
+    peak_ = 2.0 * df / (lean + std::sqrt(lean * lean + 4.0 * df * (df + x * x)));
+    const DoubleDouble reach = MultiplyExactly(x, peak_);
+    const DoubleDouble z = reach + nc;
+    const DoubleDouble squares = MultiplyExactly(peak_, peak_) * df + reach * reach;
+    reach_ = reach.high;
+    z_ = z.high;
+    square_ = 0.5 * squares.high;
+    // The peak is a rounded number.
+    slant_ = (squares + reach * nc - df).high;
+    least_ = (SquareDeviance(peak_) * df + z * z) * 0.5;
+  }
+
+  double Curvature() const { return 4.0 * square_ + reach_ * (z_ - reach_); }
+  DoubleDouble Least() const { return least_; }
+
+  struct Value {
+    double beyond;
+    double z;  ///< x S + nc
+  };
+  Value At(double d) const {
+    const double grown = std::expm1(d);
+    const double bent = std::fabs(d) < 0.3 ? 0.5 * d * d * Polynomial(kExponentialSeries, d) : grown - d;
+    return {square_ * grown * grown + df_ * bent + slant_ * grown, z_ + reach_ * grown};
+  }
+
+ private:
+  double df_;
+  double peak_;
+  double reach_;
+  double z_;
+  double square_;
+  double slant_;
+  DoubleDouble least_;
+};
 
 /// P(Z + nc > x S) for x, nc < 0 with their signs taken off, that is P(Z < -x S - nc), where S^2 is a
 /// chi-square over its df. The series of the other signs would cancel here, the integral over ln S (D. B.
@@ -58,83 +135,83 @@ constexpr Mesh kCoarseMesh = {10.0, 17.0, 0.65, 1e-6};
 NonCentralTail StudentAcrossZero(double x, double df, double nc, SumCare care) {
   const Mesh mesh = care == SumCare::kRough ? kCoarseMesh : kFineMesh;
   const double half = 0.5 * df;
-  // Where the integrand peaks, and how sharply.
-  const double lean = x * nc;
-  const double both = df + x * x;
-  const double peak = 2.0 * df / (lean + std::sqrt(lean * lean + 4.0 * df * both));
-  const double centre = std::log(peak);
-  const double curvature = 2.0 * both * peak * peak + lean * peak;
+  const StudentExponent exponent(x, df, nc);
   // Few degrees of freedom fade slowly to the left; the variable is bent to make them end.
   const double bend = df < 8.0 ? 1.0 : 0.0;
   // A wide integrand's step is bound by the strip around the axis in which it fades, a narrow one's by its
-  // width: either way the rule is right to thirteen digits.
-  const double step = 1.0 / std::sqrt((bend == 0.0 ? mesh.strip : mesh.bent_strip) + mesh.width * curvature);
+  // width.
+  const double wanted =
+      1.0 / std::sqrt((bend == 0.0 ? mesh.strip : mesh.bent_strip) + mesh.width * exponent.Curvature());
+  // Powers of it bend the variable: it is the rounded number, the step its logarithm.
+  const double fall = std::exp(-wanted);
+  const double step = -Log(fall).high;
   NonCentralTail sum = {0.0, 0.0, 0.0};
   // Adds the value at w and returns its share; tail = bend e^-w.
   const auto add = [&](double w, double tail) {
-    const double v = centre + w - tail;
-    const double s = std::exp(v);
-    // s^2 - 1 - ln s^2
-    const double fade = std::fabs(v) < 0.25 ? LogDeviance(std::expm1(2.0 * v)) : s * s - 1.0 - 2.0 * v;
-    const double z = x * s + nc;
-    const double density = std::exp(-half * fade - 0.5 * z * z) * (1.0 + tail);
-    const double share = density * ScaledErfc(z / kRootTwo);
+    const StudentExponent::Value value = exponent.At(w - tail);
+    const double density = std::exp(-value.beyond) * (1.0 + tail);
+    const double share = density * ScaledErfc(value.z / kRootTwo);
     sum.share += share;
     sum.slope -= density;
-    sum.bend += z * density;
+    sum.bend += value.z * density;
     return share;
   };
   const double first = add(0.0, bend);
-  for (const double way : {step, -step}) {
-    const double fall = std::exp(-way);
-    double before = first, tail = bend;
+  for (const bool right : {true, false}) {
+    const double way = right ? step : -step;
+    const DoubleDouble change = right ? DoubleDouble(fall) : DoubleDouble(1.0) / fall;
+    double before = first;
+    DoubleDouble tail = bend;
     constexpr int kNodeLimit = 400;
     for (int node = 1; node <= kNodeLimit; ++node) {
-      tail *= fall;
-      const double value = add(node * way, tail);
+      tail = tail * change;
+      const double value = add(node * way, tail.high + tail.low);
       if (value <= mesh.negligible * sum.share && value <= before) break;
       before = value;
     }
   }
-  const double scale = GammaPower(half, half) * step;
+  const double scale = GammaPower(half, half) * GuardedExpMinus(exponent.Least()) * step;
   const double density = scale * 2.0 / kRootTwoPi;
   return {scale * sum.share, density * sum.slope, density * sum.bend};
 }
 
-/// P(T <= x), or P(T > x), for x, nc > 0: the share below 0 and a mixture beyond it.
-NonCentralTail StudentOneSide(double x, double df, double nc, bool upper, SumCare care) {
-  const DoubleDouble square = MultiplyExactly(x, x) / df;
-  const double lambda = 0.5 * nc * nc;
-  const ChiQuotient quotient = ChiAgainstChi(1.0, df, square);
-  const ChiSaddle saddle = FindSaddle(quotient, nc * nc);
-  if (nc * nc * saddle.w >= kStudentIntegralFrom) {
-    // P(T < -x) is too small to count: what is left is that T^2 has the non-central F distribution.
-    const NonCentralTail tail = IntegrateSaddle(quotient, nc * nc, saddle, care);
-    return Turned({tail.share, 2.0 * nc * tail.slope, 2.0 * tail.slope + 4.0 * nc * nc * tail.bend},
-                  (saddle.u > 0.0) != upper);
-  }
-  // Whichever tail is the smaller, about.
-  const bool above = x > nc;
+/// P(T <= x), or P(T > x) (`above`), for x, nc > 0: the share below 0 and a mixture beyond it.
+NonCentralTail StudentMixture(double x, double df, double nc, DoubleDouble square, bool above, SumCare care) {
+  const DoubleDouble lambda = MultiplyExactly(0.5 * nc, nc);
   const double edge = NormalDensity(nc) * std::exp(-0.5 * df * std::log1p(square.high));
   NonCentralTail tail = {0.0, -edge, nc * edge};
   if (square.high < kNearZero) {
     // Too close to 0 for anything to lie between.
     if (above) tail.share = MCDistFun::CdfStdNorm(nc);
-  } else if (lambda < kSmallestPoissonMean) {
+  } else if (lambda.high < kSmallestPoissonMean) {
     tail.share = above ? MCDistFun::SigT(x, df) : MCDistFun::CdfT(x, df) - 0.5;
   } else {
     const MixtureShare mixture = NonCentralStudent(square, 0.5 * df, lambda, above, care);
     tail.share = mixture.share;
     tail.slope -= nc * mixture.drop;
-    tail.bend += 2.0 * lambda * (mixture.drop - mixture.next) - mixture.drop;
+    tail.bend += 2.0 * lambda.high * (mixture.drop - mixture.next) - mixture.drop;
   }
-  if (above) {
-    tail.slope = -tail.slope;
-    tail.bend = -tail.bend;
-  } else {
-    tail.share += MCDistFun::CdfStdNorm(-nc);
+  if (above) return {tail.share, -tail.slope, -tail.bend};
+  return {tail.share + MCDistFun::CdfStdNorm(-nc), tail.slope, tail.bend};
+}
+
+/// P(T <= x), or P(T > x), for x, nc > 0.
+NonCentralTail StudentOneSide(double x, double df, double nc, bool upper, SumCare care) {
+  const DoubleDouble square = MultiplyExactly(x, x) / df;
+  const DoubleDouble nc_square = MultiplyExactly(nc, nc);
+  const ChiQuotient quotient = ChiAgainstChi(1.0, df, square);
+  const ChiSaddle saddle = FindSaddle(quotient, nc_square.high);
+  if (nc_square.high * saddle.w >= kStudentIntegralFrom) {
+    // P(T < -x) is too small to count: what is left is that T^2 has the non-central F distribution.
+    const bool both = care == SumCare::kFull && ReachesBothSides(quotient, nc_square.high, saddle);
+    return FromSmaller(saddle.u > 0.0, upper, both, [&](bool above) {
+      const NonCentralTail tail = IntegrateSaddle(quotient, nc_square, saddle, above, care);
+      return NonCentralTail{tail.share, 2.0 * nc * tail.slope,
+                            2.0 * tail.slope + 4.0 * nc_square.high * tail.bend};
+    });
   }
-  return Turned(tail, above != upper);
+  return FromSmaller(x > nc, upper, care == SumCare::kFull,
+                     [&](bool above) { return StudentMixture(x, df, nc, square, above, care); });
 }
 
 /// x > 0.
@@ -187,11 +264,12 @@ NonCentralTail FindChiTail(double x, double df, double nc, bool upper, SumCare c
   const double lambda = 0.5 * nc;
   const ChiQuotient quotient = ChiAgainstNumber(df, x);
   const ChiSaddle saddle = FindSaddle(quotient, nc);
-  // The smaller tail, about.
-  const bool above = saddle.u > 0.0;
-  if (nc * saddle.w >= kIntegralFrom)
-    return Turned(IntegrateSaddle(quotient, nc, saddle, care), above != upper);
-  return Turned(OfMixture(NonCentralGamma(half, 0.5 * df, lambda, above, care), above), above != upper);
+  const bool integrates = nc * saddle.w >= kIntegralFrom;
+  const bool both = care == SumCare::kFull && (!integrates || ReachesBothSides(quotient, nc, saddle));
+  return FromSmaller(saddle.u > 0.0, upper, both, [&](bool above) {
+    if (integrates) return IntegrateSaddle(quotient, nc, saddle, above, care);
+    return OfMixture(NonCentralGamma(half, 0.5 * df, lambda, above, care), above);
+  });
 }
 
 NonCentralTail FindBetaTail(DoubleDouble odds, double a, double b, double nc, bool upper, SumCare care) {
@@ -201,10 +279,15 @@ NonCentralTail FindBetaTail(DoubleDouble odds, double a, double b, double nc, bo
     return PowerTail(FindBetaTail(kFarOdds, a, b, nc, true, care), kFarOdds / odds.high, b, !upper);
   const ChiQuotient quotient = ChiAgainstChi(2.0 * a, 2.0 * b, odds);
   const ChiSaddle saddle = FindSaddle(quotient, nc);
-  const bool above = saddle.u > 0.0;
-  if (nc * saddle.w >= kIntegralFrom)
-    return Turned(IntegrateSaddle(quotient, nc, saddle, care), above != upper);
-  return Turned(OfMixture(NonCentralBeta(odds, a, b, 0.5 * nc, above, care), above), above != upper);
+  const bool integrates = nc * saddle.w >= kIntegralFrom;
+  // Where the integral does not reach the other side a sum of not too many terms does.
+  const bool reaches = ReachesBothSides(quotient, nc, saddle);
+  const bool both = care == SumCare::kFull && (!integrates || reaches || nc <= kLongSumTo);
+  return FromSmaller(saddle.u > 0.0, upper, both, [&](bool above) {
+    if (integrates && (reaches || above == (saddle.u > 0.0)))
+      return IntegrateSaddle(quotient, nc, saddle, above, care);
+    return OfMixture(NonCentralBeta(odds, a, b, 0.5 * nc, above, care), above);
+  });
 }
 
 }  // namespace MCMath_800

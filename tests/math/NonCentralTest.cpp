@@ -55,6 +55,36 @@ TEST(NonCentral, GivesReferenceValues) {
     EXPECT_NEAR(row.value, row.want, row.digits * row.want) << row.why;
 }
 
+// Where exponents are large, sums long, or the smaller side is not the one beyond the mean.
+TEST(NonCentral, KeepsAllDigits) {
+  struct Row {
+    const char* why;
+    double value, want;
+  };
+  // mpmath, 25 digits.
+  const Row kRows[] = {
+      {"t across zero, far tail", MCDistFun::NonCentralCdfT(-48.56055, 654.714, 0.066867),
+       3.7517526286606329371454e-220},
+      {"t by an integral, far tail", MCDistFun::NonCentralCdfT(16.21802, 3514.29, 49.827),
+       6.972233006375596218175666e-239},
+      {"t, far tail", MCDistFun::NonCentralCdfT(6.573181, 15296.9, 37.093), 1.370195632428939562423715e-204},
+      {"t, few degrees of freedom", MCDistFun::NonCentralCdfT(50.88224, 0.673804, 47.633),
+       0.308189601683692959324524},
+      {"chi-square, many terms", MCDistFun::NonCentralCdfChi(4371.018, 3911.77, 466.45),
+       0.4737768461090652675340649},
+      {"F, hundreds of terms near x = 1", MCDistFun::NonCentralCdfF(1185.723, 0.357723, 0.155985, 398.91),
+       0.1555596866352762630213954},
+      {"F, heavy upper tail", MCDistFun::NonCentralCdfF(7.446715, 30, 0.194541, 195.63),
+       0.169939934273052628157184},
+      {"F, heavier", MCDistFun::NonCentralCdfF(207.4917, 4.03256, 0.12094, 832.68),
+       0.1316942124930466630714622},
+      {"F, the other side by its sum", MCDistFun::NonCentralCdfF(3.122418, 49566, 0.111673, 328.85),
+       0.1776010084706902945043235},
+  };
+  for (const Row& row : kRows)
+    EXPECT_NEAR(row.value, row.want, 2e-15 * row.want) << row.why;
+}
+
 TEST(NonCentral, IsTheCentralDistributionAtZero) {
   for (const double df : {0.5, 3.0, 250.0}) {
     for (const double x : {0.1, 1.0, 7.0}) {
