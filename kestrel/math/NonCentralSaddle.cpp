@@ -113,9 +113,9 @@ ChiSaddle FindSaddle(const ChiQuotient& q, double nc) {
 }
 
 bool ReachesBothSides(const ChiQuotient& q, double nc, const ChiSaddle& saddle) {
-  // The distance of that singularity in deviations at the pole; below a quarter the integral fails.
+  // The distance of that singularity in deviations at the pole; below a third the integral fails.
   const double x = q.odds.high * q.y;
-  return saddle.u < 0.0 || std::sqrt(0.5 * q.df2 * x * x + (0.5 * q.df1 + nc) * q.y * q.y) > 0.3;
+  return saddle.u < 0.0 || std::sqrt(0.5 * q.df2 * x * x + (0.5 * q.df1 + nc) * q.y * q.y) > 0.35;
 }
 
 // The tail is an integral of e^K(t) / t over a path across the real axis, K the cumulant function (S. O. Rice

@@ -53,7 +53,9 @@ class GammaFamily {
   double Drop(double s) const { return GammaPower(x_, s) / s; }
   /// Drop(s + 1) / Drop(s).
   double Growth(double s) const { return x_ / (s + 1.0); }
-  /// The same, given s + 1, with all its digits.
+  /// The largest from there on.
+  double LargestGrowth(double s) const { return Growth(s); }
+  /// The same as Growth, given s + 1, with all its digits.
   template <class Number>
   Number GrowthBefore(Number next) const {
     return Quotient(Number(x_), next);
@@ -88,6 +90,7 @@ class BetaFamily {
         b_(b) {}
   double Drop(double s) const { return BetaPower(Point(s), s, b_) / s; }
   double Growth(double s) const { return x_ * (s + b_) / (s + 1.0); }
+  double LargestGrowth(double s) const { return std::max(x_, Growth(s)); }
   // Quotients of s + b and s + 1 as 1 and a rest.
   template <class Number>
   Number GrowthBefore(Number next) const {
@@ -217,7 +220,7 @@ class Mixture {
   double LowerShare(const Place& place, double unit) const {
     const double s = start_ + place.at;
     const double drop = Rounded(place.drop) * unit;
-    if (family_.Growth(s) > 0.8 && drop > kSmall) return RatioAt(place.at, drop, false) / unit;
+    if (family_.LargestGrowth(s) > 0.8 && drop > kSmall) return RatioAt(place.at, drop, false) / unit;
     double sum = 1.0, term = 1.0;
     constexpr int kTermLimit = 2000;
     for (int i = 0; i < kTermLimit && term > negligible_ * sum; ++i) {
