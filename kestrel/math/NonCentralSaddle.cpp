@@ -31,7 +31,16 @@ Complex Deviance(const Complex& z) {
 }
 
 Complex Reciprocal(const Complex& z) {
-  return std::conj(z) / std::norm(z);
+  const double inverse = 1.0 / (z.real() * z.real() + z.imag() * z.imag());
+  return {z.real() * inverse, -z.imag() * inverse};
+}
+
+/// The product of finite numbers: the operator looks for infinities.
+double RealOfProduct(const Complex& a, const Complex& b) {
+  return a.real() * b.real() - a.imag() * b.imag();
+}
+Complex Product(const Complex& a, const Complex& b) {
+  return {RealOfProduct(a, b), a.real() * b.imag() + a.imag() * b.real()};
 }
 
 /// The line that the integral is taken on: t with 2 t / (1 - 2 t) = u at its real point.
@@ -159,16 +168,16 @@ NonCentralTail IntegrateSaddle(const ChiQuotient& q, DoubleDouble nc, const ChiS
     rate = keep * rate + (turn * before + keep_rest * rate);
     const Complex z(-bend * y * y, y);
     const Complex inverse = Reciprocal(1.0 - z);
-    Complex exponent = 0.5 * (q.df1 * Deviance(-z) + pull * (z * z * inverse)) + line.tilt * z;
+    Complex exponent = 0.5 * (q.df1 * Deviance(-z) + pull * Product(Product(z, z), inverse)) + line.tilt * z;
     if (q.df2 > 0.0) exponent += 0.5 * q.df2 * Deviance(line.part * z);
     const double weight = rate * std::exp(exponent.real());
-    const Complex power = Complex(weight * std::cos(exponent.imag()), weight * std::sin(exponent.imag())) *
-                          Complex(1.0, 2.0 * bend * y);
-    const Complex change = power * inverse;
-    const DoubleDouble sum = AddExactly(share.high, (power * Reciprocal(line.u + z)).real());
+    const Complex turned(weight * std::cos(exponent.imag()), weight * std::sin(exponent.imag()));
+    const Complex power = Product(turned, {1.0, 2.0 * bend * y});
+    const Complex change = Product(power, inverse);
+    const DoubleDouble sum = AddExactly(share.high, RealOfProduct(power, Reciprocal(line.u + z)));
     share = {sum.high, share.low + sum.low};
     slope += change.real();
-    curve += 0.5 * (change * (line.w * inverse - 1.0)).real();
+    curve += 0.5 * RealOfProduct(change, line.w * inverse - 1.0);
     if (exponent.real() < -digits) break;
   }
   const double front = GuardedExpMinus(line.exponent) * h / kPi;

@@ -31,7 +31,16 @@ double Rounded(DoubleDouble a) {
   return a.high + a.low;
 }
 
+/// a + b, whose second double may be as large as several roundings.
+DoubleDouble Total(DoubleDouble a, DoubleDouble b) {
+  const DoubleDouble sum = AddExactly(a.high, b.high);
+  return {sum.high, sum.low + (a.low + b.low)};
+}
+
 // The same for rough sums, which have one double.
+double Total(double a, double b) {
+  return a + b;
+}
 double Quotient(double a, double b) {
   return a / b;
 }
@@ -94,11 +103,11 @@ class BetaFamily {
   // Quotients of s + b and s + 1 as 1 and a rest.
   template <class Number>
   Number GrowthBefore(Number next) const {
-    return As(near_, next) + Quotient(As(excess_, next), next);
+    return Total(As(near_, next), Quotient(As(excess_, next), next));
   }
   template <class Number>
   Number ShrinkageFrom(Number next) const {
-    return As(per_near_, next) + Quotient(As(lack_, next), next + As(less_, next));
+    return Total(As(per_near_, next), Quotient(As(lack_, next), Total(next, As(less_, next))));
   }
   double Ratio(double s, bool upper) const { return BetaRatio(Point(s), s, b_, upper); }
   double Peak(double start, double lambda) const {
