@@ -1,11 +1,13 @@
 #include "kestrel/transform/TransformVar.h"
 
 #include <ostream>
+#include <unordered_set>
 #include <utility>
 
 #include "kestrel/dictionary/LayoutStamp.h"
 #include "kestrel/foundation/ScoreValue.h"
 #include "kestrel/predicates/ScoreValueRange.h"
+#include "kestrel/transform/ApplyProgram.h"
 #include "kestrel/transform/DerivationPlan.h"
 #include "kestrel/transform/FieldEvaluation.h"
 #include "kestrel/transform/FunctionTree.h"
@@ -155,6 +157,26 @@ void TransformVar::SetRecodeIntervalCopy(ScoreValueRange* range) {
 void TransformVar::SetRoot(FunctionTree* root) {
   root_.reset(root);
   ForgetEvaluation();
+}
+
+std::vector<std::string> TransformVar::GetSourceNames() const {
+  std::vector<std::string> names;
+  if (kind_ != TransExpression::kApply) {
+    if (!field_name_.empty()) names.push_back(field_name_);
+    return names;
+  }
+  std::unordered_set<std::string> seen;
+  std::vector<const FunctionTree*> waiting;
+  if (root_ != nullptr) waiting.push_back(root_.get());
+  while (!waiting.empty()) {
+    const FunctionTree& node = *waiting.back();
+    waiting.pop_back();
+    waiting.insert(waiting.end(), node.Children().rbegin(), node.Children().rend());
+    if (!ApplyProgram::IsReference(node)) continue;
+    const std::string& name = node.GetNodeStats().GetParameterName();
+    if (seen.insert(name).second) names.push_back(name);
+  }
+  return names;
 }
 
 FieldEvaluation& TransformVar::Evaluation() const {

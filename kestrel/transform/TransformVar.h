@@ -126,6 +126,10 @@ class KESTREL_API TransformVar : public DictVar {
   void SetRoot(FunctionTree* root);
   const FunctionTree* GetRoot() const { return root_.get(); }
 
+  /// The names of the fields that the expression reads itself, each once, in the order in which it names
+  /// them.
+  std::vector<std::string> GetSourceNames() const;
+
   // ---- Evaluation.
 
   /// The field's value for a case; what it depends on is computed first. The dictionaries may be null. The

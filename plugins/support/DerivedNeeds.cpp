@@ -1,40 +1,9 @@
 #include "plugins/support/DerivedNeeds.h"
 
-#include <unordered_set>
-
-#include "kestrel/transform/FunctionTree.h"
 #include "kestrel/transform/TransformVar.h"
 #include "kestrel/transform/TransformationDictionary.h"
 
 namespace MCKestrel_800 {
-namespace {
-
-/// The fields that a function tree refers to, each once, in the document's order.
-std::vector<std::string> NamesIn(const FunctionTree& root) {
-  std::vector<std::string> names;
-  std::unordered_set<std::string> seen;
-  std::vector<const FunctionTree*> waiting = {&root};
-  while (!waiting.empty()) {
-    const FunctionTree& node = *waiting.back();
-    waiting.pop_back();
-    const std::vector<FunctionTree*>& children = node.Children();
-    waiting.insert(waiting.end(), children.rbegin(), children.rend());
-    const ApplyNodeStats& stats = node.GetNodeStats();
-    if (stats.GetTransFunction() != kNoFunction || stats.IsConstNode()) continue;
-    if (seen.insert(stats.GetParameterName()).second) names.push_back(stats.GetParameterName());
-  }
-  return names;
-}
-
-std::vector<std::string> SourcesOf(const TransformVar& variable) {
-  if (variable.GetTransExpression() == TransExpression::kApply) {
-    return variable.GetRoot() == nullptr ? std::vector<std::string>() : NamesIn(*variable.GetRoot());
-  }
-  if (variable.GetFieldName().empty()) return {};
-  return {variable.GetFieldName()};
-}
-
-}  // namespace
 
 DerivedNeeds::DerivedNeeds(const ScoreDictionary& data, const TransformationDictionary& derived)
     : data_(data) {
@@ -70,7 +39,7 @@ int DerivedNeeds::AddDerived(const std::string& name) {
 
 void DerivedNeeds::NoteReads(int number, std::vector<int>& waiting) {
   Derived& field = derived_fields_[number];
-  for (const std::string& name : SourcesOf(*field.variable)) {
+  for (const std::string& name : field.variable->GetSourceNames()) {
     // As everywhere, a name is first that of a data field.
     if (const ScoreDictVar* const data = data_.GetVar(name)) {
       field.reads_data.push_back(AddData(*data));

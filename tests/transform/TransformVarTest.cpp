@@ -479,6 +479,16 @@ TEST(TransformVar, CopiesDeeply) {
   }
 }
 
+TEST(TransformVar, NamesTheFieldsThatItReads) {
+  using Names = std::vector<std::string>;
+  EXPECT_EQ(Owned(NewField("f", "", TransExpression::kConstant))->GetSourceNames(), Names());
+  EXPECT_EQ(Owned(NewReference("f", "x"))->GetSourceNames(), Names{"x"});
+  FunctionTree* const inner = Call(kMaxFunction, {FieldLeaf("x"), ConstantLeaf(Number(1)), FieldLeaf("b")});
+  const auto apply = Owned(NewApply("f", Call(kMinFunction, {FieldLeaf("b"), inner, FieldLeaf("a")})));
+  EXPECT_EQ(apply->GetSourceNames(), (Names{"b", "x", "a"}));
+  EXPECT_EQ(Owned(NewApply("f", nullptr))->GetSourceNames(), Names());
+}
+
 TEST(TransformVar, SeesAChangeOfItsDefinition) {
   Data data;
   data.record.SetValue("x", 1);
