@@ -166,11 +166,13 @@ void FunctionTreeImp::RemoveFromParent() {
 }
 
 FunctionTree* FunctionTreeImp::GetChildAt(int index) {
-  return index < 0 || index >= GetChildCount() ? nullptr : children_[static_cast<std::size_t>(index)];
+  const auto position = static_cast<std::size_t>(index);  // beyond the end for a negative one
+  return position < children_.size() ? children_[position] : nullptr;
 }
 
 const FunctionTree* FunctionTreeImp::GetChildAt(int index) const {
-  return index < 0 || index >= GetChildCount() ? nullptr : children_[static_cast<std::size_t>(index)];
+  const auto position = static_cast<std::size_t>(index);  // beyond the end for a negative one
+  return position < children_.size() ? children_[position] : nullptr;
 }
 
 int FunctionTreeImp::GetIndex(const FunctionTree* child) const {

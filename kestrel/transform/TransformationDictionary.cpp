@@ -22,23 +22,21 @@ ScoreValue* NewEmptyValue(const ScoreDictVar& variable) {
   }
 }
 
-std::unique_ptr<CaseRecord> CopyOf(const std::unique_ptr<CaseRecord>& record) {
-  return record == nullptr ? nullptr : std::make_unique<CaseRecord>(*record);
-}
-
 }  // namespace
 
 TransformationDictionary::TransformationDictionary() = default;
 
 TransformationDictionary::TransformationDictionary(const TransformationDictionary& other)
     : BaseDictionary(other),
-      derived_record_(CopyOf(other.derived_record_)),
-      initial_record_(CopyOf(other.initial_record_)),
       computed_(other.computed_),
       derived_names_(other.derived_names_),
       is_set_up_(other.is_set_up_),
       wanted_names_(other.wanted_names_),
-      has_wanted_names_(other.has_wanted_names_) {}
+      has_wanted_names_(other.has_wanted_names_) {
+  if (other.derived_record_ == nullptr) return;
+  derived_record_ = std::make_unique<CaseRecord>(*other.derived_record_);
+  initial_record_ = std::make_unique<CaseRecord>(*other.initial_record_);
+}
 
 TransformationDictionary& TransformationDictionary::operator=(const TransformationDictionary& other) {
   if (this == &other) return *this;

@@ -193,7 +193,7 @@ void DiscretizeReader::AddBin(const DOMElement* interval, std::unique_ptr<ScoreV
 std::string PMMLTranslator::HandleDiscritize(DOMElement* element, TransformVar* variable,
                                              const ScoreDictionary* dictionary,
                                              const ScoreDictionary* derived) {
-  const std::string name = Narrow(RequiredAttribute(element, Tag::XML_ATT_FIELD));
+  std::string name = Narrow(RequiredAttribute(element, Tag::XML_ATT_FIELD));
   if (FindField(dictionary, derived, name) == nullptr) {
     FailOnField(element, KestrelException::kStructure, name, ": not predefined!");
   }

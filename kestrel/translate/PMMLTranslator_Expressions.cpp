@@ -110,7 +110,7 @@ void ReadOtherChildren(const DOMElement* expression, TransformVar& variable) {
 std::string PMMLTranslator::HandleNormContinuous(DOMElement* element, TransformVar* variable,
                                                  const ScoreDictionary* dictionary,
                                                  const ScoreDictionary* derived) {
-  const std::string name = FieldNameOf(element);
+  std::string name = FieldNameOf(element);
   const ScoreDictVar* const source = FindField(dictionary, derived, name);
   if (source == nullptr || source->GetMLevel() != ScoreDictVar::kContinuous) {
     FailOnField(element, KestrelException::kStructure, name, ": must predefined as continuous type");
@@ -136,7 +136,7 @@ std::string PMMLTranslator::HandleNormContinuous(DOMElement* element, TransformV
 std::string PMMLTranslator::HandleNormDiscrete(DOMElement* element, TransformVar* variable,
                                                const ScoreDictionary* dictionary,
                                                const ScoreDictionary* derived) {
-  const std::string name = FieldNameOf(element);
+  std::string name = FieldNameOf(element);
   const ScoreDictVar* const source = FindField(dictionary, derived, name);
   if (source == nullptr || source->GetMLevel() == ScoreDictVar::kContinuous) {
     FailOnField(element, KestrelException::kStructure, name,
@@ -155,7 +155,7 @@ std::string PMMLTranslator::HandleNormDiscrete(DOMElement* element, TransformVar
 std::string PMMLTranslator::HandleFieldRef(DOMElement* element, TransformVar* variable,
                                            const ScoreDictionary* dictionary,
                                            const ScoreDictionary* derived) {
-  const std::string name = FieldNameOf(element);
+  std::string name = FieldNameOf(element);
   const ScoreDictVar* const source = RequireField(element, dictionary, derived, name);
   if (auto value = ReadFieldReplacement(element, *source, variable->GetName()); value != nullptr) {
     variable->SetRecodeMissValueTo(value.release());

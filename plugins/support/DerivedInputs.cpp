@@ -32,6 +32,7 @@ bool DerivedInputs::IsDerived(const MiningField& field) const {
 
 void DerivedInputs::PlaceFields(const std::vector<const MiningField*>& fields, DerivedNeeds& needs) {
   std::vector<int> numbers;
+  numbers.reserve(fields.size());
   for (const MiningField* field : fields) {
     numbers.push_back(IsDerived(*field) ? needs.AddDerived(field->name) : needs.AddData(*field->variable));
   }
