@@ -34,4 +34,16 @@ bool ApplyProgram::IsReference(const FunctionTree& node) {
   return stats.GetTransFunction() == kNoFunction && !stats.IsConstNode();
 }
 
+std::vector<const FunctionTree*> ApplyProgram::FindReferences(const FunctionTree& root) {
+  std::vector<const FunctionTree*> references;
+  std::vector<const FunctionTree*> waiting = {&root};
+  while (!waiting.empty()) {
+    const FunctionTree& node = *waiting.back();
+    waiting.pop_back();
+    waiting.insert(waiting.end(), node.Children().rbegin(), node.Children().rend());
+    if (IsReference(node)) references.push_back(&node);
+  }
+  return references;
+}
+
 }  // namespace MCKestrel_800

@@ -59,6 +59,8 @@ class ApplyProgram {
 
   /// Whether a node is a reference to a field.
   static bool IsReference(const FunctionTree& node);
+  /// All references of a tree, from left to right. Depth costs no stack.
+  static std::vector<const FunctionTree*> FindReferences(const FunctionTree& root);
 
   void Run() {
     const ApplyInstruction* const end = code_.data() + code_.size();

@@ -108,16 +108,9 @@ void DerivationPlan::AddReads(int number) {
 
 std::vector<int> DerivationPlan::AddTreeReads(const FunctionTree& root) {
   std::vector<int> reads;
-  std::vector<const FunctionTree*> waiting = {&root};
-  while (!waiting.empty()) {
-    const FunctionTree& node = *waiting.back();
-    waiting.pop_back();
-    for (const FunctionTree* child : node.Children())
-      waiting.push_back(child);
-    if (ApplyProgram::IsReference(node)) {
-      const ApplyNodeStats& stats = node.GetNodeStats();
-      reads.push_back(AddSource(stats.GetParameterName(), stats.GetVariable()));
-    }
+  for (const FunctionTree* reference : ApplyProgram::FindReferences(root)) {
+    const ApplyNodeStats& stats = reference->GetNodeStats();
+    reads.push_back(AddSource(stats.GetParameterName(), stats.GetVariable()));
   }
   std::sort(reads.begin(), reads.end());
   reads.erase(std::unique(reads.begin(), reads.end()), reads.end());
@@ -212,43 +205,44 @@ void DerivationPlan::UseCodes(Step& step) {
 }
 
 void DerivationPlan::Choose(const std::vector<Output>& outputs) {
-  chosen_ = WorkFor(outputs);
+  FillWork(outputs, chosen_);
 }
 
 void DerivationPlan::ComputeOnly(const TransformVar& field, const ScoreCaseRecord* record) {
-  Run(WorkFor({{&field, nullptr}}), record);
+  only_output_.assign(1, {&field, nullptr});
+  FillWork(only_output_, only_);
+  Run(only_, record);
 }
 
-// Every step stands behind those that it needs, so one walk from the end finds them all.
-DerivationPlan::Work DerivationPlan::WorkFor(const std::vector<Output>& outputs) {
-  std::vector<bool> is_needed(steps_.size(), false);
-  std::vector<bool> is_read(sources_.size(), false);
-  std::unordered_map<const TransformVar*, ScoreValue*> places;
+// Every step stands behind those that it needs, so one walk from the end finds them all. Hosts ask for single
+// fields case by case, so all room is kept.
+void DerivationPlan::FillWork(const std::vector<Output>& outputs, Work& work) {
+  is_needed_.assign(steps_.size(), false);
+  is_read_.assign(sources_.size(), false);
+  places_.assign(steps_.size(), nullptr);
+  work.items.clear();
+  work.sources.clear();
   for (const Output& output : outputs) {
     const auto found = step_numbers_.find(output.field);
     if (found == step_numbers_.end()) continue;
-    is_needed[static_cast<std::size_t>(found->second)] = true;
-    places.emplace(output.field, output.to);
+    is_needed_[static_cast<std::size_t>(found->second)] = true;
+    places_[static_cast<std::size_t>(found->second)] = output.to;
   }
-  Work work;
   for (std::size_t number = steps_.size(); number-- > 0;) {
-    if (!is_needed[number]) continue;
+    if (!is_needed_[number]) continue;
     const Step& step = steps_[number];
-    const auto place = places.find(step.field);
-    ScoreValue* to = place == places.end() ? nullptr : place->second;
-    if (to == nullptr) to = &step.evaluation->GetOwnResult();
+    ScoreValue* const to = places_[number] != nullptr ? places_[number] : &step.evaluation->GetOwnResult();
     work.items.push_back({&step, step.as_source == kNone ? nullptr : &sources_[step.as_source], to});
     if (step.is_circular) continue;
     for (const int source : step.reads) {
-      is_read[source] = true;
-      if (sources_[source].step != kNone) is_needed[sources_[source].step] = true;
+      is_read_[source] = true;
+      if (sources_[source].step != kNone) is_needed_[sources_[source].step] = true;
     }
   }
   std::reverse(work.items.begin(), work.items.end());
   for (std::size_t source = 0; source < sources_.size(); ++source) {
-    if (is_read[source]) work.sources.push_back(&sources_[source]);
+    if (is_read_[source]) work.sources.push_back(&sources_[source]);
   }
-  return work;
 }
 
 void DerivationPlan::Run(const Work& work, const ScoreCaseRecord* record) {

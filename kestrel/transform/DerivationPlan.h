@@ -105,7 +105,7 @@ class DerivationPlan {
   void PrepareStep(Step& step, const ApplyProgram::FindSource& find);
   void GiveCodes();
   void UseCodes(Step& step);
-  Work WorkFor(const std::vector<Output>& outputs);
+  void FillWork(const std::vector<Output>& outputs, Work& work);
   void Run(const Work& work, const ScoreCaseRecord* record);
   void TakeCase(const Work& work, const ScoreCaseRecord& record);
   void LookUpPositions(const ScoreCaseRecord& record);
@@ -125,6 +125,12 @@ class DerivationPlan {
   std::vector<Source> sources_;
   std::vector<Step> steps_;
   Work chosen_;
+  Work only_;
+  std::vector<Output> only_output_;
+  // Room for FillWork: by step and by source.
+  std::vector<bool> is_needed_;
+  std::vector<bool> is_read_;
+  std::vector<ScoreValue*> places_;
   SourceField nothing_{nullptr};  ///< what a field reads that names none
   std::unordered_map<std::string, int> source_numbers_;
   std::unordered_map<const TransformVar*, int> step_numbers_;

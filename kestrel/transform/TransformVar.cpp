@@ -165,15 +165,10 @@ std::vector<std::string> TransformVar::GetSourceNames() const {
     if (!field_name_.empty()) names.push_back(field_name_);
     return names;
   }
+  if (root_ == nullptr) return names;
   std::unordered_set<std::string> seen;
-  std::vector<const FunctionTree*> waiting;
-  if (root_ != nullptr) waiting.push_back(root_.get());
-  while (!waiting.empty()) {
-    const FunctionTree& node = *waiting.back();
-    waiting.pop_back();
-    waiting.insert(waiting.end(), node.Children().rbegin(), node.Children().rend());
-    if (!ApplyProgram::IsReference(node)) continue;
-    const std::string& name = node.GetNodeStats().GetParameterName();
+  for (const FunctionTree* reference : ApplyProgram::FindReferences(*root_)) {
+    const std::string& name = reference->GetNodeStats().GetParameterName();
     if (seen.insert(name).second) names.push_back(name);
   }
   return names;

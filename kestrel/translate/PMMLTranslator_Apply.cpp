@@ -263,12 +263,9 @@ std::unique_ptr<ScoreValue> ApplyReader::ReadUntyped(const DOMElement* constant,
                                                      const FunctionTree& node) const {
   std::string text;
   PMMLTranslator::HandelConstant(constant, text);
-  const TransformFunction code = node.GetNodeStats().GetTransFunction();
-  const Kind wanted = FindBuiltinFunction(code)->argument;
+  const BuiltinFunction& function = *FindBuiltinFunction(node.GetNodeStats().GetTransFunction());
+  const Kind wanted = function.KindOfArgument(node.GetChildCount());
   bool is_text = wanted == Kind::kText;
-  // Of "substr" the text stands first, and a number behind it.
-  if (code == kSubstrFunction) is_text = node.GetChildCount() == 0;
-  if (code == kOutlierHandleFunction) is_text = node.GetChildCount() == kOutlierMethod;
   if (wanted == Kind::kAny) {
     // What is compared stands first or second; whatever follows is one argument too many.
     is_text = (node.GetChildCount() < 2 && IsComparedWithText(apply)) || NumberOf(text) == nullptr;

@@ -10,6 +10,7 @@
 #include "kestrel/predicates/Range.h"
 #include "kestrel/transform/TransformVar.h"
 #include "kestrel/translate/DerivedValues.h"
+#include "kestrel/translate/IntervalClosure.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -23,24 +24,9 @@ namespace {
 using xercesc::DOMElement;
 using Tag = PMMLTagText;
 
-struct ClosureRow {
-  const char16_t* text;
-  bool left;   ///< the left margin belongs to the interval
-  bool right;  ///< the right margin belongs to the interval
-};
-
-constexpr ClosureRow kClosures[] = {
-    {Tag::XML_VAL_CLOSURE_CLOSEDCLOSED, true, true},
-    {Tag::XML_VAL_CLOSURE_CLOSEDOPEN, true, false},
-    {Tag::XML_VAL_CLOSURE_OPENCLOSED, false, true},
-    {Tag::XML_VAL_CLOSURE_OPENOPEN, false, false},
-};
-
-const ClosureRow& ReadClosure(const DOMElement* interval) {
-  const XMLCh* const text = Attribute(interval, Tag::XML_ATT_INTERVAL_CLOSURE);
-  for (const ClosureRow& row : kClosures) {
-    if (Equals(text, row.text)) return row;
-  }
+const IntervalClosure& ReadClosure(const DOMElement* interval) {
+  const IntervalClosure* const closure = FindClosure(interval);
+  if (closure != nullptr) return *closure;
   FailAt(interval, KestrelException::kStructure, "In valid closure value in <InterVal>.");
 }
 
@@ -202,7 +188,7 @@ std::string PMMLTranslator::HandleDiscritize(DOMElement* element, TransformVar* 
 }
 
 ScoreValueRange* PMMLTranslator::HandleDiscretizeBinInterVal(const DOMElement* interval) {
-  const ClosureRow& closure = ReadClosure(interval);
+  const IntervalClosure& closure = ReadClosure(interval);
   std::unique_ptr<ScoreValue> left = ReadMargin(interval, Tag::XML_ATT_INTERVAL_LEFTMARGIN);
   std::unique_ptr<ScoreValue> right = ReadMargin(interval, Tag::XML_ATT_INTERVAL_RIGHTMARGIN);
   if (left == nullptr && right == nullptr) {

@@ -5,6 +5,7 @@
 #include "kestrel/dictionary/ScoreMissingValueSet.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/predicates/Range.h"
+#include "kestrel/translate/IntervalClosure.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -19,26 +20,10 @@ using xercesc::DOMElement;
 using xercesc::DOMNode;
 using Tag = PMMLTagText;
 
-struct Closure {
-  const char16_t* text;
-  bool left;   ///< the left margin belongs to the interval
-  bool right;  ///< the right margin belongs to the interval
-};
-
-// "openOpen" needs no row: every other text, and none at all, means the same.
-constexpr Closure kClosures[] = {
-    {Tag::XML_VAL_CLOSURE_CLOSEDCLOSED, true, true},
-    {Tag::XML_VAL_CLOSURE_CLOSEDOPEN, true, false},
-    {Tag::XML_VAL_CLOSURE_OPENCLOSED, false, true},
-};
-constexpr Closure kOpenOpen = {Tag::XML_VAL_CLOSURE_OPENOPEN, false, false};
-
-const Closure& ReadClosure(const DOMElement* interval) {
-  const XMLCh* text = Attribute(interval, Tag::XML_ATT_INTERVAL_CLOSURE);
-  for (const Closure& row : kClosures) {
-    if (Equals(text, row.text)) return row;
-  }
-  return kOpenOpen;
+// Every other text, and none at all, means the open interval.
+const IntervalClosure& ReadClosure(const DOMElement* interval) {
+  const IntervalClosure* const closure = FindClosure(interval);
+  return closure != nullptr ? *closure : kOpenInterval;
 }
 
 /// Reads a margin into `margin`; false, leaving it alone, when it is absent or empty.
@@ -63,7 +48,7 @@ void PMMLTranslator::handleInterval(ScoreDictVar* /*var*/, DOMNode* interval, Sc
                                     int /*reserved*/) {
   if (interval == nullptr || set == nullptr || interval->getNodeType() != DOMNode::ELEMENT_NODE) return;
   const DOMElement* element = static_cast<const DOMElement*>(interval);
-  const Closure& closure = ReadClosure(element);
+  const IntervalClosure& closure = ReadClosure(element);
   double left = 0.0;
   double right = 0.0;
   const bool hasLeft = ReadMargin(element, Tag::XML_ATT_INTERVAL_LEFTMARGIN, left);
@@ -76,7 +61,7 @@ void PMMLTranslator::handleInterval(ScoreDictVar* /*var*/, DOMNode* interval, Sc
 
 void PMMLTranslator::handleTreeInterval(DOMElement* element, ScoreMissingValueSet* target) {
   if (element == nullptr || target == nullptr) return;
-  const Closure& closure = ReadClosure(element);
+  const IntervalClosure& closure = ReadClosure(element);
   double left = -NumericValue::GetInfinity();
   double right = NumericValue::GetInfinity();
   ReadMargin(element, Tag::XML_ATT_INTERVAL_LEFTMARGIN, left);

@@ -373,10 +373,15 @@ TEST(DerivedValues, AllocateNothingAfterTheFirstCases) {
   TransformationDictionary dictionary;
   AddOneOfEach(dictionary);
   Data data;
+  std::vector<TransformVar*> fields;
+  for (ScoreDictVar* variable : dictionary.GetScoreDictVars())
+    fields.push_back(static_cast<TransformVar*>(variable));
   const auto compute = [&] {
     for (int i = 0; i < 100; ++i) {
       FillCase(data, i);
       ASSERT_NE(dictionary.GetValuesForDerivedVars(&data.record, &data.dictionary), nullptr);
+      for (TransformVar* field : fields)
+        field->GetTransformedValue(&data.record, &data.dictionary, &dictionary);
     }
   };
   compute();
