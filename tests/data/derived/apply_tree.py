@@ -2,7 +2,8 @@
 
 What a node is - a number, a text or a date/time - is known before any case: a field's by its variable, a constant's by
 its dataType, a function's by its result, that of "if" by its second argument. Where another kind is needed, a text
-counts as the missing number, a number as the empty text, a date/time as the number of its seconds.
+counts as the missing number, a number as the empty text, a date/time as the number of its seconds. What "if" chooses is
+asked for the kind that is needed of the "if", whatever the other argument is.
 """
 import math
 
@@ -10,7 +11,8 @@ import functions
 from fields import children, local_name
 from functions import finite
 from values import (EMPTY, MISSING, MOMENT, NUMBER, TEXT, Moment, Text, date_of_days, is_system_missing, kind_of_type,
-                    nothing, number_from_text, number_that_is, numbers_equal, text_of, value_from_text, values_equal)
+                    listed_value, nothing, number_from_text, number_that_is, numbers_equal, text_of, value_from_text,
+                    values_equal)
 
 DIFFERENCES = {
     "date_years_difference": (86400.0, 365.25), "date_months_difference": (86400.0, 30.4375),
@@ -45,12 +47,17 @@ def part_of_moment(seconds, name):
     return float((time // 3600, time // 60 % 60, time % 60)[PARTS.index(name) - 3])
 
 
-class FieldNode:
+class Leaf:
+    def value_as(self, case, kind):
+        return AS_KIND[kind](self.value(case))
+
+
+class FieldNode(Leaf):
     def __init__(self, element, document):
         self.field = document.field(element.get("field"))
         self.kind = self.field.kind
         text = element.get("mapMissingTo")
-        self.replacement = None if text is None else value_from_text(text, self.field.data_type)
+        self.replacement = None if text is None else listed_value(text, self.field.data_type)
 
     def is_missing(self, case):
         """Before any replacement."""
@@ -63,7 +70,7 @@ class FieldNode:
         return nothing(self.kind) if value is None else value
 
 
-class ConstantNode:
+class ConstantNode(Leaf):
     def __init__(self, element, _):
         data_type = element.get("dataType", "double")
         self.constant = value_from_text(element.text or "", data_type)
@@ -83,7 +90,7 @@ class FunctionNode:
         self.document = document
         self.kind = self.result_kind()
         text = element.get("mapMissingTo")
-        self.replacement = None if text is None or self.kind != NUMBER else number_from_text(text)
+        self.replacement = None if text is None else number_from_text(text)
 
     def take_listed_constants(self):
         """The list may stand as constants behind the value, too."""
@@ -97,13 +104,21 @@ class FunctionNode:
         return NUMBER if decider is None else self.arguments[decider].kind
 
     def value(self, case):
-        if self.kind != NUMBER:
-            return AS_KIND[self.kind](self.compute(case))
-        number = finite(lambda: as_number(self.compute(case)))
+        return self.value_as(case, self.kind)
+
+    def value_as(self, case, kind):
+        if self.name != "if":
+            value = AS_KIND[self.kind](self.compute(case))
+            return AS_KIND[kind](value if self.kind != NUMBER else self.number_or_replacement(value))
+        value = self.choose(case, kind, *self.arguments)
+        return value if kind != NUMBER else self.number_or_replacement(value)
+
+    def number_or_replacement(self, number):
+        number = finite(lambda: number)
         return self.replacement if number == MISSING and self.replacement is not None else number
 
     def numbers(self, case):
-        return [as_number(argument.value(case)) for argument in self.arguments]
+        return [argument.value_as(case, NUMBER) for argument in self.arguments]
 
     def compute(self, case):
         name = self.name
@@ -114,19 +129,19 @@ class FunctionNode:
         if name in functions.LISTS:
             return finite(functions.LISTS[name], case.rough, self.numbers(case))
         if name in functions.TEXTS:
-            return functions.TEXTS[name](as_text(self.arguments[0].value(case)))
+            return functions.TEXTS[name](self.arguments[0].value_as(case, TEXT))
         return self.SPECIAL[name](self, case, *self.arguments)
 
     # --- Functions by themselves. The arguments are nodes.
 
     def concat(self, case, *arguments):
-        return functions.concatenation([as_text(argument.value(case)) for argument in arguments])
+        return functions.concatenation([argument.value_as(case, TEXT) for argument in arguments])
 
     def substr(self, case, text, start):
-        return functions.substring(as_text(text.value(case)), as_number(start.value(case)))
+        return functions.substring(text.value_as(case, TEXT), start.value_as(case, NUMBER))
 
     def length(self, case, text):
-        text = as_text(text.value(case))
+        text = text.value_as(case, TEXT)
         return float(text.length or len(text.data))
 
     def sysmis(self, case, argument):
@@ -137,23 +152,23 @@ class FunctionNode:
         return number_that_is(value.data) if isinstance(value, Text) else value
 
     def difference(self, case, first, second):
-        seconds, other = as_moment(first.value(case)).seconds, as_number(second.value(case))
+        seconds, other = first.value_as(case, MOMENT).seconds, second.value_as(case, NUMBER)
         if MISSING in (seconds, other):
             return MISSING
         first_unit, second_unit = DIFFERENCES[self.name]
         return (seconds - other) / first_unit / second_unit
 
     def part(self, case, argument):
-        seconds = as_moment(argument.value(case)).seconds
+        seconds = argument.value_as(case, MOMENT).seconds
         return MISSING if seconds == MISSING else part_of_moment(seconds, self.name)
 
     def outlier_handle(self, case, value, method, centre, a, b, n):
-        x, c, a, b, n = (as_number(node.value(case)) for node in (value, centre, a, b, n))
+        x, c, a, b, n = (node.value_as(case, NUMBER) for node in (value, centre, a, b, n))
         if MISSING in (x, c, a, b, n):
             return MISSING
         width = a * b / math.sqrt(n)
         low, high = c - width, c + width
-        takes_bounds = as_text(method.value(case)).data == b"asExtremeValues"
+        takes_bounds = method.value_as(case, TEXT).data == b"asExtremeValues"
         if x < low:
             return low if takes_bounds else MISSING
         if x > high:
@@ -179,17 +194,17 @@ class FunctionNode:
     def is_not_in(self, case, argument):
         return 1.0 - self.is_in(case, argument)
 
-    def choose(self, case, condition, *branches):
-        is_true = numbers_equal(as_number(condition.value(case)), 1.0)
+    def choose(self, case, kind, condition, *branches):
+        is_true = numbers_equal(condition.value_as(case, NUMBER), 1.0)
         chosen = branches[:1] if is_true else branches[1:2]
-        return AS_KIND[self.kind](chosen[0].value(case)) if chosen else nothing(self.kind)
+        return chosen[0].value_as(case, kind) if chosen else nothing(kind)
 
     def impute(self, case, category, number):
         # A host that has no text for a record's slot leaves it empty.
         given = category.value(case)
         if not category.is_missing(case) and given != EMPTY:
             return given
-        t = as_number(number.value(case))
+        t = number.value_as(case, NUMBER)
         if t == MISSING:
             return nothing(self.kind)
         means, variances = self.arrays
@@ -200,7 +215,7 @@ class FunctionNode:
         "concat": concat, "substr": substr, "length": length, "sysmis": sysmis, "value": number,
         "recast_to_ordinal": number, "recast_to_scale": number, "outlierHandle": outlier_handle,
         "isMissing": is_missing, "isNotMissing": is_not_missing, "equal": equal, "notEqual": not_equal,
-        "isIn": is_in, "isNotIn": is_not_in, "if": choose, "imputeCatFieldMissingAgainstConTarget": impute,
+        "isIn": is_in, "isNotIn": is_not_in, "imputeCatFieldMissingAgainstConTarget": impute,
         **dict.fromkeys(DIFFERENCES, difference), **dict.fromkeys(PARTS, part),
     }
 

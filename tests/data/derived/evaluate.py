@@ -16,9 +16,9 @@ import xml.etree.ElementTree as ElementTree
 from apply_tree import ApplyTree
 from fields import Field, children, extensions, local_name, read_data_fields
 from functions import Rounding, finite
-from values import (MISSING, MOMENT, NUMBER, TEXT, Interval, Moment, Text, is_system_missing, kind_of_value, nothing,
-                    number_from_text, number_of_text, text_of, text_of_moment, text_of_number, value_from_text,
-                    values_equal)
+from values import (MISSING, MOMENT, NUMBER, TEXT, Interval, Moment, Text, is_system_missing, kind_of_value,
+                    listed_value, nothing, number_from_text, number_of_text, text_of, text_of_moment, text_of_number,
+                    value_from_text, values_equal)
 
 
 def number_of(value):
@@ -63,7 +63,7 @@ class Expression:
 
     def literal(self, attribute):
         text = self.element.get(attribute)
-        return None if text is None else value_from_text(text, self.field.data_type)
+        return None if text is None else listed_value(text, self.field.data_type)
 
     def recode(self, name, value):
         if name == "recodeElseCopy":
@@ -71,7 +71,7 @@ class Expression:
         elif name == "recodeMissingCopy":
             self.missing_copy = True
         elif name == "mapSysmisTo":
-            self.sysmis_replacement = value_from_text(value, self.field.data_type)
+            self.sysmis_replacement = listed_value(value, self.field.data_type)
         elif name == "recodeMissingSysmis":
             self.replacement, self.missing_copy = MISSING, False
 
@@ -111,7 +111,7 @@ class Constant(Expression):
 class FieldRef(Expression):
     def literal(self, attribute):
         text = self.element.get(attribute)
-        return None if text is None else value_from_text(text, self.source.data_type)
+        return None if text is None else listed_value(text, self.source.data_type)
 
     def value(self, case):
         value = case.value(self.source)
@@ -173,7 +173,7 @@ class Encoding(Expression):
 class NormDiscrete(Encoding):
     def __init__(self, element, field, document):
         super().__init__(element, field, document)
-        self.pairs = [(value_from_text(element.get("value"), self.source.data_type), 1.0)]
+        self.pairs = [(listed_value(element.get("value"), self.source.data_type), 1.0)]
         self.default, self.else_copy = 0.0, False
 
 
@@ -187,8 +187,8 @@ class MapValues(Encoding):
                 self.pairs.append((number_from_text(child.get("value")), MISSING))
             elif local_name(child) == "InlineTable":
                 for row in children(child, "row"):
-                    self.pairs.append((value_from_text(self.cell(row, column), self.source.data_type),
-                                       value_from_text(self.cell(row, element.get("outputColumn")), field.data_type)))
+                    self.pairs.append((listed_value(self.cell(row, column), self.source.data_type),
+                                       listed_value(self.cell(row, element.get("outputColumn")), field.data_type)))
 
     def source_name(self):
         return children(self.element, "FieldColumnPair")[0].get("field")
@@ -205,7 +205,7 @@ class Discretize(Expression):
         for child in element:
             if local_name(child) == "DiscretizeBin":
                 text = child.get("binValue")
-                value = None if text is None else value_from_text(text, field.data_type)
+                value = None if text is None else listed_value(text, field.data_type)
                 self.bins.append((self.interval(child), value))
             elif child.get("name") == "recodeTargetSysmis":
                 self.bins.append((self.interval(child), self.nothing()))
@@ -235,7 +235,7 @@ class Apply(Expression):
         self.field = field
 
     def value(self, case):
-        return self.tree.value(case)
+        return self.tree.value_as(case, self.field.kind)
 
 
 EXPRESSIONS = {kind.__name__: kind for kind in (Constant, FieldRef, NormContinuous, NormDiscrete, MapValues, Discretize,
@@ -259,8 +259,6 @@ class DerivedField(Field):
 
     def value(self, case):
         value = self.expression.value(case)
-        if isinstance(self.expression, Apply) and self.kind == NUMBER and isinstance(value, Moment):
-            value = value.seconds
         if value is None or kind_of_value(value) != self.kind:
             return nothing(self.kind, self.data_type)
         if self.kind == TEXT and 0 <= self.width < len(value.data):

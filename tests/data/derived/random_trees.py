@@ -28,10 +28,13 @@ PAIRS = ["equal", "notEqual", "lessThan", "lessOrEqual", "greaterThan", "greater
 
 
 class RandomTree:
-    """Makes trees over fields. `fields` is the list of those that may be read."""
+    """Makes trees over fields.
 
-    def __init__(self, rng, fields):
-        self.rng, self.fields = rng, fields
+    `fields` is the list of those that may be read; `mixed` are the kinds that the branches of an "if" may have side by
+    side; `replaces_choices` allows "mapMissingTo" of an "if"."""
+
+    def __init__(self, rng, fields, mixed=(NUMBER, TEXT, MOMENT), replaces_choices=True):
+        self.rng, self.fields, self.mixed, self.replaces_choices = rng, fields, mixed, replaces_choices
 
     def of_kind(self, kind, *unless):
         return [field for field in self.fields if field.kind == kind and field not in unless]
@@ -89,11 +92,16 @@ class RandomTree:
         if inner is None:
             return self.leaf(kind)
         replaced = ""
-        if kind == NUMBER and self.rng.random() < 0.2:
+        if self.may_replace(name, kind) and self.rng.random() < 0.2:
             replaced = f' mapMissingTo="{written_number(self.rng.choice(NUMBERS))}"'
         if self.rng.random() < 0.1:
             replaced += f' invalidValueTreatment="{self.rng.choice(["returnInvalid", "asIs", "asMissing"])}"'
         return f"<Apply function={quoteattr(name)}{replaced}>{inner}</Apply>"
+
+    def may_replace(self, name, kind):
+        if name != "if":
+            return kind == NUMBER
+        return self.replaces_choices and (kind == NUMBER or NUMBER in self.mixed)
 
     def inner(self, name, kind, depth):
         rng = self.rng
@@ -128,7 +136,9 @@ class RandomTree:
         kinds = [NUMBER, TEXT, MOMENT] if name in ("equal", "notEqual") else [NUMBER, NUMBER, MOMENT]
         fields = [field for field in self.fields if field.kind in kinds]
         if not fields or rng.random() < 0.4:
-            return self.arguments(2, rng.choice(kinds), depth)
+            kind = rng.choice(kinds)
+            # An "if" that is compared has branches of one kind: a comparison asks for none.
+            return RandomTree(rng, self.fields, (kind,), self.replaces_choices).arguments(2, kind, depth)
         field = rng.choice(fields)
         constant = f'<Constant dataType="{field.data_type}">{escape(field.literal(rng))}</Constant>'
         return self.reference(field) + constant
@@ -178,8 +188,13 @@ class RandomTree:
     def choice(self, kind, depth):
         rng = self.rng
         condition = self.apply(rng.choice(TESTS), NUMBER, depth - 1) if rng.random() < 0.85 else self.leaf(NUMBER)
-        return condition + "".join(self.argument(kind, depth - 1, BY_KIND[kind])
-                                   for _ in range(rng.choice([1, 2, 2, 2])))
+        return condition + "".join(self.branch(kind, depth - 1) for _ in range(rng.choice([1, 2, 2, 2])))
+
+    def branch(self, kind, depth):
+        """What an "if" may choose: often of another kind than the one that is needed."""
+        if kind in self.mixed and self.rng.random() < 0.3:
+            kind = self.rng.choice(self.mixed)
+        return self.argument(kind, depth, BY_KIND[kind])
 
     def impute(self, kind):
         categories = [field for field in self.of_kind(kind) if field.has_labels]

@@ -174,6 +174,42 @@ class TestEvaluator(unittest.TestCase):
         self.expect(text(impute), {"t": text_of("other"), "z": 4.0}, "other")
         self.expect(text(impute), {}, "")
 
+    def test_choices_of_different_kinds(self):
+        given = {"z": 5.0, "t": text_of("red"), "d": moment_from_text("2000-02-29", "date")}
+        seconds = 951782400.0
+
+        def choice(arguments, attributes=""):
+            return f'<Apply function="if" {attributes}>{constants(arguments)}</Apply>'
+
+        def call(function, *arguments):
+            return f'<Apply function="{function}">{"".join(arguments)}</Apply>'
+        for arguments, as_number, as_text, as_day in [
+                ("1 t z", S, "red", S), ("0 t z", 5.0, "", S), ("1 z t", 5.0, "", S), ("0 z t", S, "red", S),
+                ("1 d z", seconds, "", seconds), ("0 d z", 5.0, "", S), ("0 z d", seconds, "", seconds),
+                ("1 t d", S, "red", S), ("0 t d", seconds, "", seconds), ("0 t", S, "", S), ("0 z", S, "", S)]:
+            with self.subTest(arguments=arguments):
+                chosen = choice(arguments)
+                sum_of_it = S if as_number == S else as_number + 1.0
+                year = S if as_day == S else 2000.0
+                self.expect(number(chosen), given, as_number)
+                self.expect(text(chosen), given, as_text)
+                self.expect('dataType="date">' + chosen, given, Moment(as_day, "date"))
+                self.expect(number(call("+", chosen, constants("1"))), given, sum_of_it)
+                self.expect(text(call("uppercase", chosen)), given, as_text.upper())
+                self.expect(number(call("year-from-date", chosen)), given, year)
+                # Through one more choice, whose own kind is another.
+                for other in ("z", "t", "d"):
+                    nested = call("if", constants("0 " + other), chosen)
+                    self.expect(number(call("+", nested, constants("1"))), given, sum_of_it)
+                    self.expect(text(nested), given, as_text)
+                    self.expect(number(call("year-from-date", nested)), given, year)
+        # What replaces a missing number stands in for nothing else.
+        replaced = 'mapMissingTo="7"'
+        self.expect(number(choice("1 t z", replaced)), given, 7.0)
+        self.expect(number(call("+", choice("1 t d", replaced), constants("1"))), given, 8.0)
+        self.expect(text(choice("0 t z", replaced)), given, "")
+        self.expect(number(call("year-from-date", choice("0 d z", replaced))), given, S)
+
     def test_curves(self):
         def curve(points, attributes=""):
             pieces = "".join(f'<LinearNorm orig="{a}" norm="{b}"/>' for a, b in points)
@@ -212,6 +248,12 @@ class TestEvaluator(unittest.TestCase):
                 ("", "", 1.0, "10"), ('defaultValue="d"', "", 5.0, "d"), ("", copy, 2.5, "2.5"), ("", "", S, ""),
                 ('mapMissingTo="m"', "", S, "m"), ('mapMissingTo="m"', "", None, "")]:
             self.expect(text(mapped("x", attributes, more)), {"x": x}, wanted)
+        # Dates may be listed as such or as numbers in the field's unit.
+        days = "".join(f"<row><in>{a}</in><out>{b}</out></row>" for a, b in [("1970-01-02", 1), (172800, 2)])
+        for seconds, wanted in [(86400.0, 1.0), (172800.0, 2.0), (S, S), (1.0, S)]:
+            table = ('<MapValues outputColumn="out"><FieldColumnPair field="d" column="in"/>'
+                     f"<InlineTable>{days}</InlineTable></MapValues>")
+            self.expect(number(table), {"d": Moment(seconds, "date")}, wanted)
         discrete = '<NormDiscrete field="t" value="red" {}/>'
         for attributes, t, wanted in [("", "red ", 1.0), ("", "blue", 0.0), ("", "n/a", S),
                                       ('mapMissingTo="5"', "n/a", 5.0),

@@ -200,6 +200,14 @@ def value_from_text(text, data_type):
     return number_from_text(text) if kind == NUMBER else moment_from_text(text, data_type)
 
 
+def listed_value(text, data_type):
+    """As expressions list values: in a date/time field these may be numbers in its unit, too."""
+    value = value_from_text(text, data_type)
+    if kind_of_type(data_type) == MOMENT and is_system_missing(value):
+        return moment_from_number(number_from_text(text), data_type)
+    return value
+
+
 # --- Comparing ----------------------------------------------------------------------------------------------------
 
 
