@@ -23,12 +23,11 @@ namespace MCKestrel_800 {
 
 class DiscreteSplit;
 class FunctionTree;
-class ScoreDictVar;
+class ResultVar;
 class ScoreDictionary;
 class ScoreMissingValueSet;
 class ScorePredicate;
 class ScoreSplitVar;
-class ScoreValue;
 class ScoreValueRange;
 class TransformVar;
 class TransformationDictionary;
@@ -48,9 +47,7 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   // A plug-in overrides the form that takes the root element; the others stay visible beside it.
   using BaseTranslator::ParseFromTree;
 
-  /// Reads a `DataDictionary` element.
-  /// dataDictionary  the element; null is an error (code 1).
-  /// reserved        without meaning; pass false.
+  /// Reads a `DataDictionary` element; null is an error (code 1). `reserved` is without meaning: pass false.
   /// Returns a new dictionary, never null or empty, that the caller deletes. Its variables keep the
   /// document's order in `GetVarNames`. Categorical variables have their encoder, with codes in the order of
   /// their valid values.
@@ -64,8 +61,7 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   static void ParseContinuousValues(xercesc::DOMElement* field, ScoreDictVar* variable);
 
   /// Reads one `Interval` of a continuous field: what lies outside it is added to `set` as missing ranges.
-  /// var       the field's variable; null is allowed, since an interval means the same for every continuous
-  /// field. reserved  without meaning; pass 0.
+  /// The variable may be null: an interval means the same for all. `reserved` is without meaning: pass 0.
   static void handleInterval(ScoreDictVar* var, xercesc::DOMNode* interval, ScoreMissingValueSet* set,
                              int reserved);
 
@@ -79,29 +75,25 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   /// Returns false, adding nothing, when `flags` is 0; a bound given twice is an error (code 5).
   static bool HandleVEXAMissingInterval(ScoreMissingValueSet* set, int flags, double lower, double upper);
 
-  /// The date/time type that a `dataType` text names; `kNoDateTime` for every other text, the empty one and
-  /// null.
+  /// The date/time type that a `dataType` text names; `kNoDateTime` for every other text and for null.
   static DateTimeType ParseDateTimeType(const XMLCh* dataType);
 
-  /// Reads an `Extension` element's "UsageType" children: the value "disable" turns the variable's usage type
-  /// off.
+  /// Turns the variable's usage type off where an `Extension` has a "UsageType" child with value "disable".
   static void ParseUsageTypeExtension(xercesc::DOMElement* extension, ScoreDictVar* variable);
 
   /// Gives a nominal or ordinal variable its category encoder, unless it has one, and encodes its value
   /// labels in their order. Returns false, doing nothing, for null and for a continuous variable.
   static bool SetupCatEncoder(ScoreDictVar* variable);
 
-  // ---- Derived fields. `variable` is the derived field that is being read; its name, type and level are
-  // set. A field that an expression refers to is looked up in `dictionary` and then in `derived`; either may
-  // be null. The readers of expressions return the name of that field. (The spelling of some names is part of
-  // the interface.)
+  // ---- Derived fields. `variable` is the derived field that is being read, with its name, type and level.
+  // A field that an expression refers to, whose name the readers of expressions return, is looked up in
+  // `dictionary` and then in `derived`; either may be null. (The spelling of names is part of the interface.)
 
   /// Reads the `DerivedField` children of a `TransformationDictionary` or `LocalTransformations` element; a
   /// null element has none. An expression may refer to data fields and to derived fields that stand before.
-  /// into  what the fields are added to; null for a new one. After a fault it holds the fields before the
-  ///       one at fault.
-  /// Returns `into`, or the new one, which the caller deletes. References in it point at variables of
-  /// `dictionary`, which must outlive it.
+  /// Returns `into` with the fields added, or for null a new dictionary, which the caller deletes. References
+  /// in it point at variables of `dictionary`, which must outlive it. After a fault `into` holds the fields
+  /// before the one at fault.
   static TransformationDictionary* HandleTransformationDictionary(xercesc::DOMElement* element,
                                                                   const ScoreDictionary* dictionary,
                                                                   TransformationDictionary* into);
@@ -120,8 +112,7 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   /// The range of an `Interval`, which the caller deletes. Margins are numbers; of a date/time its seconds.
   static ScoreValueRange* HandleDiscretizeBinInterVal(const xercesc::DOMElement* interval);
 
-  /// A `Constant`: as a value of its `dataType` that the caller deletes (what is no number is the missing
-  /// one), or as the text that stands there.
+  /// A `Constant`: as a value of its `dataType` that the caller deletes (missing for no number), or as text.
   static ScoreValue* HandelConstant(const xercesc::DOMElement* element);
   static void HandelConstant(const xercesc::DOMElement* element, std::string& text);
 
@@ -150,6 +141,19 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   /// Code 6 when the arguments of a node do not fit its function. The node's fields have their variables.
   static void VerifyApplyFunction(const xercesc::DOMElement* element, const FunctionTree& node);
 
+  /// Reads the `Target` children of a `Targets` element into the variables that they name: a default value,
+  /// or categories with labels, prior probabilities and an encoder where there is any `TargetValue`. What a
+  /// variable had before is deleted. A null element has no targets; a null dictionary is an error (code 1).
+  static void HandleTargets(const xercesc::DOMElement* targets, ScoreDictionary* dictionary);
+
+  /// Reads the `ResultField` children of an `Output` element, or null, into a new dictionary of ResultVars,
+  /// in the document's order, that the caller deletes.
+  static ScoreDictionary* ParseResultDictionary(const xercesc::DOMElement* output);
+
+  /// Reads one `ResultField`, or an `OutputField`, which needs no `feature`, and adds it to the dictionary,
+  /// which owns it. A name that the dictionary has already is an error (code 8).
+  static ResultVar& ParseResultField(const xercesc::DOMElement* field, ScoreDictionary& into);
+
   // ---- Predicates. What they give back belongs to the caller; the variables of the dictionaries must
   // outlive it. A field is looked up in `dictionary` and then, unless it is null, in `derivedDictionary`.
 
@@ -163,8 +167,7 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
                                            const ScoreDictionary* derivedDictionary);
 
   /// Reads a `CompoundPredicate` element with all that is in it. Constants that change nothing are dropped,
-  /// and a single child stands for the compound. Null when nothing is left: no predicate, which the caller
-  /// accepts.
+  /// and a single child stands for the compound. Null when nothing is left, which is no error.
   static ScorePredicate* ParseCompoundPredicate(xercesc::DOMElement* element,
                                                 const ScoreDictionary* dictionary,
                                                 const ScoreDictionary* derivedDictionary,
@@ -175,8 +178,7 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   // value satisfies the comparison exactly when the split sends it to a child.
 
   /// Builds the split of a `SimplePredicate` on numbers, or on categories, with the one child 0.
-  /// operatorText, valueText  set to what the attributes say; empty when they are absent.
-  /// missing                  set to whether the predicate's own value is the missing one.
+  /// Sets the texts to what the attributes say, `missing` to whether the predicate's own value is missing.
   static ScoreSplitVar* HandleNodeScaleSplit(const xercesc::DOMElement* element, const ScoreDictVar* variable,
                                              std::string& operatorText, std::string& valueText,
                                              bool& missing);
@@ -194,9 +196,8 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   static void SetDiscreteSplitValue(const xercesc::DOMElement* element, const ScoreDictVar* variable,
                                     DiscreteSplit* split, const XMLCh* value, int child);
 
-  /// Sends the categories that lie before or behind `value` in the variable's list to a child, by the
-  /// operator, and notes where in the list they begin and end. "notEqual" sends all but one, which is no
-  /// interval. No category at all, and an operator that is none, is an error (code 9).
+  /// Sends the categories before or behind `value` in the variable's list to a child, and notes where they
+  /// begin and end; "notEqual" sends all but one. No category at all, or no operator, is an error (code 9).
   static void HandleOrdinalVariable(const xercesc::DOMElement* element, const ScoreDictVar* variable,
                                     DiscreteSplit* split, const XMLCh* value, const XMLCh* operatorText,
                                     int child);
@@ -205,9 +206,8 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
   static int GetIndexOfOrdinalValue(const xercesc::DOMElement* element, const ScoreDictVar* variable,
                                     const ScoreValue& value);
 
-  /// Builds the split of a set from the `Array` in `element`, with the one child 0.
-  /// booleanOperator  "isIn" or "isNotIn".
-  /// values           set to the array's values: codes where the variable has an encoder, else numbers.
+  /// Builds the split of a set ("isIn" or "isNotIn") from the `Array` in `element`, with the one child 0.
+  /// Sets `values` to the array's: codes where the variable has an encoder, else numbers.
   static ScoreSplitVar* HandleArrayDiscreteSplit(const xercesc::DOMElement* element,
                                                  const ScoreDictVar* variable, const XMLCh* booleanOperator,
                                                  std::vector<double>& values);
@@ -228,7 +228,6 @@ class KESTREL_API PMMLTranslator : public BaseTranslator {
 
   /// The first `Array` child; code 4 when there is none.
   static xercesc::DOMElement* GetArrayNode(const xercesc::DOMElement* parent);
-
   /// The elements of an array as they are written. Of the types "int" and "real" each must be a number of
   /// that kind; the attribute `n` must be their number when it is there; there must be one at least.
   static std::vector<std::string> GetArrayElements(const xercesc::DOMElement* array);

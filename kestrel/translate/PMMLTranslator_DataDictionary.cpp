@@ -10,6 +10,7 @@
 #include "kestrel/dictionary/ScoreCatStringEncoder.h"
 #include "kestrel/dictionary/ScoreValueLabel.h"
 #include "kestrel/dictionary/ScoreValueLabelSet.h"
+#include "kestrel/translate/FieldRules.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -28,17 +29,6 @@ using Tag = PMMLTagText;
 constexpr char16_t kNoSpaceTrim[] = u"noSpaceTrim";
 constexpr char16_t kEmptyStringOk[] = u"emptyStringOk";
 constexpr char16_t kMeasure[] = u"measure";
-
-struct OpTypeRow {
-  const char16_t* text;
-  ScoreDictVar::MeasureLevel level;
-};
-
-constexpr OpTypeRow kOpTypes[] = {
-    {Tag::XML_VAL_OT_CONTINUOUS, ScoreDictVar::kContinuous},
-    {Tag::XML_VAL_OT_CATEGORICAL, ScoreDictVar::kNominal},
-    {Tag::XML_VAL_OT_ORDINAL, ScoreDictVar::kOrdinal},
-};
 
 struct DateTimeRow {
   const char16_t* text;
@@ -71,13 +61,11 @@ struct FieldSettings {
 void ReadOpType(const DOMElement* field, ScoreDictVar& variable) {
   const XMLCh* text = Attribute(field, Tag::XML_ATT_DATAFIELD_OPTYPE);
   if (IsEmpty(text)) FailAt(field, KestrelException::kInvalidType, "opType can't be null!!");
-  for (const OpTypeRow& row : kOpTypes) {
-    if (Equals(text, row.text)) {
-      variable.SetMLevel(row.level);
-      return;
-    }
+  ScoreDictVar::MeasureLevel level{};
+  if (!FindMeasureLevel(text, level)) {
+    FailAt(field, KestrelException::kInvalidType, Narrow(text) + ": Invalid Variable Type");
   }
-  FailAt(field, KestrelException::kInvalidType, Narrow(text) + ": Invalid Variable Type");
+  variable.SetMLevel(level);
 }
 
 void ReadMeasure(const DOMElement* extension, const XMLCh* value, ScoreDictVar& variable) {

@@ -10,6 +10,7 @@
 #include "kestrel/dictionary/ValueLbl.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/predicates/Range.h"
+#include "kestrel/translate/FieldRules.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -58,13 +59,11 @@ class FieldValues {
   void ReadExtension(const DOMElement* extension);
   void AddMissing(const DOMElement* element, const XMLCh* text);
   void AddLabel(const DOMElement* element, const XMLCh* text);
-  bool IsListed(const ScoreValue& value) const;
 
   void AddInvalidRange();
   void RefuseLabelsThatAreMissing() const;
   void RefuseLabelsThatTheVariableMisses() const;
   void RefuseDuplicate() const;
-  void CheckFlagVariable() const;
   void CheckLevel() const;
   void StoreLabels();
   void StoreMissing();
@@ -97,7 +96,7 @@ void FieldValues::Read() {
   RefuseLabelsThatAreMissing();
   if (kind_ == Kind::kCategorical) {
     StoreLabels();
-    CheckFlagVariable();
+    CheckFlagCategories(field_, variable_, labelView_.Size());
     RefuseLabelsThatTheVariableMisses();
     RefuseDuplicate();
     StoreMissing();
@@ -169,7 +168,7 @@ void FieldValues::AddLabel(const DOMElement* element, const XMLCh* text) {
     FailAt(element, KestrelException::kConversion, fault.GetErrorMessage());
   }
   if (value == nullptr) return;
-  if (duplicate_ == nullptr && IsListed(*value)) {
+  if (duplicate_ == nullptr && IsListed(*labels_, variable_, *value)) {
     duplicateElement_ = element;
     duplicate_ = value.get();
   }
@@ -178,15 +177,6 @@ void FieldValues::AddLabel(const DOMElement* element, const XMLCh* text) {
       std::make_unique<ValueLbl>(value.get(), AttributeText(element, Tag::XML_ATT_VALUE_DISPLAYVALUE));
   value.release();
   labels_->Add(label.release());
-}
-
-/// Whether an equal value is among the labels. Where trailing blanks count, two texts that differ in them are
-/// two categories.
-bool FieldValues::IsListed(const ScoreValue& value) const {
-  if (variable_.GetNoSpaceTrim()) {
-    return labels_->ContainsEqual(&value, true, variable_.GetEmptyStringOK());
-  }
-  return labels_->Contains(&value);
 }
 
 void FieldValues::ReadExtension(const DOMElement* extension) {
@@ -249,12 +239,6 @@ void FieldValues::RefuseDuplicate() const {
   if (duplicate_ == nullptr) return;
   FailOnValue(duplicateElement_, *duplicate_,
               kind_ == Kind::kCategorical ? ": Duplicated Category Value!" : ": Duplicated Value!");
-}
-
-void FieldValues::CheckFlagVariable() const {
-  if (variable_.IsFlagVariable() && variable_.GetNumberOfCats() != 2) {
-    FailAt(field_, KestrelException::kInconsistentDictionary, "Flag variable has to have two categories!");
-  }
 }
 
 /// No document comes this far with another level; a caller of ParseCategoricalValues may.

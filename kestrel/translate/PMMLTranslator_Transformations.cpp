@@ -12,6 +12,7 @@
 #include "kestrel/transform/TransformVar.h"
 #include "kestrel/transform/TransformationDictionary.h"
 #include "kestrel/translate/DerivedValues.h"
+#include "kestrel/translate/FieldRules.h"
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -90,15 +91,11 @@ std::string ReadName(const DOMElement* field) {
 void ReadLevel(const DOMElement* field, TransformVar& variable) {
   const XMLCh* const text = Attribute(field, Tag::XML_ATT_DATAFIELD_OPTYPE);
   if (IsEmpty(text)) FailAt(field, KestrelException::kInvalidType, "opType is required!!");
-  if (Equals(text, Tag::XML_VAL_OT_CONTINUOUS)) {
-    variable.SetMLevel(ScoreDictVar::kContinuous);
-  } else if (Equals(text, Tag::XML_VAL_OT_CATEGORICAL)) {
-    variable.SetMLevel(ScoreDictVar::kNominal);
-  } else if (Equals(text, Tag::XML_VAL_OT_ORDINAL)) {
-    variable.SetMLevel(ScoreDictVar::kOrdinal);
-  } else {
+  ScoreDictVar::MeasureLevel level{};
+  if (!FindMeasureLevel(text, level)) {
     FailOnField(field, KestrelException::kInvalidType, variable.GetName(), ": Invalid Variable Type");
   }
+  variable.SetMLevel(level);
 }
 
 /// As of data fields: what names no other type is a number.
