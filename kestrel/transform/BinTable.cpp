@@ -12,6 +12,7 @@ namespace MCKestrel_800 {
 namespace {
 
 constexpr std::size_t kWalked = 2;
+constexpr double kInfinity = std::numeric_limits<double>::infinity();
 
 // An end of a range as a number; an absent one is an infinity. False when it is another value.
 bool ReadEnd(const ScoreValue* end, double infinity, double& number) {
@@ -31,12 +32,16 @@ double Tolerance(double end) {
 }  // namespace
 
 BinTable::BinTable(const std::vector<TransformVar::Bin>& bins) : bins_(bins) {
-  if (bins.size() <= kWalked) return;
-  constexpr double kInfinity = std::numeric_limits<double>::infinity();
+  ReadReaches();
+  MakeCores();
+}
+
+void BinTable::ReadReaches() {
+  if (bins_.size() <= kWalked) return;
   std::vector<Reach> reaches;
-  reaches.reserve(bins.size());
-  for (std::size_t bin = 0; bin < bins.size(); ++bin) {
-    const ScoreValueRange* const range = bins[bin].range.get();
+  reaches.reserve(bins_.size());
+  for (std::size_t bin = 0; bin < bins_.size(); ++bin) {
+    const ScoreValueRange* const range = bins_[bin].range.get();
     if (range == nullptr || typeid(*range) != typeid(Range)) return;
     double low, high;
     if (!ReadEnd(range->GetMin(), -kInfinity, low) || !ReadEnd(range->GetMax(), kInfinity, high)) return;
@@ -53,11 +58,11 @@ BinTable::BinTable(const std::vector<TransformVar::Bin>& bins) : bins_(bins) {
     highs.push_back(reach.high);
   }
   reaches_ = std::move(reaches);
-  highs_ = std::move(highs);
-  MakeCores();
+  highs_ = NumberSearch(std::move(highs));
 }
 
 void BinTable::MakeCores() {
+  cores_.reserve(reaches_.size() + 1);
   for (std::size_t i = 0; i < reaches_.size(); ++i) {
     const Reach& reach = reaches_[i];
     double low, high;
@@ -71,6 +76,7 @@ void BinTable::MakeCores() {
     if (i + 1 < reaches_.size()) core.high = std::min(core.high, reaches_[i + 1].low);
     cores_.push_back(core);
   }
+  cores_.push_back({kInfinity, -kInfinity, kNone});
 }
 
 std::size_t BinTable::Walk(double number) const {
@@ -81,11 +87,12 @@ std::size_t BinTable::Walk(double number) const {
   return kNone;
 }
 
-// at  the first bin that may reach as far as the number.
-std::size_t BinTable::FindOther(double number, std::size_t at) const {
+std::size_t BinTable::Find(double number) const {
   if (reaches_.empty()) return Walk(number);
   std::size_t first = kNone;
-  for (; at < reaches_.size() && reaches_[at].low <= number; ++at) {
+  // From the first bin that may reach as far as the number.
+  for (std::size_t at = highs_.FirstNotBelow(number); at < reaches_.size() && reaches_[at].low <= number;
+       ++at) {
     if (reaches_[at].bin < first && reaches_[at].range->Range::IsInRange(number)) first = reaches_[at].bin;
   }
   return first;

@@ -7,7 +7,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "kestrel/transform/FirstNotBelow.h"
+#include "kestrel/transform/NumberSearch.h"
 #include "kestrel/transform/TransformVar.h"
 
 namespace MCKestrel_800 {
@@ -24,11 +24,12 @@ class BinTable {
   explicit BinTable(const std::vector<TransformVar::Bin>& bins);
 
   /// The first bin that holds the number; kNone when there is none.
-  std::size_t Find(double number) const {
-    const std::size_t at = FirstNotBelow(highs_.data(), highs_.size(), number);
-    if (at >= cores_.size()) return FindOther(number, at);
-    const Core& core = cores_[at];
-    return core.low < number && number < core.high ? core.bin : FindOther(number, at);
+  std::size_t Find(double number) const;
+  /// The same where the number is in a bin but not near its ends; kNone elsewhere. Of the system-missing
+  /// value, kNone.
+  std::size_t FindInside(double number) const {
+    const Core& core = cores_[highs_.FirstNotBelow(number)];
+    return core.low < number && number < core.high ? core.bin : kNone;
   }
 
  private:
@@ -47,14 +48,14 @@ class BinTable {
     std::size_t bin;
   };
 
+  void ReadReaches();
   void MakeCores();
-  std::size_t FindOther(double number, std::size_t at) const;
   std::size_t Walk(double number) const;
 
   const std::vector<TransformVar::Bin>& bins_;
   std::vector<Reach> reaches_;  ///< ascending at both ends; empty when the bins are no such list
-  std::vector<double> highs_;   ///< of the reaches
-  std::vector<Core> cores_;     ///< of the reaches
+  NumberSearch highs_;          ///< of the reaches
+  std::vector<Core> cores_;     ///< of the reaches, and behind them one that holds nothing
 };
 
 }  // namespace MCKestrel_800

@@ -24,6 +24,12 @@ constexpr std::size_t kCodesPerRow = 8;
 
 constexpr std::uint32_t kNoRow = static_cast<std::uint32_t>(-1);
 
+// Behind the one for texts without a code.
+std::size_t PlaceOfCode(int code) {
+  static_assert(TextCodes::kUnknown == -1);
+  return static_cast<std::size_t>(code + 1);
+}
+
 unsigned long long StampOf(const ScoreDictionary* dictionary) {
   return dictionary == nullptr ? 0 : dictionary->GetLayoutStamp();
 }
@@ -196,9 +202,9 @@ void DerivationPlan::UseCodes(Step& step) {
   const EncodingTable& encodings = step.evaluation->GetEncodings();
   const std::vector<const StringValue*> texts = encodings.GetTexts();
   if (texts.empty() || !encodings.ListsTexts() || codes.GetSize() > kCodesPerRow * texts.size()) return;
-  step.row_of_code.assign(codes.GetSize(), kNoRow);
+  step.row_of_code.assign(codes.GetSize() + 1, kNoRow);
   for (const StringValue* text : texts) {
-    std::uint32_t& row = step.row_of_code[static_cast<std::size_t>(codes.Find(text->GetText()))];
+    std::uint32_t& row = step.row_of_code[PlaceOfCode(codes.Find(text->GetText()))];
     if (row == kNoRow) row = static_cast<std::uint32_t>(encodings.FindText(*text));
   }
   step.run = RunTextEncoding;
@@ -232,7 +238,8 @@ void DerivationPlan::FillWork(const std::vector<Output>& outputs, Work& work) {
     if (!is_needed_[number]) continue;
     const Step& step = steps_[number];
     ScoreValue* const to = places_[number] != nullptr ? places_[number] : &step.evaluation->GetOwnResult();
-    work.items.push_back({&step, step.as_source == kNone ? nullptr : &sources_[step.as_source], to});
+    work.items.push_back(
+        {step.run, &step, to, step.as_source == kNone ? nullptr : &sources_[step.as_source]});
     if (step.is_circular) continue;
     for (const int source : step.reads) {
       is_read_[source] = true;
@@ -255,7 +262,7 @@ void DerivationPlan::Run(const Work& work, const ScoreCaseRecord* record) {
     }
   }
   for (const Work::Item& item : work.items) {
-    item.step->run(*item.step, *item.to);
+    item.run(*item.step, *item.to);
     if (item.as_source != nullptr && !item.as_source->is_in_case) item.as_source->field->Set(item.to);
   }
 }
@@ -309,14 +316,23 @@ void DerivationPlan::RunTextTree(const Step& step, ScoreValue& to) {
 }
 
 void DerivationPlan::RunTextEncoding(const Step& step, ScoreValue& to) {
-  const SourceField& source = *step.source;
-  if (source.GetKind() != SourceField::Kind::kText) {
-    step.evaluation->Compute(source, to);
-    return;
+  const int code = step.source->GetTextCode();
+  if (code == SourceField::kNotLookedUp) {
+    RunNextTextEncoding(step, to);
+  } else {
+    step.evaluation->GiveRow(step.row_of_code[PlaceOfCode(code)], *step.source, to);
   }
-  const int code = source.GetTextCode();
-  const std::uint32_t row = code == TextCodes::kUnknown ? kNoRow : step.row_of_code[code];
-  step.evaluation->GiveRow(row == kNoRow ? EncodingTable::kNone : row, source, to);
+}
+
+// For a value that no step has looked up, or that is no text.
+void DerivationPlan::RunNextTextEncoding(const Step& step, ScoreValue& to) {
+  const SourceField& source = *step.source;
+  if (source.GetKind() == SourceField::Kind::kText) {
+    source.LookUpTextCode();
+    step.evaluation->GiveRow(step.row_of_code[PlaceOfCode(source.GetTextCode())], source, to);
+  } else {
+    step.evaluation->Compute(source, to);
+  }
 }
 
 void DerivationPlan::RunNorm(const Step& step, ScoreValue& to) {

@@ -81,16 +81,17 @@ class DerivationPlan {
     const SourceField* source = nullptr;  ///< what it reads, unless it is a function tree
     int as_source = kNone;                ///< itself as what others read
     std::unique_ptr<ApplyProgram> program;
-    std::vector<std::uint32_t> row_of_code;  ///< by the code of the source's text
+    std::vector<std::uint32_t> row_of_code;  ///< by the code of the source's text, and 1 more
     std::vector<int> reads;                  ///< all sources
   };
 
   /// Steps to run, in order, with the sources that they read.
   struct Work {
     struct Item {
+      RunStep run;
       const Step* step;
-      Source* as_source;
       ScoreValue* to;
+      Source* as_source;  ///< null when no other step reads it
     };
     std::vector<Item> items;
     std::vector<Source*> sources;
@@ -114,6 +115,7 @@ class DerivationPlan {
   static void RunNumberTree(const Step& step, ScoreValue& to);
   static void RunTextTree(const Step& step, ScoreValue& to);
   static void RunTextEncoding(const Step& step, ScoreValue& to);
+  static void RunNextTextEncoding(const Step& step, ScoreValue& to);
   static void RunNorm(const Step& step, ScoreValue& to);
   static void RunBin(const Step& step, ScoreValue& to);
   static void RunOther(const Step& step, ScoreValue& to);

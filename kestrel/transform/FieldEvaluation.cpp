@@ -7,7 +7,6 @@
 
 #include "kestrel/foundation/Locale.h"
 #include "kestrel/predicates/ScoreValueRange.h"
-#include "kestrel/transform/SourceField.h"
 
 namespace MCKestrel_800 {
 namespace {
@@ -87,7 +86,7 @@ FieldEvaluation::FieldEvaluation(const TransformVar& field)
     default:
       break;
   }
-  gives_numbers_ = storage_ == Storage::kNumber && row_copies_.empty();
+  if (storage_ == Storage::kNumber && row_copies_.empty()) given_numbers_ = row_numbers_.size();
 }
 
 // A constant is the first row of its field.
@@ -156,7 +155,7 @@ void FieldEvaluation::GiveString(const std::string& text, ScoreValue& to) {
 }
 
 void FieldEvaluation::GiveOtherRow(std::size_t row, const SourceField& source, ScoreValue& to) {
-  if (row == EncodingTable::kNone) {
+  if (row >= row_numbers_.size() + row_texts_.size()) {
     Take(Recode(source, IsText()), to);
   } else if (!row_copies_.empty() && row_copies_[row]) {
     Take(source.GetValue(), to);
@@ -202,7 +201,7 @@ void FieldEvaluation::ComputeFieldRef(const SourceField& source, ScoreValue& to)
   }
 }
 
-void FieldEvaluation::ComputeNorm(const SourceField& source, ScoreValue& to) {
+void FieldEvaluation::ComputeOtherNorm(const SourceField& source, ScoreValue& to) {
   double number;
   if (source.IsNumber()) {
     number = curve_.Compute(source.GetNumber());
@@ -215,20 +214,23 @@ void FieldEvaluation::ComputeNorm(const SourceField& source, ScoreValue& to) {
   static_cast<NumericValue&>(to).SetDoubleValue(NumberOrMissing(number));
 }
 
+// row  the bin that holds the value, where that could be seen at once.
+void FieldEvaluation::ComputeOtherBin(std::size_t row, const SourceField& source, ScoreValue& to) {
+  const SourceField::Kind kind = source.GetKind();
+  if (row != BinTable::kNone) {
+    GiveOtherRow(row, source, to);
+  } else if (kind == SourceField::Kind::kNumber || kind == SourceField::Kind::kDateTime) {
+    GiveRow(bins_.Find(source.GetNumber()), source, to);
+  } else {
+    Take(RecodeAbsent(true), to);
+  }
+}
+
 void FieldEvaluation::ComputeEncoding(const SourceField& source, ScoreValue& to) {
   if (source.HasValue()) {
     GiveRow(encodings_.Find(source), source, to);
   } else {
     Take(RecodeAbsent(false), to);
-  }
-}
-
-void FieldEvaluation::ComputeBin(const SourceField& source, ScoreValue& to) {
-  const SourceField::Kind kind = source.GetKind();
-  if (kind == SourceField::Kind::kNumber || kind == SourceField::Kind::kDateTime) {
-    GiveRow(bins_.Find(source.GetNumber()), source, to);
-  } else {
-    Take(RecodeAbsent(true), to);
   }
 }
 

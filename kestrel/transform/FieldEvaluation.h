@@ -14,11 +14,10 @@
 #include "kestrel/transform/EncodingTable.h"
 #include "kestrel/transform/FunctionEvaluation.h"
 #include "kestrel/transform/NormCurve.h"
+#include "kestrel/transform/SourceField.h"
 #include "kestrel/transform/TransformVar.h"
 
 namespace MCKestrel_800 {
-
-class SourceField;
 
 /// Bound to one field, which must not change. Results are of the field's storage type: a number, a date/time
 /// (computed with as the number of its seconds) or, for every other type, a text. They are written where the
@@ -46,9 +45,10 @@ class FieldEvaluation {
     }
   }
   void GiveText(const StringValue& text, ScoreValue& to);
-  /// The result of an encoding row or a bin; EncodingTable::kNone when none applies to the source's value.
+  /// The result of an encoding row or a bin; a number that none has, as kNone is, when none applies to the
+  /// source's value.
   void GiveRow(std::size_t row, const SourceField& source, ScoreValue& to) {
-    if (gives_numbers_ && row < row_numbers_.size()) {
+    if (row < given_numbers_) {
       static_cast<NumericValue&>(to).SetDoubleValue(row_numbers_[row]);
     } else {
       GiveOtherRow(row, source, to);
@@ -59,8 +59,22 @@ class FieldEvaluation {
   void Compute(const SourceField& source, ScoreValue& to) { (this->*compute_)(source, to); }
 
   /// The same for the one kind, of which the field must be: a normalised number, a bin.
-  void ComputeNorm(const SourceField& source, ScoreValue& to);
-  void ComputeBin(const SourceField& source, ScoreValue& to);
+  void ComputeNorm(const SourceField& source, ScoreValue& to) {
+    if (source.IsNumber() && curve_.IsPlainAt(source.GetNumber())) {
+      const double number = curve_.ComputePlain(source.GetNumber());
+      static_cast<NumericValue&>(to).SetDoubleValue(NumberOrMissing(number));
+    } else {
+      ComputeOtherNorm(source, to);
+    }
+  }
+  void ComputeBin(const SourceField& source, ScoreValue& to) {
+    const std::size_t row = bins_.FindInside(source.GetNumber());
+    if (row < given_numbers_) {
+      static_cast<NumericValue&>(to).SetDoubleValue(row_numbers_[row]);
+    } else {
+      ComputeOtherBin(row, source, to);
+    }
+  }
 
   const EncodingTable& GetEncodings() const { return encodings_; }
 
@@ -88,6 +102,8 @@ class FieldEvaluation {
   void ComputeEncoding(const SourceField& source, ScoreValue& to);
   void ComputeNothing(const SourceField& source, ScoreValue& to);
 
+  void ComputeOtherNorm(const SourceField& source, ScoreValue& to);
+  void ComputeOtherBin(std::size_t row, const SourceField& source, ScoreValue& to);
   void GiveSeconds(double seconds, ScoreValue& to) const;
   void ReadConstant();
   void GiveOtherRow(std::size_t row, const SourceField& source, ScoreValue& to);
@@ -119,8 +135,8 @@ class FieldEvaluation {
   std::vector<double> row_numbers_;
   std::vector<StringValue> row_texts_;
   std::vector<bool> row_copies_;  ///< whether it gives the input itself; empty when none does
-  /// Whether every row gives a number and the field is one.
-  bool gives_numbers_ = false;
+  /// How many rows give a number to a number: all or none.
+  std::size_t given_numbers_ = 0;
   NumericValue recoded_number_;
   DateTimeValue recoded_date_;
   StringValue recoded_text_;

@@ -4,13 +4,23 @@
 #include <cmath>
 
 namespace MCKestrel_800 {
+namespace {
+
+// Points that are no numbers are in no order.
+bool IsAscending(const std::vector<double>& numbers) {
+  const auto descends = [](double left, double right) { return !(left <= right); };
+  return std::adjacent_find(numbers.begin(), numbers.end(), descends) == numbers.end();
+}
+
+}  // namespace
+
 NormCurve::NormCurve(const std::vector<double>& orig, const std::vector<double>& norm,
                      const std::vector<double>& slopes, const std::vector<double>& intercepts,
                      ScoreDictVar::OutlierHandleMethod outliers)
     : orig_(orig),
       norm_(norm),
       has_range_(orig.size() >= 2),
-      is_ascending_(std::is_sorted(orig.begin(), orig.end())),
+      is_ascending_(IsAscending(orig)),
       outliers_(outliers) {
   // Lists that do not belong together are no segments.
   if (slopes.size() == intercepts.size() && !orig.empty()) {
@@ -22,7 +32,11 @@ NormCurve::NormCurve(const std::vector<double>& orig, const std::vector<double>&
   const auto [lowest, highest] = std::minmax_element(orig.begin(), orig.end());
   lowest_ = *lowest;
   highest_ = *highest;
-  is_plain_ = has_range_ && is_ascending_ && lines_.size() >= 2 && lines_.size() + 1 == orig.size();
+  if (!has_range_ || !is_ascending_) return;
+  inner_ = NumberSearch({orig.begin() + 1, orig.end() - 1});
+  if (lines_.size() < 2 || lines_.size() + 1 != orig.size()) return;
+  plain_lowest_ = lowest_;
+  plain_highest_ = highest_;
 }
 
 double NormCurve::ComputeOther(double x) const {
@@ -49,7 +63,7 @@ std::size_t NormCurve::FindSegment(double x) const {
     return i;
   }
   // In ascending points it ends at the first point, but the very first, that is not below x.
-  const std::size_t i = FirstNotBelow(orig + 1, segments - 1, x);
+  const std::size_t i = inner_.FirstNotBelow(x);
   return orig[i] <= x && x <= orig[i + 1] ? i : segments;
 }
 

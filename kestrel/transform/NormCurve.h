@@ -4,10 +4,11 @@
 #define KESTREL_TRANSFORM_NORMCURVE_H
 
 #include <cstddef>
+#include <limits>
 #include <vector>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
-#include "kestrel/transform/FirstNotBelow.h"
+#include "kestrel/transform/NumberSearch.h"
 
 namespace MCKestrel_800 {
 
@@ -19,10 +20,10 @@ class NormCurve {
             const std::vector<double>& slopes, const std::vector<double>& intercepts,
             ScoreDictVar::OutlierHandleMethod outliers);
 
-  double Compute(double x) const {
-    if (!is_plain_ || !(lowest_ <= x && x <= highest_)) return ComputeOther(x);
-    return lines_[FirstNotBelow(orig_.data() + 1, lines_.size() - 1, x)].At(x);
-  }
+  double Compute(double x) const { return IsPlainAt(x) ? ComputePlain(x) : ComputeOther(x); }
+  /// Whether there is but a line to be found, and the number on that line.
+  bool IsPlainAt(double x) const { return plain_lowest_ <= x && x <= plain_highest_; }
+  double ComputePlain(double x) const { return lines_[inner_.FirstNotBelow(x)].At(x); }
 
  private:
   double ComputeOther(double x) const;
@@ -44,10 +45,12 @@ class NormCurve {
   std::vector<Line> lines_;
   bool has_range_;
   bool is_ascending_;
-  /// Whether the points ascend and each two of them have a line.
-  bool is_plain_ = false;
   double lowest_ = 0.0;
   double highest_ = 0.0;
+  NumberSearch inner_;  ///< of ascending points: all but the first and the last one
+  /// Where the points ascend and each two of them have a line; nowhere when there is no such place.
+  double plain_lowest_ = std::numeric_limits<double>::infinity();
+  double plain_highest_ = -std::numeric_limits<double>::infinity();
   ScoreDictVar::OutlierHandleMethod outliers_;
 };
 

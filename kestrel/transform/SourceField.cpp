@@ -1,7 +1,7 @@
 #include "kestrel/transform/SourceField.h"
 
 #include <cmath>
-#include <typeinfo>
+#include <limits>
 
 #include "kestrel/dictionary/DictVar.h"
 #include "kestrel/dictionary/ScoreMissingValueSet.h"
@@ -44,43 +44,31 @@ double NumberOf(const ScoreValue& value) {
 SourceField::SourceField(const ScoreDictVar* variable)
     : variable_(variable),
       takes_every_value_(TakesEveryValue(variable)),
-      misses_sysmis_(variable == nullptr || variable->GetVarType() != ScoreDictVar::STRING_VAR),
+      missing_number_(variable == nullptr || variable->GetVarType() != ScoreDictVar::STRING_VAR
+                          ? NumericValue::gSysmisValue
+                          : std::numeric_limits<double>::quiet_NaN()),
       text_(&EmptyText()) {}
 
-void SourceField::Set(const ScoreValue* value) {
-  value_ = value;
-  has_key_ = false;
-  has_code_ = false;
-  if (value != nullptr && typeid(*value) == typeid(NumericValue)) {
-    number_ = static_cast<const NumericValue*>(value)->NumericValue::GetDouble();
-    is_missing_ =
-        takes_every_value_ ? misses_sysmis_ && number_ == NumericValue::gSysmisValue : AsksForMissing(*value);
-    if (kind_ == Kind::kNumber) return;
-    kind_ = Kind::kNumber;
-    seconds_ = NumericValue::gSysmisValue;
-    text_ = &EmptyText();
-    return;
-  }
-  if (value != nullptr && typeid(*value) == typeid(StringValue)) {
-    text_ = static_cast<const StringValue*>(value);
-    is_missing_ = !takes_every_value_ && AsksForMissing(*value);
-    if (kind_ == Kind::kText) return;
-    kind_ = Kind::kText;
-    number_ = NumericValue::gSysmisValue;
-    seconds_ = NumericValue::gSysmisValue;
-    return;
-  }
+void SourceField::SetNew(const ScoreValue* value) {
   number_ = NumericValue::gSysmisValue;
   seconds_ = NumericValue::gSysmisValue;
   text_ = &EmptyText();
   kind_ = Kind::kNone;
   is_missing_ = true;
-  if (value != nullptr) SetOther(*value);
+  plain_type_ = nullptr;
+  if (value == nullptr) return;
+  if (typeid(*value) == typeid(NumericValue) || typeid(*value) == typeid(StringValue)) {
+    plain_type_ = &typeid(*value);
+    kind_ = value->GetType() == ScoreValue::kNumeric ? Kind::kNumber : Kind::kText;
+    Set(value);
+  } else {
+    SetOther(*value);
+    AskForMissing();
+  }
 }
 
 // Dates, and values of a host's own class.
 void SourceField::SetOther(const ScoreValue& value) {
-  is_missing_ = AsksForMissing(value);
   kind_ = Kind::kOther;
   switch (value.GetType()) {
     case ScoreValue::kNumeric:
@@ -101,8 +89,8 @@ void SourceField::SetOther(const ScoreValue& value) {
   }
 }
 
-bool SourceField::AsksForMissing(const ScoreValue& value) const {
-  return variable_ == nullptr ? value.IsSystemMissingValue() : variable_->IsMissingValue(&value);
+void SourceField::AskForMissing() {
+  is_missing_ = variable_ == nullptr ? value_->IsSystemMissingValue() : variable_->IsMissingValue(value_);
 }
 
 const ValueKey& SourceField::GetKey() const {

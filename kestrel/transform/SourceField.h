@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <string>
+#include <typeinfo>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/dictionary/TextCodes.h"
@@ -26,6 +27,7 @@ double NumberOf(const ScoreValue& value);
 class SourceField {
  public:
   enum class Kind : std::uint8_t { kNone, kNumber, kText, kDateTime, kOther };
+  static constexpr int kNotLookedUp = TextCodes::kUnknown - 1;
 
   /// variable  whose rules say what is missing; null when nobody knows the field: then the system-missing
   ///           value alone is.
@@ -33,8 +35,22 @@ class SourceField {
   SourceField(const SourceField&) = delete;
   SourceField& operator=(const SourceField&) = delete;
 
-  /// Takes the value of a case; null when there is none.
-  void Set(const ScoreValue* value);
+  /// Takes the value of a case; null when there is none. Most values are of the class of the one before.
+  void Set(const ScoreValue* value) {
+    value_ = value;
+    has_key_ = false;
+    code_ = kNotLookedUp;
+    if (value == nullptr || &typeid(*value) != plain_type_) {
+      SetNew(value);
+    } else if (kind_ == Kind::kNumber) {
+      number_ = static_cast<const NumericValue*>(value)->NumericValue::GetDouble();
+      is_missing_ = number_ == missing_number_;
+    } else {
+      text_ = static_cast<const StringValue*>(value);
+      is_missing_ = false;
+    }
+    if (!takes_every_value_) AskForMissing();
+  }
 
   const ScoreDictVar* GetVariable() const { return variable_; }
   bool HasValue() const { return value_ != nullptr; }
@@ -58,26 +74,24 @@ class SourceField {
   /// Gives texts codes, so that a text is looked up once for all fields that list texts. `codes` must outlive
   /// this object.
   void SetCodes(const TextCodes* codes) { codes_ = codes; }
-  /// The code of the text at hand, which must be one; TextCodes::kUnknown when it has none. Looked up when it
-  /// is first asked for.
-  int GetTextCode() const {
-    if (!has_code_) {
-      code_ = codes_->Find(text_->GetText());
-      has_code_ = true;
-    }
-    return code_;
-  }
+  /// Looks up the code of the text at hand; TextCodes::kUnknown when it has none. The value must be a text
+  /// and there must be codes.
+  void LookUpTextCode() const { code_ = codes_->Find(text_->GetText()); }
+  /// What was looked up; kNotLookedUp when the value at hand is no text, or that is still to be done.
+  int GetTextCode() const { return code_; }
 
  private:
+  void SetNew(const ScoreValue* value);
   void SetOther(const ScoreValue& value);
-  bool AsksForMissing(const ScoreValue& value) const;
+  void AskForMissing();
 
   const ScoreDictVar* variable_;
-  /// Whether the variable calls no value missing but the system-missing number, and whether it does that.
+  /// Whether the variable calls no value missing but the one number, which is NaN when it calls none missing.
   bool takes_every_value_;
-  bool misses_sysmis_;
+  double missing_number_;
+  /// The class of the value at hand when it is a number or a text of the library's own.
+  const std::type_info* plain_type_ = nullptr;
   mutable bool has_key_ = false;
-  mutable bool has_code_ = false;
   bool is_missing_ = true;
   Kind kind_ = Kind::kNone;
   const ScoreValue* value_ = nullptr;
@@ -86,7 +100,7 @@ class SourceField {
   const StringValue* text_;
   mutable ValueKey key_;
   const TextCodes* codes_ = nullptr;
-  mutable int code_ = TextCodes::kUnknown;
+  mutable int code_ = kNotLookedUp;
   StringValue copied_text_;
 };
 
