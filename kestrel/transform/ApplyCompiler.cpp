@@ -44,6 +44,23 @@ TransformFunction FunctionOf(const FunctionTree& node) {
   return node.GetNodeStats().GetTransFunction();
 }
 
+bool IsConstant(const FunctionTree& node) {
+  return FunctionOf(node) == kNoFunction && !ApplyProgram::IsReference(node);
+}
+
+// Whether a node is a sum, difference, product or quotient of two.
+bool IsArithmetic(const FunctionTree& node) {
+  const TransformFunction function = FunctionOf(node);
+  if (function == kPlusFunction) return true;
+  return (function == kMinusFunction || function == kMultiplyFunction || function == kDivideFunction) &&
+         node.GetChildCount() == 2;
+}
+
+// Whether that is all there is to a node.
+bool GivesOperand(const FunctionTree& node) {
+  return IsArithmetic(node) && node.GetNodeStats().GetRecodeMissValueTo() == nullptr;
+}
+
 double NumberOrMissing(const ScoreValue* value) {
   if (value == nullptr || value->GetType() == ScoreValue::kString) return NumericValue::gSysmisValue;
   return value->GetDouble();
@@ -94,6 +111,10 @@ FunctionValueKind ApplyCompiler::KindOf(const FunctionTree* node) const {
   return Kind::kNumber;
 }
 
+const double* ApplyCompiler::Result(Node root) {
+  return GivesOperand(root) ? Operand(&root) : Number(&root);
+}
+
 const double* ApplyCompiler::Number(const FunctionTree* node) {
   const Level level(*this);
   if (node == nullptr || is_too_deep_) return MissingNumber();
@@ -105,6 +126,28 @@ const double* ApplyCompiler::Number(const FunctionTree* node) {
   if (function == nullptr) return NewConstant(0.0);
   if (function->result == Kind::kText) return MissingNumber();
   return Replaced(*node, NumberOfFunction(*node, *function));
+}
+
+// Arithmetic within arithmetic, which most formulas are, hands its result on as it is.
+const double* ApplyCompiler::Operand(const FunctionTree* node) {
+  if (node == nullptr || IsConstant(*node)) return NewConstant(AsOperand(*Number(node)));
+  const ApplyNodeStats& stats = node->GetNodeStats();
+  const bool is_field = ApplyProgram::IsReference(*node) && stats.GetFieldrefRecodeMissValueTo() == nullptr;
+  if (!is_field && !GivesOperand(*node)) return EmitNumber(ApplySteps::ToOperand, kNoFunction, Number(node));
+  const Level level(*this);
+  if (is_too_deep_) return MissingNumber();
+  return is_field ? &find_(stats.GetParameterName()).GetOperand() : Arithmetic(*node);
+}
+
+const double* ApplyCompiler::Arithmetic(Node node) {
+  const TransformFunction function = FunctionOf(node);
+  const double* const x = Operand(ChildOf(node, 0));
+  const double* const y = Operand(node.GetChildCount() > 1 ? ChildOf(node, 1) : nullptr);
+  const ApplyInstruction::Run run = function == kPlusFunction       ? ApplySteps::Add
+                                    : function == kMinusFunction    ? ApplySteps::Subtract
+                                    : function == kMultiplyFunction ? ApplySteps::Multiply
+                                                                    : ApplySteps::Divide;
+  return EmitNumber(run, function, x, y);
 }
 
 const double* ApplyCompiler::Seconds(const FunctionTree* node) {
@@ -180,29 +223,20 @@ const double* ApplyCompiler::NumberOfSpecial(Node node, TransformFunction functi
 }
 
 const double* ApplyCompiler::NumberOfScalar(Node node) {
-  const TransformFunction function = FunctionOf(node);
+  if (IsArithmetic(node)) return EmitNumber(ApplySteps::FromOperand, kNoFunction, Arithmetic(node));
   const double* const x = Number(ChildOf(node, 0));
   const double* const y = node.GetChildCount() > 1 ? Number(ChildOf(node, 1)) : MissingNumber();
-  return EmitNumber(function == kPlusFunction ? ApplySteps::Add : ApplySteps::Scalar, function, x, y);
+  return EmitNumber(ApplySteps::Scalar, FunctionOf(node), x, y);
 }
 
 const double* ApplyCompiler::NumberOfList(Node node) {
-  const TransformFunction function = FunctionOf(node);
-  if (node.GetChildCount() == 2 &&
-      (function == kMinusFunction || function == kMultiplyFunction || function == kDivideFunction)) {
-    const double* const x = Number(ChildOf(node, 0));
-    const double* const y = Number(ChildOf(node, 1));
-    const ApplyInstruction::Run run = function == kMinusFunction      ? ApplySteps::Subtract
-                                      : function == kMultiplyFunction ? ApplySteps::Multiply
-                                                                      : ApplySteps::Divide;
-    return EmitNumber(run, function, x, y);
-  }
+  if (IsArithmetic(node)) return EmitNumber(ApplySteps::FromOperand, kNoFunction, Arithmetic(node));
   ApplyDetail& detail = NewDetail();
   for (const FunctionTree* child : node.Children())
     detail.numbers.push_back(Number(child));
   detail.values.resize(detail.numbers.size());
   detail.scratch.reserve(detail.numbers.size());
-  return EmitNumber(ApplySteps::List, function, nullptr, nullptr, &detail);
+  return EmitNumber(ApplySteps::List, FunctionOf(node), nullptr, nullptr, &detail);
 }
 
 const double* ApplyCompiler::NumberOfComparison(Node node) {

@@ -22,6 +22,8 @@ class ApplyCompiler {
   ApplyCompiler(ApplyProgram& program, const ApplyProgram::FindSource& find)
       : program_(program), find_(find) {}
 
+  /// The number of the whole tree, which may be missing as an operand is.
+  const double* Result(const FunctionTree& root);
   /// Numbers, and the seconds of dates and times.
   const double* Number(const FunctionTree* node);
   ApplyText Text(const FunctionTree* node);
@@ -33,6 +35,9 @@ class ApplyCompiler {
   class Level;
 
   const double* Seconds(const FunctionTree* node);
+  /// The number of a node as an operand.
+  const double* Operand(const FunctionTree* node);
+  const double* Arithmetic(Node node);
   Kind KindOf(const FunctionTree* node) const;
 
   const double* NumberOfReference(Node node);

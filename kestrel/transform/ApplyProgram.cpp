@@ -19,7 +19,7 @@ ApplyProgram::ApplyProgram(const FunctionTree& root, bool wants_text, const Find
   if (wants_text) {
     text_ = compiler.Text(&root);
   } else {
-    number_ = compiler.Number(&root);
+    number_ = compiler.Result(root);
   }
   if (!compiler.IsTooDeep()) return;
   code_.clear();

@@ -67,6 +67,7 @@ class ApplyProgram {
     for (const ApplyInstruction* step = code_.data(); step != end;)
       step = step->run(*step);
   }
+  /// The system-missing value, or what is no finite number, when the tree has none.
   double GetNumber() const { return *number_; }
   const StringValue& GetText() const { return **text_; }
 

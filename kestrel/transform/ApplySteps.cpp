@@ -1,6 +1,7 @@
 #include "kestrel/transform/ApplySteps.h"
 
 #include <algorithm>
+#include <limits>
 #include <string_view>
 
 #include "kestrel/foundation/NumericValue.h"
@@ -16,6 +17,11 @@ Next Give(Step step, double result) {
   return &step + 1;
 }
 
+// The system-missing value itself may come out of arithmetic, and is missing then.
+Next GiveOperand(Step step, double result) {
+  return Give(step, result <= std::numeric_limits<double>::max() ? AsOperand(result) : kMissingOperand);
+}
+
 // The result of a test, or of its opposite.
 Next GiveTest(Step step, bool holds, TransformFunction opposite) {
   return Give(step, holds != (step.function == opposite) ? 1.0 : 0.0);
@@ -28,19 +34,27 @@ const StringValue& TextOf(Step step, std::size_t index = 0) {
 }  // namespace
 
 Next Add(Step step) {
-  return Give(step, PlusNumbers(*step.x, *step.y));
+  return GiveOperand(step, *step.x + *step.y);
 }
 
 Next Subtract(Step step) {
-  return Give(step, MinusNumbers(*step.x, *step.y));
+  return GiveOperand(step, *step.x - *step.y);
 }
 
 Next Multiply(Step step) {
-  return Give(step, MultiplyNumbers(*step.x, *step.y));
+  return GiveOperand(step, *step.x * *step.y);
 }
 
 Next Divide(Step step) {
-  return Give(step, DivideNumbers(*step.x, *step.y));
+  return GiveOperand(step, *step.x / *step.y);
+}
+
+Next ToOperand(Step step) {
+  return Give(step, AsOperand(*step.x));
+}
+
+Next FromOperand(Step step) {
+  return Give(step, NumberOrMissing(*step.x));
 }
 
 Next Scalar(Step step) {

@@ -39,11 +39,15 @@ namespace ApplySteps {
 using Step = const ApplyInstruction&;
 using Next = const ApplyInstruction*;
 
-// Numbers to a number.
+// Arithmetic, operands to an operand; what is too large, or no number, is missing.
 Next Add(Step step);
 Next Subtract(Step step);
 Next Multiply(Step step);
 Next Divide(Step step);
+Next ToOperand(Step step);
+Next FromOperand(Step step);
+
+// Numbers to a number.
 Next Scalar(Step step);
 Next List(Step step);
 Next DateTime(Step step);  ///< x: the seconds; y: what is subtracted

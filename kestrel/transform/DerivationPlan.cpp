@@ -146,7 +146,7 @@ void DerivationPlan::Order() {
     int& step = sources_[source].step;
     if (step == kNone) continue;
     step = new_number[step];
-    steps_[step].as_source = static_cast<int>(source);
+    steps_[step].as_source = &sources_[source];
   }
 }
 
@@ -178,7 +178,9 @@ void DerivationPlan::PrepareStep(Step& step, const ApplyProgram::FindSource& fin
   } else if (kind == TransExpression::kApply && step.field->GetRoot() != nullptr) {
     const bool is_text = storage == FieldEvaluation::Storage::kText;
     step.program = std::make_unique<ApplyProgram>(*step.field->GetRoot(), is_text, find);
-    step.run = is_text ? RunTextTree : RunNumberTree;
+    step.run = is_text                                        ? RunTextTree
+               : storage == FieldEvaluation::Storage::kNumber ? RunNumberTree
+                                                              : RunDateTree;
   }
 }
 
@@ -238,8 +240,10 @@ void DerivationPlan::FillWork(const std::vector<Output>& outputs, Work& work) {
     if (!is_needed_[number]) continue;
     const Step& step = steps_[number];
     ScoreValue* const to = places_[number] != nullptr ? places_[number] : &step.evaluation->GetOwnResult();
-    work.items.push_back(
-        {step.run, &step, to, step.as_source == kNone ? nullptr : &sources_[step.as_source]});
+    if (step.as_source != nullptr && is_read_[static_cast<std::size_t>(step.as_source - sources_.data())]) {
+      work.items.push_back({ShowResult, &step, to});
+    }
+    work.items.push_back({step.run, &step, to});
     if (step.is_circular) continue;
     for (const int source : step.reads) {
       is_read_[source] = true;
@@ -261,10 +265,8 @@ void DerivationPlan::Run(const Work& work, const ScoreCaseRecord* record) {
       source->is_in_case = false;
     }
   }
-  for (const Work::Item& item : work.items) {
+  for (const Work::Item& item : work.items)
     item.run(*item.step, *item.to);
-    if (item.as_source != nullptr && !item.as_source->is_in_case) item.as_source->field->Set(item.to);
-  }
 }
 
 void DerivationPlan::TakeCase(const Work& work, const ScoreCaseRecord& record) {
@@ -301,11 +303,21 @@ void DerivationPlan::LookUpPositions(const ScoreCaseRecord& record) {
   record_stamp_ = record.GetLayoutStamp();
 }
 
+// A value in the case goes before it.
+void DerivationPlan::ShowResult(const Step& step, ScoreValue& to) {
+  if (!step.as_source->is_in_case) step.as_source->field->Set(&to);
+}
+
 void DerivationPlan::RunCircular(const Step& step, ScoreValue& to) {
   step.evaluation->GiveMissing(to);
 }
 
 void DerivationPlan::RunNumberTree(const Step& step, ScoreValue& to) {
+  step.program->Run();
+  static_cast<NumericValue&>(to).SetDoubleValue(NumberOrMissing(step.program->GetNumber()));
+}
+
+void DerivationPlan::RunDateTree(const Step& step, ScoreValue& to) {
   step.program->Run();
   step.evaluation->GiveNumber(step.program->GetNumber(), to);
 }

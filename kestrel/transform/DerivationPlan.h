@@ -79,19 +79,19 @@ class DerivationPlan {
     bool is_circular = false;
     RunStep run = nullptr;
     const SourceField* source = nullptr;  ///< what it reads, unless it is a function tree
-    int as_source = kNone;                ///< itself as what others read
+    Source* as_source = nullptr;          ///< itself as what others read; null when none does
     std::unique_ptr<ApplyProgram> program;
     std::vector<std::uint32_t> row_of_code;  ///< by the code of the source's text, and 1 more
     std::vector<int> reads;                  ///< all sources
   };
 
-  /// Steps to run, in order, with the sources that they read.
+  /// Steps to run, in order, with the sources that they read. A step that others read is followed by one that
+  /// shows them its result.
   struct Work {
     struct Item {
       RunStep run;
       const Step* step;
       ScoreValue* to;
-      Source* as_source;  ///< null when no other step reads it
     };
     std::vector<Item> items;
     std::vector<Source*> sources;
@@ -111,8 +111,10 @@ class DerivationPlan {
   void TakeCase(const Work& work, const ScoreCaseRecord& record);
   void LookUpPositions(const ScoreCaseRecord& record);
 
+  static void ShowResult(const Step& step, ScoreValue& to);
   static void RunCircular(const Step& step, ScoreValue& to);
   static void RunNumberTree(const Step& step, ScoreValue& to);
+  static void RunDateTree(const Step& step, ScoreValue& to);
   static void RunTextTree(const Step& step, ScoreValue& to);
   static void RunTextEncoding(const Step& step, ScoreValue& to);
   static void RunNextTextEncoding(const Step& step, ScoreValue& to);

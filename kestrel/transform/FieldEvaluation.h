@@ -61,8 +61,7 @@ class FieldEvaluation {
   /// The same for the one kind, of which the field must be: a normalised number, a bin.
   void ComputeNorm(const SourceField& source, ScoreValue& to) {
     if (source.IsNumber() && curve_.IsPlainAt(source.GetNumber())) {
-      const double number = curve_.ComputePlain(source.GetNumber());
-      static_cast<NumericValue&>(to).SetDoubleValue(NumberOrMissing(number));
+      static_cast<NumericValue&>(to).SetDoubleValue(curve_.ComputePlain(source.GetNumber()));
     } else {
       ComputeOtherNorm(source, to);
     }

@@ -35,6 +35,10 @@ NormCurve::NormCurve(const std::vector<double>& orig, const std::vector<double>&
   if (!has_range_ || !is_ascending_) return;
   inner_ = NumberSearch({orig.begin() + 1, orig.end() - 1});
   if (lines_.size() < 2 || lines_.size() + 1 != orig.size()) return;
+  const double farthest = std::max(std::fabs(lowest_), std::fabs(highest_));
+  for (const Line& line : lines_) {
+    if (!std::isfinite(farthest * std::fabs(line.slope) + std::fabs(line.intercept))) return;
+  }
   plain_lowest_ = lowest_;
   plain_highest_ = highest_;
 }

@@ -21,7 +21,7 @@ class NormCurve {
             ScoreDictVar::OutlierHandleMethod outliers);
 
   double Compute(double x) const { return IsPlainAt(x) ? ComputePlain(x) : ComputeOther(x); }
-  /// Whether there is but a line to be found, and the number on that line.
+  /// Whether there is but a line to be found, and the number on that line, which is finite.
   bool IsPlainAt(double x) const { return plain_lowest_ <= x && x <= plain_highest_; }
   double ComputePlain(double x) const { return lines_[inner_.FirstNotBelow(x)].At(x); }
 
@@ -48,7 +48,8 @@ class NormCurve {
   double lowest_ = 0.0;
   double highest_ = 0.0;
   NumberSearch inner_;  ///< of ascending points: all but the first and the last one
-  /// Where the points ascend and each two of them have a line; nowhere when there is no such place.
+  /// Where the points ascend, each two of them have a line and no line leaves the numbers; nowhere when there
+  /// is no such place.
   double plain_lowest_ = std::numeric_limits<double>::infinity();
   double plain_highest_ = -std::numeric_limits<double>::infinity();
   ScoreDictVar::OutlierHandleMethod outliers_;

@@ -51,6 +51,7 @@ SourceField::SourceField(const ScoreDictVar* variable)
 
 void SourceField::SetNew(const ScoreValue* value) {
   number_ = NumericValue::gSysmisValue;
+  operand_ = kMissingOperand;
   seconds_ = NumericValue::gSysmisValue;
   text_ = &EmptyText();
   kind_ = Kind::kNone;
@@ -87,6 +88,7 @@ void SourceField::SetOther(const ScoreValue& value) {
     default:
       break;
   }
+  operand_ = AsOperand(number_);
 }
 
 void SourceField::AskForMissing() {

@@ -4,6 +4,7 @@
 #define KESTREL_TRANSFORM_SOURCEFIELD_H
 
 #include <cstdint>
+#include <limits>
 #include <string>
 #include <typeinfo>
 
@@ -20,6 +21,13 @@ namespace MCKestrel_800 {
 double NumberIn(const std::string& text);
 /// The number of a value: the seconds of a date/time, of a text the number that it reads as.
 double NumberOf(const ScoreValue& value);
+
+/// A number as arithmetic takes it: NaN where it is missing, which goes from operands to results by itself.
+/// Minus infinity is missing, as it is wherever numbers are computed with.
+constexpr double kMissingOperand = std::numeric_limits<double>::quiet_NaN();
+inline double AsOperand(double number) {
+  return number > NumericValue::gSysmisValue ? number : kMissingOperand;
+}
 
 /// Looks at a value once for all derived fields that read it. The value and the variable must live as long as
 /// they are used here. The addresses of the views stay the same from case to case: what is computed from them
@@ -44,6 +52,7 @@ class SourceField {
       SetNew(value);
     } else if (kind_ == Kind::kNumber) {
       number_ = static_cast<const NumericValue*>(value)->NumericValue::GetDouble();
+      operand_ = AsOperand(number_);
       is_missing_ = number_ == missing_number_;
     } else {
       text_ = static_cast<const StringValue*>(value);
@@ -64,6 +73,8 @@ class SourceField {
 
   /// The number, or the seconds of a date/time; the system-missing value for everything else.
   const double& GetNumber() const { return number_; }
+  /// The number as an operand.
+  const double& GetOperand() const { return operand_; }
   /// The seconds of a date/time; the system-missing value for everything else.
   const double& GetSeconds() const { return seconds_; }
   /// The text; the empty one for everything else. Never null.
@@ -96,6 +107,7 @@ class SourceField {
   Kind kind_ = Kind::kNone;
   const ScoreValue* value_ = nullptr;
   double number_ = NumericValue::gSysmisValue;
+  double operand_ = kMissingOperand;
   double seconds_ = NumericValue::gSysmisValue;
   const StringValue* text_;
   mutable ValueKey key_;

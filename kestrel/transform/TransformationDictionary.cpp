@@ -87,7 +87,7 @@ void TransformationDictionary::SetUpDerivedCaseRecord() {
 }
 
 void TransformationDictionary::Reset() {
-  computed_.assign(derived_names_.size(), false);
+  computed_.assign(derived_names_.size(), 0);
 }
 
 void TransformationDictionary::SetWantedVars(const std::vector<std::string>& names) {
@@ -112,7 +112,7 @@ DerivationPlan& TransformationDictionary::PlanFor(const ScoreDictionary* diction
 
 void TransformationDictionary::ChooseOutputs() {
   std::vector<DerivationPlan::Output> outputs;
-  chosen_.assign(derived_names_.size(), false);
+  chosen_.assign(derived_names_.size(), 0);
   if (derived_record_ != nullptr) {
     const std::vector<ScoreValue*>& values = derived_record_->GetAllValues();
     for (const std::string& name : has_wanted_names_ ? wanted_names_ : derived_names_) {
@@ -123,7 +123,7 @@ void TransformationDictionary::ChooseOutputs() {
       // A host may have changed the type since the record was set up.
       if (value->GetType() != field->GetResultType()) continue;
       outputs.push_back({field, value});
-      chosen_[static_cast<std::size_t>(index)] = true;
+      chosen_[static_cast<std::size_t>(index)] = 1;
     }
   }
   plan_->Choose(outputs);
@@ -145,14 +145,14 @@ bool TransformationDictionary::IsVarValueComputed(const ScoreDictVar* var) const
   if (var == nullptr) return false;
   const int index = var->GetValueIndex();
   return index >= 0 && static_cast<std::size_t>(index) < computed_.size() &&
-         computed_[static_cast<std::size_t>(index)];
+         computed_[static_cast<std::size_t>(index)] != 0;
 }
 
 void TransformationDictionary::MarkComputed(const ScoreDictVar* var) {
   if (var == nullptr) return;
   const int index = var->GetValueIndex();
   if (index < 0 || static_cast<std::size_t>(index) >= computed_.size()) return;
-  computed_[static_cast<std::size_t>(index)] = true;
+  computed_[static_cast<std::size_t>(index)] = 1;
 }
 
 void TransformationDictionary::AddVarCaseValue(const ScoreDictVar* var, const std::string& name,

@@ -168,7 +168,8 @@ class KESTREL_API TransformationDictionary : public BaseDictionary {
 
   std::unique_ptr<CaseRecord> derived_record_;
   std::unique_ptr<CaseRecord> initial_record_;
-  std::vector<bool> computed_;
+  /// By position in the record. Bytes, because all are set for each case.
+  std::vector<unsigned char> computed_;
   std::vector<std::string> derived_names_;
   bool is_set_up_ = false;
 
@@ -176,7 +177,7 @@ class KESTREL_API TransformationDictionary : public BaseDictionary {
   bool has_wanted_names_ = false;
   /// How all the fields are computed with the data dictionary at hand; null until it is needed.
   std::unique_ptr<DerivationPlan> plan_;
-  std::vector<bool> chosen_;  ///< by position in the record: what the plan computes
+  std::vector<unsigned char> chosen_;  ///< by position in the record: what the plan computes
 };
 
 }  // namespace MCKestrel_800
