@@ -100,6 +100,7 @@
 #include "kestrel/translate/ScoreResultField.h"
 #include "kestrel/translate/ScoreSAX2Handlers.h"
 #include "kestrel/translate/ScoreTranslator.h"
+#include "kestrel/translate/VEXATranslator.h"
 #include "kestrel/translate/XmlText.h"
 
 #endif  // KESTREL_KESTREL_H
