@@ -1,10 +1,10 @@
 #include "apps/kestrel/TableWriter.h"
 
-#include <charconv>
 #include <cstring>
 
 #include "apps/kestrel/CsvWriter.h"
 #include "apps/kestrel/JsonLinesWriter.h"
+#include "kestrel/foundation/NumberText.h"
 
 namespace kestrel_program {
 
@@ -16,20 +16,9 @@ std::unique_ptr<TableWriter> TableWriter::Make(Format format, const std::vector<
   return std::make_unique<CsvWriter>(columns, out);
 }
 
-namespace {
-
-/// The longest is "-1.2345678901234567e-308".
-using NumberText = char[32];
-
-std::size_t WriteNumber(double number, NumberText& text) {
-  return static_cast<std::size_t>(std::to_chars(text, text + sizeof text, number).ptr - text);
-}
-
-}  // namespace
-
 void AppendNumber(double number, std::string& out) {
-  NumberText text;
-  out.append(text, WriteNumber(number, text));
+  char text[MCKestrel_800::kShortestRoom];
+  out.append(text, MCKestrel_800::FormatShortest(number, text));
 }
 
 std::string_view NumberTexts::Get(double number) {
@@ -39,7 +28,7 @@ std::string_view NumberTexts::Get(double number) {
   Entry& entry = entries_[(bits * 0x9E3779B97F4A7C15u) >> (64 - kIndexBits)];
   if (entry.bits != bits || entry.length == 0) {
     entry.bits = bits;
-    entry.length = WriteNumber(number, entry.text);
+    entry.length = MCKestrel_800::FormatShortest(number, entry.text);
   }
   return std::string_view(entry.text, entry.length);
 }

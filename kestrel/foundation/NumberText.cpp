@@ -106,4 +106,8 @@ std::string FormatSixDigits(double value) {
   return std::string(buffer, length);
 }
 
+size_t FormatShortest(double value, char (&buffer)[kShortestRoom]) {
+  return static_cast<size_t>(std::to_chars(buffer, buffer + kShortestRoom, value).ptr - buffer);
+}
+
 }  // namespace MCKestrel_800

@@ -36,6 +36,13 @@ constexpr size_t kSixDigitsRoom = 32;
 KESTREL_API size_t FormatSixDigits(double value, char (&buffer)[kSixDigitsRoom]);
 KESTREL_API std::string FormatSixDigits(double value);
 
+/// Room for every text that FormatShortest writes; the longest is "-1.2345678901234567e-308".
+constexpr size_t kShortestRoom = 32;
+
+/// Writes the number with as few digits as give back the same number when they are read. Returns the length;
+/// the text is not terminated.
+KESTREL_API size_t FormatShortest(double value, char (&buffer)[kShortestRoom]);
+
 }  // namespace MCKestrel_800
 
 #endif  // KESTREL_FOUNDATION_NUMBERTEXT_H

@@ -63,6 +63,7 @@ void ClsResult::Reset() {
   probability_ = 0.0;
   count_ = 0;
   entities_.Reset();
+  if (output_fields_.GetLayoutStamp() != 0) output_fields_.ClearValues();
 }
 
 void ClsResult::SetProbability(double probability) {
@@ -127,6 +128,7 @@ void RegResult::Reset() {
   probability_ = 0.0;
   standard_error_ = NumericValue::gSysmisValue;
   entities_.Reset();
+  if (output_fields_.GetLayoutStamp() != 0) output_fields_.ClearValues();
 }
 
 void RegResult::SetProbability(double probability) {
@@ -143,6 +145,17 @@ void RegResult::SetStandardError(double error) {
 }
 double RegResult::GetStandardError() const {
   return standard_error_;
+}
+
+// Found like ResultEntities::Of, for the same reason.
+ResultField* OutputFieldsOf(ScoreResult* result) {
+  if (result == nullptr) return nullptr;
+  const std::type_info* const type = &typeid(*result);
+  if (type == &typeid(ClsResult)) return &static_cast<ClsResult*>(result)->GetOutputFields();
+  if (type == &typeid(RegResult)) return &static_cast<RegResult*>(result)->GetOutputFields();
+  if (auto* classification = dynamic_cast<ClsResult*>(result)) return &classification->GetOutputFields();
+  if (auto* regression = dynamic_cast<RegResult*>(result)) return &regression->GetOutputFields();
+  return nullptr;
 }
 
 }  // namespace MCKestrel_800

@@ -16,6 +16,7 @@
 #include "kestrel/model/ScoreClsResult.h"
 #include "kestrel/model/ScoreRegResult.h"
 #include "kestrel/platform/Export.h"
+#include "kestrel/translate/ResultField.h"
 
 namespace MCKestrel_800 {
 
@@ -75,6 +76,10 @@ class KESTREL_API ClsResult : public ScoreClsResult {
   ResultEntities& GetEntities() { return entities_; }
   const ResultEntities& GetEntities() const { return entities_; }
 
+  /// The output fields that the model's document declares; none when it declares none. Belong to the result.
+  ResultField& GetOutputFields() { return output_fields_; }
+  const ResultField& GetOutputFields() const { return output_fields_; }
+
  private:
   struct Entry {
     ResultValue category;
@@ -88,6 +93,7 @@ class KESTREL_API ClsResult : public ScoreClsResult {
   std::vector<Entry> entries_;
   size_t count_ = 0;
   ResultEntities entities_;
+  ResultField output_fields_;
 };
 
 /// The outcome of a regression: kind 1.
@@ -117,13 +123,21 @@ class KESTREL_API RegResult : public ScoreRegResult {
   ResultEntities& GetEntities() { return entities_; }
   const ResultEntities& GetEntities() const { return entities_; }
 
+  /// The output fields that the model's document declares; none when it declares none. Belong to the result.
+  ResultField& GetOutputFields() { return output_fields_; }
+  const ResultField& GetOutputFields() const { return output_fields_; }
+
  private:
   ResultValue prediction_;
   bool has_prediction_ = false;
   double probability_ = 0.0;
   double standard_error_;
   ResultEntities entities_;
+  ResultField output_fields_;
 };
+
+/// The output fields of a result; null for null and for a result of a class that has none.
+KESTREL_API ResultField* OutputFieldsOf(ScoreResult* result);
 
 }  // namespace MCKestrel_800
 

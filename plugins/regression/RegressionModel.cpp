@@ -10,19 +10,12 @@
 #include "kestrel/translate/PMMLModelTags.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "plugins/regression/LinkFunctions.h"
-#include "plugins/support/ScoringStatus.h"
 
 namespace MCKestrel_800 {
 
-using MCScore::MCStatus;
-
-RegressionModel::RegressionModel(ModelDictionaries dictionaries, Definition definition,
-                                 const std::string& target)
-    : definition_(std::move(definition)) {
-  dictionaries.GiveTo(*this);
-  definition_.schema.SetRoles(*this);
-  if (!target.empty()) SetVarRole(target, kTarget);
-  if (definition_.is_classification) {
+RegressionModel::RegressionModel(ModelDictionaries dictionaries, ModelFrame frame, Definition definition)
+    : VectorModel(std::move(dictionaries), std::move(frame), inputs_), definition_(std::move(definition)) {
+  if (GetFrame().is_classification) {
     plan_ = std::make_unique<CategoryPlan>(definition_.normalization, definition_.tables, GetTargetVar());
     probabilities_.resize(plan_->GetCategories().size());
     CompileEquations(plan_->GetEquations());
@@ -43,34 +36,21 @@ void RegressionModel::CompileEquations(const std::vector<int>& tables) {
     equations_.emplace_back(table == CategoryPlan::kConstantZero ? constant_zero : definition_.tables[table],
                             inputs_);
   }
-  inputs_.Seal(definition_.schema, *GetDictionary(), GetTransformationDictionary());
+  inputs_.Seal(GetFrame().schema, *GetDictionary(), GetTransformationDictionary());
   for (RegressionEquation& equation : equations_)
     equation.Compile(inputs_);
   y_.resize(equations_.size());
 }
 
-MCStatus RegressionModel::Score(const ScoreCaseRecord* record, ScoreResult* result) {
-  if (record == nullptr || result == nullptr) return MCStatus(kNullArgumentStatus, false);
-  result->Reset();
-  const unsigned outcome = inputs_.Fill(*record);
-  if ((outcome & CaseVector::kInvalidInput) != 0) {
-    MCStatus status(kInvalidValueStatus, false);
-    status.SetDiscreteDatum(0, inputs_.GetInvalidField());
-    return status;
-  }
+bool RegressionModel::Predict(const double* values, unsigned outcome, ScoreResult& result) {
   // Every number among the inputs belongs to an equation that is evaluated, so one that is missing decides
   // the case.
-  if ((outcome & CaseVector::kMissingNumber) == 0 && Evaluate() &&
-      (definition_.is_classification ? Classify(*result) : Predict(*result))) {
-    return MCStatus();
-  }
-  if (GetMissingValuePolicy() == kDefaultPrediction) return HandleMissingValue(result);
-  return MCStatus(kNoPredictionStatus, false);
+  if ((outcome & CaseVector::kMissingNumber) != 0 || !Evaluate(values)) return false;
+  return plan_ != nullptr ? Classify(result) : PredictNumber(result);
 }
 
 // False when an equation has no finite value.
-bool RegressionModel::Evaluate() {
-  const double* values = inputs_.GetValues();
+bool RegressionModel::Evaluate(const double* values) {
   for (std::size_t j = 0; j < equations_.size(); ++j) {
     y_[j] = equations_[j].Evaluate(values);
     if (!std::isfinite(y_[j])) return false;
@@ -84,7 +64,7 @@ double RegressionModel::Normalize(double y) const {
   return LinkBelow(is_softmax ? Normalization::kLogit : definition_.normalization, y);
 }
 
-bool RegressionModel::Predict(ScoreResult& result) {
+bool RegressionModel::PredictNumber(ScoreResult& result) {
   const double prediction = definition_.normalization == Normalization::kNone ? y_[0] : Normalize(y_[0]);
   if (!std::isfinite(prediction)) return false;
   prediction_.SetDoubleValue(prediction);
@@ -110,21 +90,8 @@ bool RegressionModel::Classify(ScoreResult& result) {
   return true;
 }
 
-std::vector<const ScoreDictVar*> RegressionModel::GetPredictors() const {
-  return inputs_.GetPredictors();
-}
-
-ScoreResult* RegressionModel::MakeResult() const {
-  if (definition_.is_classification) return new ClsResult;
-  return new RegResult;
-}
-
 std::string RegressionModel::GetModelKind() const {
   return PMMLModelTags::XML_ELE_REGMODEL;
-}
-
-bool RegressionModel::SuppressCategoryProbabilities() const {
-  return false;
 }
 
 namespace {
@@ -152,7 +119,7 @@ void DisplayTerm(const RegressionTerm& term, std::ostream& out) {
 
 void RegressionModel::Display(std::ostream& out) const {
   out << "Start RegressionModel Display:\n";
-  out << "Function = " << (definition_.is_classification ? "classification" : "regression")
+  out << "Function = " << (GetFrame().is_classification ? "classification" : "regression")
       << "; Normalization = " << NormalizationText(definition_.normalization);
   if (!GetTargetName().empty()) out << "; Target = " << GetTargetName();
   out << "\n";

@@ -9,56 +9,45 @@
 #include <vector>
 
 #include "kestrel/foundation/NumericValue.h"
-#include "kestrel/model/BaseModel.h"
 #include "plugins/regression/CategoryPlan.h"
 #include "plugins/regression/Normalization.h"
 #include "plugins/regression/RegressionEquation.h"
 #include "plugins/regression/RegressionTable.h"
-#include "plugins/support/CaseVector.h"
-#include "plugins/support/MiningSchema.h"
-#include "plugins/support/ModelDictionaries.h"
+#include "plugins/support/VectorModel.h"
 
 namespace MCKestrel_800 {
 
-/// Scores cases by regression equations. Keeps nothing of the document. Serves one case at a time.
+/// Scores cases by regression equations; see VectorModel for what that comes to when data are missing or
+/// invalid.
 ///
-/// A case whose numbers are not all there has a missing result, which the missing-value policy settles: no
-/// prediction and the error status 90027, or the target's default. The same goes for an equation or a
-/// prediction that is not a finite number, and for equations that make no probabilities (see CategoryPlan). A
-/// missing category is no failure: it adds nothing. A value that
-/// the mining schema refuses gives the error status of ScoringStatus.h and no prediction.
-class RegressionModel : public BaseModel {
+/// A case whose numbers are not all there has a missing result. So has one of which an equation or the
+/// prediction is not a finite number, or of which the equations make no probabilities (see CategoryPlan). A
+/// missing category adds nothing and is no failure.
+class RegressionModel : public VectorModel {
  public:
   /// What a document says, in the model's own types.
   struct Definition {
-    bool is_classification = false;
     Normalization normalization = Normalization::kNone;
-    MiningSchema schema;
     std::vector<RegressionTable> tables;
   };
 
-  /// dictionaries  taken over, whatever happens; the definition's schema and tables speak of their variables.
-  /// target        the name of the variable that is predicted; empty for none.
-  /// Errors (KestrelException without place): those of CategoryPlan; code 5 for "simplemax" in a regression.
-  RegressionModel(ModelDictionaries dictionaries, Definition definition, const std::string& target);
+  /// dictionaries  taken over, whatever happens; the frame and the definition's tables speak of their
+  /// variables. Errors (KestrelException without place): those of CategoryPlan; code 5 for "simplemax" in a
+  /// regression.
+  RegressionModel(ModelDictionaries dictionaries, ModelFrame frame, Definition definition);
   ~RegressionModel() override;
 
-  MCScore::MCStatus Score(const ScoreCaseRecord* record, ScoreResult* result) override;
-  /// The data fields that the equations use, in the order in which the document first names them; those that
-  /// a derived field is computed from stand in its place.
-  std::vector<const ScoreDictVar*> GetPredictors() const override;
-  /// A RegResult or, for a classification, a ClsResult.
-  ScoreResult* MakeResult() const override;
   std::string GetModelKind() const override;
-  /// Always false.
-  bool SuppressCategoryProbabilities() const override;
   /// Opens with "Start RegressionModel Display:" and closes with "End of RegressionModel Display.".
   void Display(std::ostream& out) const override;
 
+ protected:
+  bool Predict(const double* values, unsigned outcome, ScoreResult& result) override;
+
  private:
   void CompileEquations(const std::vector<int>& tables);
-  bool Evaluate();
-  bool Predict(ScoreResult& result);
+  bool Evaluate(const double* values);
+  bool PredictNumber(ScoreResult& result);
   bool Classify(ScoreResult& result);
   double Normalize(double y) const;
 

@@ -49,13 +49,12 @@ std::unique_ptr<ScoreModel> RegressionTranslator::BuildModel(DOMElement* element
                                                              ModelDictionaries dictionaries) {
   ModelFrame frame = ReadFrame(element, dictionaries);
   RegressionModel::Definition definition;
-  definition.is_classification = frame.is_classification;
   definition.normalization = ReadNormalization(element);
-  definition.schema = std::move(frame.schema);
-  definition.tables = ReadTables(element, RegressionTableReader(definition.schema, frame.target_variable),
-                                 definition.is_classification);
+  definition.tables = ReadTables(element, RegressionTableReader(frame.schema, frame.target_variable),
+                                 frame.is_classification);
   try {
-    return std::make_unique<RegressionModel>(std::move(dictionaries), std::move(definition), frame.target);
+    return std::make_unique<RegressionModel>(std::move(dictionaries), std::move(frame),
+                                             std::move(definition));
   } catch (const KestrelException& fault) {
     FailAt(element, static_cast<KestrelException::ExceptionCode>(fault.GetErrorCode()),
            fault.GetErrorMessage());

@@ -7,41 +7,23 @@
 #include "kestrel/model/ResultEntities.h"
 #include "kestrel/model/Results.h"
 #include "kestrel/translate/PMMLModelTags.h"
-#include "plugins/support/ScoringStatus.h"
 
 namespace MCKestrel_800 {
 
-using MCScore::MCStatus;
-
-RuleSetModel::RuleSetModel(ModelDictionaries dictionaries, Definition definition)
-    : definition_(std::move(definition)),
+RuleSetModel::RuleSetModel(ModelDictionaries dictionaries, ModelFrame frame, Definition definition)
+    : VectorModel(std::move(dictionaries), std::move(frame), *definition.inputs),
+      definition_(std::move(definition)),
       rule_set_(*definition_.rule_set),
       selector_(rule_set_.selection, rule_set_.rules, static_cast<std::size_t>(rule_set_.scores.GetCount())) {
-  dictionaries.GiveTo(*this);
-  definition_.frame.schema.SetRoles(*this);
-  if (!definition_.frame.target.empty()) SetVarRole(definition_.frame.target, kTarget);
-  if (definition_.frame.is_classification) {
+  if (GetFrame().is_classification) {
     probabilities_.resize(static_cast<std::size_t>(rule_set_.scores.GetCount()));
   }
 }
 
 RuleSetModel::~RuleSetModel() = default;
 
-MCStatus RuleSetModel::Score(const ScoreCaseRecord* record, ScoreResult* result) {
-  if (record == nullptr || result == nullptr) return MCStatus(kNullArgumentStatus, false);
-  result->Reset();
-  if ((definition_.inputs->Fill(*record) & CaseVector::kInvalidInput) != 0) {
-    MCStatus status(kInvalidValueStatus, false);
-    status.SetDiscreteDatum(0, definition_.inputs->GetInvalidField());
-    return status;
-  }
-  if (Decide(definition_.inputs->GetValues(), *result)) return MCStatus();
-  if (GetMissingValuePolicy() == kDefaultPrediction) return HandleMissingValue(result);
-  return MCStatus(kNoPredictionStatus, false);
-}
-
 // False when no rule fires and there is no default score.
-bool RuleSetModel::Decide(const double* values, ScoreResult& result) {
+bool RuleSetModel::Predict(const double* values, unsigned, ScoreResult& result) {
   RuleSelector::Choice choice = selector_.Choose(values);
   if (choice.rule == RuleTable::kNone) {
     if (rule_set_.default_score == RuleTable::kNone) return false;
@@ -52,7 +34,7 @@ bool RuleSetModel::Decide(const double* values, ScoreResult& result) {
   if (!NumericValue::IsSystemMissingValue(choice.confidence)) result.SetProbability(choice.confidence);
   ResultEntities* const entities = ResultEntities::Of(&result);
   if (entities != nullptr && entities->IsDecidingIdWanted()) TellRules(choice, values, *entities);
-  if (definition_.frame.is_classification) TellCategories(choice, result);
+  if (GetFrame().is_classification) TellCategories(choice, result);
   return true;
 }
 
@@ -93,26 +75,17 @@ bool RuleSetModel::FindProbabilities(const RuleSelector::Choice& choice) {
   return true;
 }
 
-std::vector<const ScoreDictVar*> RuleSetModel::GetPredictors() const {
-  return definition_.inputs->GetPredictors();
-}
-
-ScoreResult* RuleSetModel::MakeResult() const {
-  if (definition_.frame.is_classification) return new ClsResult;
-  return new RegResult;
+bool RuleSetModel::DecidesByRules() const {
+  return true;
 }
 
 std::string RuleSetModel::GetModelKind() const {
   return PMMLModelTags::XML_ELE_RULESETMODEL;
 }
 
-bool RuleSetModel::SuppressCategoryProbabilities() const {
-  return false;
-}
-
 void RuleSetModel::Display(std::ostream& out) const {
   out << "Start RuleSetModel Display:\n";
-  out << "Function = " << (definition_.frame.is_classification ? "classification" : "regression")
+  out << "Function = " << (GetFrame().is_classification ? "classification" : "regression")
       << "; Criterion = " << RuleSelectionText(rule_set_.selection);
   if (!GetTargetName().empty()) out << "; Target = " << GetTargetName();
   out << "\n";

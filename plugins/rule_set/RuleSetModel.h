@@ -7,24 +7,21 @@
 #include <string>
 #include <vector>
 
-#include "kestrel/model/BaseModel.h"
 #include "plugins/rule_set/RuleSelector.h"
 #include "plugins/rule_set/RuleSet.h"
 #include "plugins/support/CaseVector.h"
-#include "plugins/support/ModelTranslator.h"
+#include "plugins/support/VectorModel.h"
 
 namespace MCKestrel_800 {
 
 class ResultEntities;
 
-/// Scores cases by rules. Keeps nothing of the document. Serves one case at a time.
+/// Scores cases by rules; see VectorModel for what that comes to when data are missing or invalid.
 ///
 /// RuleSelector says which rule decides; its score is the prediction and its confidence the prediction's
 /// probability. When no rule fires, the default score is predicted with the default confidence (a probability
-/// of 0 where the document gives none). Without a default score the missing-value policy settles the case: no
-/// prediction and the error status 90027, or the target's default. A missing value is no failure: the
-/// predicates that it leaves unknown do not fire. A value that the mining schema refuses gives the error
-/// status of ScoringStatus.h and no prediction.
+/// of 0 where the document gives none). Without a default score there is no prediction. A missing value is no
+/// failure: the predicates that it leaves unknown do not fire.
 ///
 /// The probabilities of a classification's categories are the shares of all weights by the criterion
 /// weightedSum, and by the others the distribution that the deciding rule, or for the default score the rule
@@ -33,34 +30,28 @@ class ResultEntities;
 ///
 /// The result's deciding entity, when wanted, is the rule; the default score has none. Its path, when wanted,
 /// are all rules that fire, also those that the criterion does not look at.
-class RuleSetModel : public BaseModel {
+class RuleSetModel : public VectorModel {
  public:
   /// What a document says, compiled.
   struct Definition {
-    ModelFrame frame;
     std::unique_ptr<CaseVector> inputs;  ///< sealed
     std::unique_ptr<RuleSet> rule_set;
   };
 
-  /// dictionaries  taken over, whatever happens; the definition speaks of their variables.
-  RuleSetModel(ModelDictionaries dictionaries, Definition definition);
+  /// dictionaries  taken over, whatever happens; frame and definition speak of their variables.
+  RuleSetModel(ModelDictionaries dictionaries, ModelFrame frame, Definition definition);
   ~RuleSetModel() override;
 
-  MCScore::MCStatus Score(const ScoreCaseRecord* record, ScoreResult* result) override;
-  /// The data fields that the predicates use, in the order in which the document first names them; those that
-  /// a derived field is computed from stand in its place.
-  std::vector<const ScoreDictVar*> GetPredictors() const override;
-  /// A RegResult or, for a classification, a ClsResult.
-  ScoreResult* MakeResult() const override;
   std::string GetModelKind() const override;
-  /// Always false.
-  bool SuppressCategoryProbabilities() const override;
   /// Opens with "Start RuleSetModel Display:" and closes with "End of RuleSetModel Display.". A rule is told
   /// without its predicate.
   void Display(std::ostream& out) const override;
 
+ protected:
+  bool Predict(const double* values, unsigned outcome, ScoreResult& result) override;
+  bool DecidesByRules() const override;
+
  private:
-  bool Decide(const double* values, ScoreResult& result);
   void TellRules(const RuleSelector::Choice& choice, const double* values, ResultEntities& entities) const;
   bool FindProbabilities(const RuleSelector::Choice& choice);
   void TellCategories(const RuleSelector::Choice& choice, ScoreResult& result);

@@ -14,9 +14,8 @@ RuleSetTranslator::RuleSetTranslator() : ModelTranslator(PMMLModelTags::XML_ELE_
 
 std::unique_ptr<ScoreModel> RuleSetTranslator::BuildModel(xercesc::DOMElement* element,
                                                           ModelDictionaries dictionaries) {
+  ModelFrame frame = ReadFrame(element, dictionaries);
   RuleSetModel::Definition definition;
-  definition.frame = ReadFrame(element, dictionaries);
-  const ModelFrame& frame = definition.frame;
   definition.inputs = std::make_unique<CaseVector>();
   definition.rule_set = std::make_unique<RuleSet>(frame.is_classification, frame.target_variable);
   PredicateInputs inputs(frame.schema, dictionaries, *definition.inputs);
@@ -24,7 +23,7 @@ std::unique_ptr<ScoreModel> RuleSetTranslator::BuildModel(xercesc::DOMElement* e
   reader.Read(
       static_cast<xercesc::DOMElement*>(GetChildByTagForced(element, PMMLModelTags::XML_ELE_RULESET)));
   definition.inputs->Seal(frame.schema, *dictionaries.data, dictionaries.derived.get());
-  return std::make_unique<RuleSetModel>(std::move(dictionaries), std::move(definition));
+  return std::make_unique<RuleSetModel>(std::move(dictionaries), std::move(frame), std::move(definition));
 }
 
 }  // namespace MCKestrel_800

@@ -16,11 +16,14 @@ struct ModelDictionaries {
   std::unique_ptr<ScoreDictionary> data;
   /// The derived fields, which refer to variables of `data`; null when there are none.
   std::unique_ptr<TransformationDictionary> derived;
+  /// The output fields; null when there are none.
+  std::unique_ptr<ScoreDictionary> results;
 
-  /// Hands both over.
+  /// Hands all over.
   void GiveTo(ScoreModel& model) {
     model.SetScoreDictionary(data.release());
     model.SetTransformationScoreDictionary(derived.release());
+    model.SetResultScoreDictionary(results.release());
   }
 };
 

@@ -83,7 +83,9 @@ ScoreModel* ModelTranslator::ParseFromTree(DOMElement* modelElement, ScoreDictio
   ModelDictionaries dictionaries;
   dictionaries.data.reset(dictionary->Clone());
   std::unique_ptr<ScoreModel> model = BuildModel(modelElement, std::move(dictionaries));
-  if (resultDictionary != nullptr) model->SetResultScoreDictionary(resultDictionary->Clone());
+  if (resultDictionary != nullptr && model->GetResultDictionary() == nullptr) {
+    model->SetResultScoreDictionary(resultDictionary->Clone());
+  }
   return model.release();
 }
 
@@ -97,6 +99,7 @@ ModelFrame ModelTranslator::ReadFrame(DOMElement* element, ModelDictionaries& di
   ScoreDictionary& dictionary = *dictionaries.data;
   frame.schema = MiningSchema::Read(RequiredChild(element, PMMLModelTags::XML_ELE_MININGSCHEMA), &dictionary,
                                     dictionaries.derived.get());
+  HandleTargets(FirstChild(element, Tags::XML_ELE_TARGETS), &dictionary);
   // Behind the schema, because its optypes count for them.
   ReadDerivedFields(FirstChild(element, Tags::XML_ELE_LOCALTRANSFORMATIONS), dictionaries);
   if (dictionaries.derived != nullptr) {
@@ -109,6 +112,8 @@ ModelFrame ModelTranslator::ReadFrame(DOMElement* element, ModelDictionaries& di
       frame.target_variable->GetVarType() == ScoreDictVar::STRING_VAR) {
     FailOnField(element, KestrelException::kInvalidType, frame.target, ": Invalid Variable Type");
   }
+  frame.outputs =
+      OutputFields::Read(element, frame.target_variable, frame.is_classification, dictionaries.results);
   return frame;
 }
 

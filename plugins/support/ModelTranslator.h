@@ -7,31 +7,21 @@
 #include <string>
 
 #include "kestrel/translate/PMMLTranslator.h"
-#include "plugins/support/MiningSchema.h"
 #include "plugins/support/ModelDictionaries.h"
+#include "plugins/support/ModelFrame.h"
 
 namespace MCKestrel_800 {
 
-class ScoreDictVar;
 class ScoreModel;
-
-/// What the attributes and the mining schema of a model element say, whatever its kind.
-struct ModelFrame {
-  bool is_classification = false;
-  MiningSchema schema;
-  /// The name of the field that is predicted; empty when the document names none.
-  std::string target;
-  /// The variable of that name; null when there is none.
-  const ScoreDictVar* target_variable = nullptr;
-};
 
 /// Reads `DataDictionary`, `TransformationDictionary` and a model element and leaves the model itself to the
 /// derived class. The model's derived fields are those of the document and those of its own
 /// `LocalTransformations`, which may read the former; of a name there is one. Fields of the mining schema are
-/// data fields and derived fields of the document. `modelName` and `algorithmName` play no part.
+/// data fields and derived fields of the document. The model's `Targets` change its dictionary before
+/// anything else of the model is read. `modelName` and `algorithmName` play no part.
 ///
 /// Errors, all KestrelException with the place in the document where it is known, beside those of the readers
-/// of dictionary, derived fields and mining schema:
+/// of dictionary, derived fields, mining schema, targets and output fields:
 ///   code 1   no `DataDictionary`, several targets without a choice;
 ///   code 4   no model element as a child of the root, no `MiningSchema`, no `functionName`;
 ///   code 5   another function than regression and classification, a model marked as not scorable;
@@ -49,8 +39,8 @@ class ModelTranslator : public PMMLTranslator {
   ScoreModel* ParseFromTree(xercesc::DOMElement* root, const std::string& arg) override;
 
   /// Builds the model of one element with a dictionary at hand. The model gets copies of the dictionaries;
-  /// the result dictionary may be null. Its derived fields are those of the element. Returns a new model that
-  /// the caller deletes.
+  /// the result dictionary may be null, and is left alone when the element has an `Output` of its own. Its
+  /// derived fields are those of the element. Returns a new model that the caller deletes.
   ScoreModel* ParseFromTree(xercesc::DOMElement* modelElement, ScoreDictionary* dictionary,
                             ScoreDictionary* resultDictionary, const std::string& arg) override;
 

@@ -10,62 +10,31 @@
 #include "kestrel/model/ResultEntities.h"
 #include "kestrel/model/Results.h"
 #include "kestrel/translate/PMMLModelTags.h"
-#include "plugins/support/ScoringStatus.h"
 
 namespace MCKestrel_800 {
 
-using MCScore::MCStatus;
-
-TreeModel::TreeModel(ModelDictionaries dictionaries, MiningSchema schema, const std::string& target,
-                     std::unique_ptr<Tree> tree)
-    : schema_(std::move(schema)), tree_(std::move(tree)), walker_(*tree_) {
-  dictionaries.GiveTo(*this);
-  schema_.SetRoles(*this);
-  if (!target.empty()) SetVarRole(target, kTarget);
-}
+TreeModel::TreeModel(ModelDictionaries dictionaries, ModelFrame frame, std::unique_ptr<Tree> tree)
+    : VectorModel(std::move(dictionaries), std::move(frame), tree->inputs),
+      tree_(std::move(tree)),
+      walker_(*tree_) {}
 
 TreeModel::~TreeModel() = default;
 
-MCStatus TreeModel::Score(const ScoreCaseRecord* record, ScoreResult* result) {
-  if (record == nullptr || result == nullptr) return MCStatus(kNullArgumentStatus, false);
-  if ((tree_->inputs.Fill(*record) & CaseVector::kInvalidInput) != 0) {
-    result->Reset();
-    MCStatus status(kInvalidValueStatus, false);
-    status.SetDiscreteDatum(0, tree_->inputs.GetInvalidField());
-    return status;
-  }
-  return ScoreVector(tree_->inputs.GetValues(), result);
+MCScore::MCStatus TreeModel::ScoreVector(const double* values, ScoreResult* result) {
+  return ScoreInputs(values, CaseVector::kComplete, nullptr, *result);
 }
 
-MCStatus TreeModel::ScoreVector(const double* values, ScoreResult* result) {
-  return !tree_->options.is_classification && &typeid(*result) == &typeid(RegResult)
-             ? ScoreNumber(values, static_cast<RegResult&>(*result))
-             : ScoreAny(values, *result);
-}
-
-// Most cases of most trees: a number at a leaf, into a result of the class that MakeResult gives.
-MCStatus TreeModel::ScoreNumber(const double* values, RegResult& result) {
-  if (result.GetEntities().IsDecidingIdWanted()) return ScoreAny(values, result);
-  result.RegResult::Reset();
-  if (walker_.Walk(values) != TreeWalker::End::kNode) return ScoreAny(values, result);
-  result.SetNumber(tree_->scores.GetNumber(walker_.GetNode()));
-  return MCStatus();
-}
-
-MCStatus TreeModel::ScoreAny(const double* values, ScoreResult& result) {
-  result.Reset();
+bool TreeModel::Predict(const double* values, unsigned, ScoreResult& result) {
   switch (Walk(values, result)) {
     case TreeWalker::End::kNode:
-      Predict(result);
-      return MCStatus();
+      PredictByNode(result);
+      return true;
     case TreeWalker::End::kSeveral:
       PredictTogether(result);
-      return MCStatus();
+      return true;
     default:
-      break;
+      return false;
   }
-  if (GetMissingValuePolicy() == kDefaultPrediction) return HandleMissingValue(&result);
-  return MCStatus(kNoPredictionStatus, false);
 }
 
 TreeWalker::End TreeModel::Walk(const double* values, ScoreResult& result) {
@@ -100,10 +69,14 @@ double TreeModel::Penalize(double confidence) const {
   return confidence;
 }
 
-void TreeModel::Predict(ScoreResult& result) {
+void TreeModel::PredictByNode(ScoreResult& result) {
   const NodeScores& scores = tree_->scores;
   const int node = walker_.GetNode();
   if (!tree_->options.is_classification) {
+    // Most cases of most trees: a number at a leaf, into a result of the class that MakeResult gives.
+    if (&typeid(result) == &typeid(RegResult)) {
+      return static_cast<RegResult&>(result).SetNumber(scores.GetNumber(node));
+    }
     prediction_.SetDoubleValue(scores.GetNumber(node));
     result.SetPrediction(&prediction_);
     return;
@@ -147,21 +120,8 @@ void TreeModel::PredictTogether(ScoreResult& result) {
   }
 }
 
-std::vector<const ScoreDictVar*> TreeModel::GetPredictors() const {
-  return tree_->inputs.GetPredictors();
-}
-
-ScoreResult* TreeModel::MakeResult() const {
-  if (tree_->options.is_classification) return new ClsResult;
-  return new RegResult;
-}
-
 std::string TreeModel::GetModelKind() const {
   return PMMLModelTags::XML_ELE_TREEMODEL;
-}
-
-bool TreeModel::SuppressCategoryProbabilities() const {
-  return false;
 }
 
 void TreeModel::Display(std::ostream& out) const {

@@ -26,8 +26,7 @@ std::unique_ptr<ScoreModel> TreeTranslator::BuildModel(xercesc::DOMElement* elem
   NodeReader(inputs, *tree).Read(root);
   tree->inputs.Seal(frame.schema, *dictionaries.data, dictionaries.derived.get());
   tree->table.Seal(tree->inputs);
-  return std::make_unique<TreeModel>(std::move(dictionaries), std::move(frame.schema), frame.target,
-                                     std::move(tree));
+  return std::make_unique<TreeModel>(std::move(dictionaries), std::move(frame), std::move(tree));
 }
 
 }  // namespace MCKestrel_800

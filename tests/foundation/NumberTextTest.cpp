@@ -232,5 +232,25 @@ TEST(NumberText, WritesSixDigitsAsAStreamDoes) {
   }
 }
 
+TEST(NumberText, TheShortestTextGivesTheNumberBack) {
+  struct ShortestRow {
+    double number;
+    const char* want;
+  };
+  constexpr ShortestRow kShortest[] = {
+      {0.0, "0"},         {-0.0, "-0"},
+      {0.1, "0.1"},       {1.0 / 3.0, "0.3333333333333333"},
+      {100.0, "100"},     {1e22, "1e+22"},
+      {5e-324, "5e-324"}, {-1.2345678901234567e-308, "-1.2345678901234567e-308"}};
+  for (const ShortestRow& row : kShortest) {
+    char room[kShortestRoom];
+    const std::string text(room, FormatShortest(row.number, room));
+    EXPECT_EQ(text, row.want);
+    double back = 1.0;
+    ASSERT_TRUE(ParseDouble(text.data(), text.data() + text.size(), back));
+    EXPECT_EQ(back, row.number);
+  }
+}
+
 }  // namespace
 }  // namespace MCKestrel_800

@@ -235,4 +235,25 @@ TEST(ClsResult, GivesMissingValuesBackAsMissing) {
   EXPECT_EQ(result.GetCategoryProbability(&missing), 0.5);
 }
 
+TYPED_TEST(AnyResult, HoldsOutputFieldsThatResetLeavesWithoutValues) {
+  ResultField& outputs = this->result_.GetOutputFields();
+  EXPECT_EQ(outputs.GetResultSize(), 0u);
+  outputs.SetResultValue("number", 2.5);
+  outputs.SetResultValue("text", std::string("b"));
+  EXPECT_EQ(OutputFieldsOf(&this->result_), &outputs);
+  this->result_.Reset();
+  EXPECT_TRUE(outputs.GetResultValue("number")->IsSystemMissingValue());
+  EXPECT_EQ(outputs.GetResultValue("text")->GetString(), "");
+}
+
+TEST(OutputFieldsOf, KnowsTheLibrarysResultsAndWhatDerivesFromThem) {
+  class OwnCls : public ClsResult {};
+  class OwnReg : public RegResult {};
+  OwnCls classification;
+  OwnReg regression;
+  EXPECT_EQ(OutputFieldsOf(&classification), &classification.GetOutputFields());
+  EXPECT_EQ(OutputFieldsOf(&regression), &regression.GetOutputFields());
+  EXPECT_EQ(OutputFieldsOf(nullptr), nullptr);
+}
+
 }  // namespace

@@ -1,0 +1,89 @@
+#include "plugins/support/VectorModel.h"
+
+#include <utility>
+
+#include "kestrel/model/ResultEntities.h"
+#include "kestrel/model/Results.h"
+#include "plugins/support/ScoringStatus.h"
+
+namespace MCKestrel_800 {
+
+using MCScore::MCStatus;
+
+VectorModel::VectorModel(ModelDictionaries dictionaries, ModelFrame frame, CaseVector& inputs)
+    : frame_(std::move(frame)), inputs_(inputs) {
+  dictionaries.GiveTo(*this);
+  frame_.schema.SetRoles(*this);
+  if (!frame_.target.empty()) SetVarRole(frame_.target, kTarget);
+}
+
+VectorModel::~VectorModel() = default;
+
+MCStatus VectorModel::Score(const ScoreCaseRecord* record, ScoreResult* result) {
+  if (record == nullptr || result == nullptr) return MCStatus(kNullArgumentStatus, false);
+  const unsigned outcome = inputs_.Fill(*record);
+  if ((outcome & CaseVector::kInvalidInput) != 0) return RefuseCase(*record, *result);
+  return ScoreInputs(inputs_.GetValues(), outcome, record, *result);
+}
+
+MCStatus VectorModel::ScoreInputs(const double* values, unsigned outcome, const ScoreCaseRecord* record,
+                                  ScoreResult& result) {
+  ScoredCase scored;
+  if (frame_.outputs.IsEmpty()) return Answer(values, outcome, result, scored);
+  if (frame_.outputs.TellEntities()) {
+    if (ResultEntities* entities = ResultEntities::Of(&result)) entities->SetDecidingIdWanted(true);
+  }
+  scored.record = record;
+  scored.is_decided_by_rule = DecidesByRules();
+  const MCStatus status = Answer(values, outcome, result, scored);
+  frame_.outputs.Write(scored, result);
+  return status;
+}
+
+MCStatus VectorModel::Answer(const double* values, unsigned outcome, ScoreResult& result,
+                             ScoredCase& scored) {
+  result.Reset();
+  if (Predict(values, outcome, result)) return MCStatus();
+  scored.basis = ScoredCase::Basis::kNothing;
+  if (GetMissingValuePolicy() != kDefaultPrediction) return MCStatus(kNoPredictionStatus, false);
+  const MCStatus status = HandleMissingValue(&result);
+  if (!status.IsError() && result.GetPrediction() != nullptr) scored.basis = ScoredCase::Basis::kDefault;
+  return status;
+}
+
+MCStatus VectorModel::RefuseCase(const ScoreCaseRecord& record, ScoreResult& result) {
+  result.Reset();
+  const int field = inputs_.GetInvalidField();
+  MCStatus status(kInvalidValueStatus, false);
+  status.SetDiscreteDatum(0, field);
+  if (!frame_.outputs.IsEmpty()) {
+    ScoredCase scored;
+    scored.record = &record;
+    scored.basis = ScoredCase::Basis::kRefused;
+    const std::vector<const ScoreDictVar*> predictors = inputs_.GetPredictors();
+    if (static_cast<std::size_t>(field) < predictors.size()) {
+      scored.refused_field = predictors[static_cast<std::size_t>(field)];
+    }
+    frame_.outputs.Write(scored, result);
+  }
+  return status;
+}
+
+std::vector<const ScoreDictVar*> VectorModel::GetPredictors() const {
+  return inputs_.GetPredictors();
+}
+
+ScoreResult* VectorModel::MakeResult() const {
+  if (frame_.is_classification) return new ClsResult;
+  return new RegResult;
+}
+
+bool VectorModel::SuppressCategoryProbabilities() const {
+  return false;
+}
+
+bool VectorModel::DecidesByRules() const {
+  return false;
+}
+
+}  // namespace MCKestrel_800
