@@ -326,9 +326,9 @@ const double* ApplyCompiler::Choose(Node node, const double* (ApplyCompiler::*la
   copy((this->*lay_out)(ChildOf(node, 1)));
   const std::size_t jump = program_.code_.size();
   Emit(ApplySteps::Skip);
-  program_.code_[test].skip = jump - test;
+  program_.code_[test].skip = static_cast<std::uint32_t>(jump - test);
   copy((this->*lay_out)(ChildOf(node, 2)));
-  program_.code_[jump].skip = program_.code_.size() - jump - 1;
+  program_.code_[jump].skip = static_cast<std::uint32_t>(program_.code_.size() - jump - 1);
   return out;
 }
 
@@ -434,9 +434,9 @@ ApplyText ApplyCompiler::TextOfIf(Node node) {
   copy(Text(ChildOf(node, 1)));
   const std::size_t jump = program_.code_.size();
   Emit(ApplySteps::Skip);
-  program_.code_[test].skip = jump - test;
+  program_.code_[test].skip = static_cast<std::uint32_t>(jump - test);
   copy(Text(ChildOf(node, 2)));
-  program_.code_[jump].skip = program_.code_.size() - jump - 1;
+  program_.code_[jump].skip = static_cast<std::uint32_t>(program_.code_.size() - jump - 1);
   return out;
 }
 

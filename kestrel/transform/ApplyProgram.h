@@ -3,7 +3,7 @@
 #ifndef KESTREL_TRANSFORM_APPLYPROGRAM_H
 #define KESTREL_TRANSFORM_APPLYPROGRAM_H
 
-#include <cstddef>
+#include <cstdint>
 #include <forward_list>
 #include <functional>
 #include <string>
@@ -30,7 +30,7 @@ struct ApplyInstruction {
   double* out = nullptr;
   ApplyDetail* detail = nullptr;  ///< what steps on texts, lists and fields need beside that
   TransformFunction function = kNoFunction;
-  std::size_t skip = 0;  ///< for jumps: how many behind it are left out
+  std::uint32_t skip = 0;  ///< for jumps: how many behind it are left out
 };
 
 /// A text that a step reads: a place that holds the address of the text.

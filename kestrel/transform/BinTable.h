@@ -52,10 +52,11 @@ class BinTable {
   void MakeCores();
   std::size_t Walk(double number) const;
 
-  const std::vector<TransformVar::Bin>& bins_;
-  std::vector<Reach> reaches_;  ///< ascending at both ends; empty when the bins are no such list
-  NumberSearch highs_;          ///< of the reaches
+  // First what every case needs.
   std::vector<Core> cores_;     ///< of the reaches, and behind them one that holds nothing
+  NumberSearch highs_;          ///< of the reaches
+  std::vector<Reach> reaches_;  ///< ascending at both ends; empty when the bins are no such list
+  const std::vector<TransformVar::Bin>& bins_;
 };
 
 }  // namespace MCKestrel_800

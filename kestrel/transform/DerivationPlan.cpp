@@ -107,7 +107,7 @@ void DerivationPlan::AddReads(int number) {
     if (field.GetRoot() != nullptr) reads = AddTreeReads(*field.GetRoot());
   } else if (!field.GetFieldName().empty()) {
     reads.push_back(AddSource(field.GetFieldName(), nullptr));
-    steps_[number].source = sources_[reads.front()].field.get();
+    steps_[number].task.source = sources_[reads.front()].field.get();
   }
   steps_[number].reads = std::move(reads);
 }
@@ -146,7 +146,7 @@ void DerivationPlan::Order() {
     int& step = sources_[source].step;
     if (step == kNone) continue;
     step = new_number[step];
-    steps_[step].as_source = &sources_[source];
+    steps_[step].task.as_source = &sources_[source];
   }
 }
 
@@ -156,31 +156,32 @@ void DerivationPlan::Prepare() {
   };
   GiveCodes();
   for (Step& step : steps_) {
-    step.evaluation = &step.field->Evaluation();
-    if (step.source == nullptr) step.source = &nothing_;
+    step.task.evaluation = &step.field->Evaluation();
+    if (step.task.source == nullptr) step.task.source = &nothing_;
     PrepareStep(step, find);
   }
 }
 
 // The commonest expressions are called without asking again what they are.
 void DerivationPlan::PrepareStep(Step& step, const ApplyProgram::FindSource& find) {
-  const FieldEvaluation::Storage storage = step.evaluation->GetStorage();
+  const FieldEvaluation::Storage storage = step.task.evaluation->GetStorage();
   const TransExpression kind = step.field->GetTransExpression();
-  step.run = RunOther;
+  step.task.run = RunOther;
   if (step.is_circular) {
-    step.run = RunCircular;
+    step.task.run = RunCircular;
   } else if (kind == TransExpression::kNormContinuous && storage == FieldEvaluation::Storage::kNumber) {
-    step.run = RunNorm;
+    step.task.run = RunNorm;
   } else if (kind == TransExpression::kDiscretize) {
-    step.run = RunBin;
+    step.task.run = RunBin;
   } else if (kind == TransExpression::kMapValues || kind == TransExpression::kNormDiscrete) {
     UseCodes(step);
   } else if (kind == TransExpression::kApply && step.field->GetRoot() != nullptr) {
     const bool is_text = storage == FieldEvaluation::Storage::kText;
     step.program = std::make_unique<ApplyProgram>(*step.field->GetRoot(), is_text, find);
-    step.run = is_text                                        ? RunTextTree
-               : storage == FieldEvaluation::Storage::kNumber ? RunNumberTree
-                                                              : RunDateTree;
+    step.task.program = step.program.get();
+    step.task.run = is_text                                        ? RunTextTree
+                    : storage == FieldEvaluation::Storage::kNumber ? RunNumberTree
+                                                                   : RunDateTree;
   }
 }
 
@@ -201,7 +202,7 @@ void DerivationPlan::UseCodes(Step& step) {
   // A table without rows has none.
   if (step.reads.size() != 1 || sources_[step.reads.front()].codes == nullptr) return;
   const TextCodes& codes = *sources_[step.reads.front()].codes;
-  const EncodingTable& encodings = step.evaluation->GetEncodings();
+  const EncodingTable& encodings = step.task.evaluation->GetEncodings();
   const std::vector<const StringValue*> texts = encodings.GetTexts();
   if (texts.empty() || !encodings.ListsTexts() || codes.GetSize() > kCodesPerRow * texts.size()) return;
   step.row_of_code.assign(codes.GetSize() + 1, kNoRow);
@@ -209,7 +210,8 @@ void DerivationPlan::UseCodes(Step& step) {
     std::uint32_t& row = step.row_of_code[PlaceOfCode(codes.Find(text->GetText()))];
     if (row == kNoRow) row = static_cast<std::uint32_t>(encodings.FindText(*text));
   }
-  step.run = RunTextEncoding;
+  step.task.row_of_code = step.row_of_code.data();
+  step.task.run = RunTextEncoding;
 }
 
 void DerivationPlan::Choose(const std::vector<Output>& outputs) {
@@ -228,7 +230,7 @@ void DerivationPlan::FillWork(const std::vector<Output>& outputs, Work& work) {
   is_needed_.assign(steps_.size(), false);
   is_read_.assign(sources_.size(), false);
   places_.assign(steps_.size(), nullptr);
-  work.items.clear();
+  work.tasks.clear();
   work.sources.clear();
   for (const Output& output : outputs) {
     const auto found = step_numbers_.find(output.field);
@@ -239,18 +241,21 @@ void DerivationPlan::FillWork(const std::vector<Output>& outputs, Work& work) {
   for (std::size_t number = steps_.size(); number-- > 0;) {
     if (!is_needed_[number]) continue;
     const Step& step = steps_[number];
-    ScoreValue* const to = places_[number] != nullptr ? places_[number] : &step.evaluation->GetOwnResult();
-    if (step.as_source != nullptr && is_read_[static_cast<std::size_t>(step.as_source - sources_.data())]) {
-      work.items.push_back({ShowResult, &step, to});
+    Task task = step.task;
+    task.to = places_[number] != nullptr ? places_[number] : &task.evaluation->GetOwnResult();
+    const Source* const as_source = task.as_source;
+    if (as_source != nullptr && is_read_[static_cast<std::size_t>(as_source - sources_.data())]) {
+      work.tasks.push_back(task);
+      work.tasks.back().run = ShowResult;
     }
-    work.items.push_back({step.run, &step, to});
+    work.tasks.push_back(task);
     if (step.is_circular) continue;
     for (const int source : step.reads) {
       is_read_[source] = true;
       if (sources_[source].step != kNone) is_needed_[sources_[source].step] = true;
     }
   }
-  std::reverse(work.items.begin(), work.items.end());
+  std::reverse(work.tasks.begin(), work.tasks.end());
   for (std::size_t source = 0; source < sources_.size(); ++source) {
     if (is_read_[source]) work.sources.push_back(&sources_[source]);
   }
@@ -265,8 +270,8 @@ void DerivationPlan::Run(const Work& work, const ScoreCaseRecord* record) {
       source->is_in_case = false;
     }
   }
-  for (const Work::Item& item : work.items)
-    item.run(*item.step, *item.to);
+  for (const Task& task : work.tasks)
+    task.run(task);
 }
 
 void DerivationPlan::TakeCase(const Work& work, const ScoreCaseRecord& record) {
@@ -304,59 +309,59 @@ void DerivationPlan::LookUpPositions(const ScoreCaseRecord& record) {
 }
 
 // A value in the case goes before it.
-void DerivationPlan::ShowResult(const Step& step, ScoreValue& to) {
-  if (!step.as_source->is_in_case) step.as_source->field->Set(&to);
+void DerivationPlan::ShowResult(const Task& task) {
+  if (!task.as_source->is_in_case) task.as_source->field->Set(task.to);
 }
 
-void DerivationPlan::RunCircular(const Step& step, ScoreValue& to) {
-  step.evaluation->GiveMissing(to);
+void DerivationPlan::RunCircular(const Task& task) {
+  task.evaluation->GiveMissing(*task.to);
 }
 
-void DerivationPlan::RunNumberTree(const Step& step, ScoreValue& to) {
-  step.program->Run();
-  static_cast<NumericValue&>(to).SetDoubleValue(NumberOrMissing(step.program->GetNumber()));
+void DerivationPlan::RunNumberTree(const Task& task) {
+  task.program->Run();
+  static_cast<NumericValue&>(*task.to).SetDoubleValue(NumberOrMissing(task.program->GetNumber()));
 }
 
-void DerivationPlan::RunDateTree(const Step& step, ScoreValue& to) {
-  step.program->Run();
-  step.evaluation->GiveNumber(step.program->GetNumber(), to);
+void DerivationPlan::RunDateTree(const Task& task) {
+  task.program->Run();
+  task.evaluation->GiveNumber(task.program->GetNumber(), *task.to);
 }
 
-void DerivationPlan::RunTextTree(const Step& step, ScoreValue& to) {
-  step.program->Run();
-  step.evaluation->GiveText(step.program->GetText(), to);
+void DerivationPlan::RunTextTree(const Task& task) {
+  task.program->Run();
+  task.evaluation->GiveText(task.program->GetText(), *task.to);
 }
 
-void DerivationPlan::RunTextEncoding(const Step& step, ScoreValue& to) {
-  const int code = step.source->GetTextCode();
+void DerivationPlan::RunTextEncoding(const Task& task) {
+  const int code = task.source->GetTextCode();
   if (code == SourceField::kNotLookedUp) {
-    RunNextTextEncoding(step, to);
+    RunNextTextEncoding(task);
   } else {
-    step.evaluation->GiveRow(step.row_of_code[PlaceOfCode(code)], *step.source, to);
+    task.evaluation->GiveRow(task.row_of_code[PlaceOfCode(code)], *task.source, *task.to);
   }
 }
 
 // For a value that no step has looked up, or that is no text.
-void DerivationPlan::RunNextTextEncoding(const Step& step, ScoreValue& to) {
-  const SourceField& source = *step.source;
+void DerivationPlan::RunNextTextEncoding(const Task& task) {
+  const SourceField& source = *task.source;
   if (source.GetKind() == SourceField::Kind::kText) {
     source.LookUpTextCode();
-    step.evaluation->GiveRow(step.row_of_code[PlaceOfCode(source.GetTextCode())], source, to);
+    task.evaluation->GiveRow(task.row_of_code[PlaceOfCode(source.GetTextCode())], source, *task.to);
   } else {
-    step.evaluation->Compute(source, to);
+    task.evaluation->Compute(source, *task.to);
   }
 }
 
-void DerivationPlan::RunNorm(const Step& step, ScoreValue& to) {
-  step.evaluation->ComputeNorm(*step.source, to);
+void DerivationPlan::RunNorm(const Task& task) {
+  task.evaluation->ComputeNorm(*task.source, *task.to);
 }
 
-void DerivationPlan::RunBin(const Step& step, ScoreValue& to) {
-  step.evaluation->ComputeBin(*step.source, to);
+void DerivationPlan::RunBin(const Task& task) {
+  task.evaluation->ComputeBin(*task.source, *task.to);
 }
 
-void DerivationPlan::RunOther(const Step& step, ScoreValue& to) {
-  step.evaluation->Compute(*step.source, to);
+void DerivationPlan::RunOther(const Task& task) {
+  task.evaluation->Compute(*task.source, *task.to);
 }
 
 }  // namespace MCKestrel_800

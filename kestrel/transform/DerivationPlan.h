@@ -69,31 +69,33 @@ class DerivationPlan {
     int position = kNone;              ///< in the record
     bool is_in_case = false;           ///< whether the case has a value of that name
   };
-  struct Step;
-  using RunStep = void (*)(const Step& step, ScoreValue& to);
+
+  /// What is to be done for a case. All that it needs stands together: there are more fields than the nearest
+  /// memory holds.
+  struct Task {
+    void (*run)(const Task& task) = nullptr;
+    ScoreValue* to = nullptr;
+    FieldEvaluation* evaluation = nullptr;
+    const SourceField* source = nullptr;  ///< what it reads, unless it is a function tree
+    ApplyProgram* program = nullptr;
+    const std::uint32_t* row_of_code = nullptr;
+    Source* as_source = nullptr;  ///< the result as what others read; null when none does
+  };
 
   struct Step {
     const TransformVar* field = nullptr;
-    FieldEvaluation* evaluation = nullptr;
     unsigned long long definition_stamp = 0;
     bool is_circular = false;
-    RunStep run = nullptr;
-    const SourceField* source = nullptr;  ///< what it reads, unless it is a function tree
-    Source* as_source = nullptr;          ///< itself as what others read; null when none does
+    Task task;  ///< its place for the result is chosen later
     std::unique_ptr<ApplyProgram> program;
     std::vector<std::uint32_t> row_of_code;  ///< by the code of the source's text, and 1 more
     std::vector<int> reads;                  ///< all sources
   };
 
-  /// Steps to run, in order, with the sources that they read. A step that others read is followed by one that
-  /// shows them its result.
+  /// What to do, in order, with the sources that it reads. The task of a field that others read is followed
+  /// by one that shows them its result.
   struct Work {
-    struct Item {
-      RunStep run;
-      const Step* step;
-      ScoreValue* to;
-    };
-    std::vector<Item> items;
+    std::vector<Task> tasks;
     std::vector<Source*> sources;
   };
 
@@ -111,16 +113,16 @@ class DerivationPlan {
   void TakeCase(const Work& work, const ScoreCaseRecord& record);
   void LookUpPositions(const ScoreCaseRecord& record);
 
-  static void ShowResult(const Step& step, ScoreValue& to);
-  static void RunCircular(const Step& step, ScoreValue& to);
-  static void RunNumberTree(const Step& step, ScoreValue& to);
-  static void RunDateTree(const Step& step, ScoreValue& to);
-  static void RunTextTree(const Step& step, ScoreValue& to);
-  static void RunTextEncoding(const Step& step, ScoreValue& to);
-  static void RunNextTextEncoding(const Step& step, ScoreValue& to);
-  static void RunNorm(const Step& step, ScoreValue& to);
-  static void RunBin(const Step& step, ScoreValue& to);
-  static void RunOther(const Step& step, ScoreValue& to);
+  static void ShowResult(const Task& task);
+  static void RunCircular(const Task& task);
+  static void RunNumberTree(const Task& task);
+  static void RunDateTree(const Task& task);
+  static void RunTextTree(const Task& task);
+  static void RunTextEncoding(const Task& task);
+  static void RunNextTextEncoding(const Task& task);
+  static void RunNorm(const Task& task);
+  static void RunBin(const Task& task);
+  static void RunOther(const Task& task);
 
   const ScoreDictionary* dictionary_;
   const TransformationDictionary* transformations_;

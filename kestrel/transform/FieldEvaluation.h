@@ -128,14 +128,14 @@ class FieldEvaluation {
   Replacement default_;
   Replacement sysmis_;
   NormCurve curve_;
-  BinTable bins_;
-  EncodingTable encodings_;
   // By row or bin, as the storage type has it.
   std::vector<double> row_numbers_;
-  std::vector<StringValue> row_texts_;
-  std::vector<bool> row_copies_;  ///< whether it gives the input itself; empty when none does
   /// How many rows give a number to a number: all or none.
   std::size_t given_numbers_ = 0;
+  BinTable bins_;
+  EncodingTable encodings_;
+  std::vector<StringValue> row_texts_;
+  std::vector<bool> row_copies_;  ///< whether it gives the input itself; empty when none does
   NumericValue recoded_number_;
   DateTimeValue recoded_date_;
   StringValue recoded_text_;

@@ -40,18 +40,19 @@ class NormCurve {
     double At(double x) const { return x * slope + intercept; }
   };
 
-  std::vector<double> orig_;
-  std::vector<double> norm_;
+  // First what every case needs.
   std::vector<Line> lines_;
-  bool has_range_;
-  bool is_ascending_;
-  double lowest_ = 0.0;
-  double highest_ = 0.0;
-  NumberSearch inner_;  ///< of ascending points: all but the first and the last one
   /// Where the points ascend, each two of them have a line and no line leaves the numbers; nowhere when there
   /// is no such place.
   double plain_lowest_ = std::numeric_limits<double>::infinity();
   double plain_highest_ = -std::numeric_limits<double>::infinity();
+  NumberSearch inner_;  ///< of ascending points: all but the first and the last one
+  std::vector<double> orig_;
+  std::vector<double> norm_;
+  bool has_range_;
+  bool is_ascending_;
+  double lowest_ = 0.0;
+  double highest_ = 0.0;
   ScoreDictVar::OutlierHandleMethod outliers_;
 };
 

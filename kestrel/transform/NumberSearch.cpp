@@ -16,15 +16,17 @@ constexpr std::size_t kCellsPerNumber = 2;
 NumberSearch::NumberSearch(std::vector<double> numbers) : numbers_(std::move(numbers)) {
   const std::size_t count = numbers_.size();
   ChooseCells(count);
-  starts_.assign(static_cast<std::size_t>(last_cell_) + 1, 0);
-  std::uint32_t below = 0;
-  for (std::size_t cell = 0; cell < starts_.size(); ++cell) {
-    starts_[cell] = below;
-    while (below < count && CellOf(numbers_[below]) == cell)
-      ++below;
-    width_ = std::max<std::size_t>(width_, below - starts_[cell]);
+  constexpr double kBehindAll = std::numeric_limits<double>::infinity();
+  cells_.reserve(static_cast<std::size_t>(last_cell_) + 1);
+  std::size_t next = 0;
+  while (cells_.size() <= static_cast<std::size_t>(last_cell_)) {
+    const std::size_t first = next;
+    while (next < count && CellOf(numbers_[next]) == cells_.size())
+      ++next;
+    width_ = std::max(width_, next - first);
+    cells_.push_back({first, first < count ? numbers_[first] : kBehindAll});
   }
-  numbers_.resize(std::max(count, starts_.back() + width_), std::numeric_limits<double>::infinity());
+  numbers_.resize(std::max(count, cells_.back().first + width_), kBehindAll);
 }
 
 // A range that is no number, as ends may be infinite, leaves one cell.

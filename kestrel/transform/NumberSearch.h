@@ -25,7 +25,24 @@ class NumberSearch {
   /// The position of the first number that is not below x; their count when there is none. Of NaN, any of
   /// these.
   std::size_t FirstNotBelow(double x) const {
-    std::size_t first = starts_[CellOf(x)];
+    const Cell& cell = cells_[CellOf(x)];
+    if (width_ > 1) return FirstOfCell(cell.first, x);
+    return cell.first + static_cast<std::size_t>(cell.number < x);
+  }
+
+ private:
+  struct Cell {
+    std::size_t first;  ///< the first number that does not lie in a lower cell
+    double number;
+  };
+
+  // What is NaN, or gives NaN as infinities may where there is one cell, has some cell, too.
+  std::size_t CellOf(double x) const {
+    const double from_low = (x > low_ ? x : low_) - low_;
+    const double cell = from_low * cells_per_unit_;
+    return static_cast<std::size_t>(static_cast<std::int64_t>(cell < last_cell_ ? cell : last_cell_));
+  }
+  std::size_t FirstOfCell(std::size_t first, double x) const {
     for (std::size_t left = width_; left > 1;) {
       const std::size_t half = left / 2;
       first += numbers_[first + half - 1] < x ? half : 0;
@@ -33,22 +50,14 @@ class NumberSearch {
     }
     return first + static_cast<std::size_t>(numbers_[first] < x);
   }
-
- private:
-  // What is NaN, or gives NaN as infinities may where there is one cell, has some cell, too.
-  std::size_t CellOf(double x) const {
-    const double from_low = (x > low_ ? x : low_) - low_;
-    const double cell = from_low * cells_per_unit_;
-    return static_cast<std::size_t>(static_cast<std::int64_t>(cell < last_cell_ ? cell : last_cell_));
-  }
   void ChooseCells(std::size_t count);
 
   double low_ = 0.0;
   double cells_per_unit_ = 0.0;
   double last_cell_ = 0.0;
-  std::size_t width_ = 1;              ///< how many numbers are searched: those of the fullest cell
-  std::vector<double> numbers_;        ///< with infinities behind them, so that each cell has as many
-  std::vector<std::uint32_t> starts_;  ///< by cell: how many numbers lie in lower ones
+  std::size_t width_ = 1;  ///< how many numbers are searched: those of the fullest cell
+  std::vector<Cell> cells_;
+  std::vector<double> numbers_;  ///< with infinities behind them, so that each cell has as many
 };
 
 }  // namespace MCKestrel_800
