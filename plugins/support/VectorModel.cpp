@@ -60,9 +60,9 @@ MCStatus VectorModel::RefuseCase(const ScoreCaseRecord& record, ScoreResult& res
     ScoredCase scored;
     scored.record = &record;
     scored.basis = ScoredCase::Basis::kRefused;
-    const std::vector<const ScoreDictVar*> predictors = inputs_.GetPredictors();
-    if (static_cast<std::size_t>(field) < predictors.size()) {
-      scored.refused_field = predictors[static_cast<std::size_t>(field)];
+    if (predictors_.empty()) predictors_ = inputs_.GetPredictors();
+    if (static_cast<std::size_t>(field) < predictors_.size()) {
+      scored.refused_field = predictors_[static_cast<std::size_t>(field)];
     }
     frame_.outputs.Write(scored, result);
   }

@@ -63,6 +63,7 @@ class VectorModel : public BaseModel {
 
   ModelFrame frame_;
   CaseVector& inputs_;
+  std::vector<const ScoreDictVar*> predictors_;  ///< kept from the first case that is refused
 };
 
 }  // namespace MCKestrel_800

@@ -10,6 +10,7 @@
 #include "kestrel/model/Results.h"
 #include "tests/model/AllocationCount.h"
 #include "tests/plugins/DerivedModelText.h"
+#include "tests/plugins/OutputText.h"
 
 namespace {
 
@@ -109,6 +110,35 @@ TEST(ScoringAllocation, NoneForDerivedFields) {
     EXPECT_EQ(CountAllocations(), before);
     EXPECT_GE(scored, 200);
     EXPECT_LE(scored, 300);
+  }
+}
+
+// All features, of cases that are scored, missing and refused, with records of two layouts.
+TEST(ScoringAllocation, NoneForOutputFields) {
+  const std::string text = "a text that is too long to be kept in place";
+  std::string fields = Field("name='yes' feature='probability' value='yes'") +
+                       Field("name='text of a number' dataType='string' feature='entityAffinity'");
+  for (const char* feature :
+       {"predictedValue", "predictedDisplayValue", "probability", "residual", "standardError", "clusterId",
+        "clusterAffinity", "entityId", "entityAffinity", "warning", "ruleValue", "standardDeviation"}) {
+    fields += Field(std::string("name='") + feature + "' feature='" + feature + "'");
+  }
+  const std::string targets = "<Targets><Target field='k'><TargetValue value='yes' displayValue='" + text +
+                              "' priorProbability='0.5'/><TargetValue value='no'/></Target></Targets>";
+  for (const Kind kind : {Kind::kLogistic, Kind::kTree, Kind::kRules}) {
+    const auto model = Build(kind, Output(fields), targets);
+    const std::unique_ptr<ScoreResult> result(model->MakeResult());
+    const CaseRecord records[] = {RecordOf({{"x", 2.0}, {"k", "yes"}}), RecordOf({{"k", "no"}, {"x", 0.5}}),
+                                  RecordOf({{"x", NumericValue::gSysmisValue}, {"k", "yes"}}),
+                                  RecordOf({{"x", text}, {"k", "no"}})};
+    for (const CaseRecord& record : records)
+      model->Score(&record, result.get());
+    const size_t before = CountAllocations();
+    for (int i = 0; i < 100; ++i) {
+      for (const CaseRecord& record : records)
+        model->Score(&record, result.get());
+    }
+    EXPECT_EQ(CountAllocations(), before) << model->GetModelKind();
   }
 }
 
