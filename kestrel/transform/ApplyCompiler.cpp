@@ -314,8 +314,8 @@ const double* ApplyCompiler::MethodOfOutliers(const FunctionTree* node) {
 // Both arguments are laid out as the kind that is needed, whatever the other one is.
 const double* ApplyCompiler::Choose(Node node, const double* (ApplyCompiler::*lay_out)(const FunctionTree*)) {
   const double* const condition = Number(ChildOf(node, 0));
-  program_.numbers_.push_front(NumericValue::gSysmisValue);
-  double* const out = &program_.numbers_.front();
+  program_.numbers_.push_back(NumericValue::gSysmisValue);
+  double* const out = &program_.numbers_.back();
   const std::size_t test = program_.code_.size();
   Emit(ApplySteps::SkipUnlessOne).x = condition;
   const auto copy = [this, out](const double* from) {
@@ -454,8 +454,8 @@ ApplyText ApplyCompiler::TextOfImputation(Node node) {
 }
 
 const double* ApplyCompiler::NewConstant(double number) {
-  program_.numbers_.push_front(number);
-  return &program_.numbers_.front();
+  program_.numbers_.push_back(number);
+  return &program_.numbers_.back();
 }
 
 const double* ApplyCompiler::MissingNumber() {
@@ -486,11 +486,11 @@ ApplyInstruction& ApplyCompiler::Emit(ApplyInstruction::Run run, TransformFuncti
 
 const double* ApplyCompiler::EmitNumber(ApplyInstruction::Run run, TransformFunction function,
                                         const double* x, const double* y, ApplyDetail* detail) {
-  program_.numbers_.push_front(NumericValue::gSysmisValue);
+  program_.numbers_.push_back(NumericValue::gSysmisValue);
   ApplyInstruction& step = Emit(run, function);
   step.x = x;
   step.y = y;
-  step.out = &program_.numbers_.front();
+  step.out = &program_.numbers_.back();
   step.detail = detail;
   return step.out;
 }

@@ -7,11 +7,13 @@
 
 namespace MCKestrel_800 {
 
-ApplyProgram::ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find) {
-  numbers_.push_front(NumericValue::gSysmisValue);
+ApplyProgram::ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find,
+                           std::deque<double>& numbers)
+    : numbers_(numbers) {
+  numbers_.push_back(NumericValue::gSysmisValue);
   texts_.emplace_front();
   text_places_.push_front(&texts_.front());
-  const double* const missing = &numbers_.front();
+  const double* const missing = &numbers_.back();
   const ApplyText empty = &text_places_.front();
   number_ = missing;
   text_ = empty;

@@ -4,6 +4,7 @@
 #define KESTREL_TRANSFORM_APPLYPROGRAM_H
 
 #include <cstdint>
+#include <deque>
 #include <forward_list>
 #include <functional>
 #include <string>
@@ -52,7 +53,10 @@ class ApplyProgram {
 
   /// find  gives the field of a name that the tree refers to, which must outlive the program. The tree is not
   ///       needed afterwards, but for the variables of its fields.
-  ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find);
+  /// numbers  where the program's constants and results are put, behind those of others: what is computed
+  ///       together lies together. Must outlive the program.
+  ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find,
+               std::deque<double>& numbers);
   ApplyProgram(const ApplyProgram&) = delete;
   ApplyProgram& operator=(const ApplyProgram&) = delete;
   ~ApplyProgram();
@@ -77,8 +81,8 @@ class ApplyProgram {
   std::vector<ApplyInstruction> code_;
   const double* number_;
   ApplyText text_;
-  // Lists, because addresses must stay, and most programs hold little.
-  std::forward_list<double> numbers_;
+  // All such that addresses stay. Lists, because most programs hold little.
+  std::deque<double>& numbers_;
   std::forward_list<StringValue> texts_;
   std::forward_list<const StringValue*> text_places_;
   std::forward_list<ApplyDetail> details_;

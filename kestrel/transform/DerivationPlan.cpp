@@ -177,7 +177,7 @@ void DerivationPlan::PrepareStep(Step& step, const ApplyProgram::FindSource& fin
     UseCodes(step);
   } else if (kind == TransExpression::kApply && step.field->GetRoot() != nullptr) {
     const bool is_text = storage == FieldEvaluation::Storage::kText;
-    step.program = std::make_unique<ApplyProgram>(*step.field->GetRoot(), is_text, find);
+    step.program = std::make_unique<ApplyProgram>(*step.field->GetRoot(), is_text, find, program_numbers_);
     step.task.program = step.program.get();
     step.task.run = is_text                                        ? RunTextTree
                     : storage == FieldEvaluation::Storage::kNumber ? RunNumberTree

@@ -5,6 +5,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <deque>
 #include <memory>
 #include <string>
 #include <unordered_map>
@@ -129,6 +130,7 @@ class DerivationPlan {
   unsigned long long dictionary_stamp_;
   unsigned long long transformations_stamp_;
   std::vector<Source> sources_;
+  std::deque<double> program_numbers_;  ///< of the steps' programs
   std::vector<Step> steps_;
   Work chosen_;
   Work only_;
