@@ -41,6 +41,10 @@ struct NonCentralTail {
   double bend;
 };
 
+/// Whether the saddle point is so close to the pole that the integral may go through that: either side is as
+/// exact then.
+bool IsCloseToPole(const ChiQuotient& quotient, double nc, const ChiSaddle& saddle);
+
 /// Whether the integral may be taken on the other side of the pole than the saddle point is. With few degrees
 /// of freedom below, another singularity comes too close there.
 bool ReachesBothSides(const ChiQuotient& quotient, double nc, const ChiSaddle& saddle);

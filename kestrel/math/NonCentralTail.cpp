@@ -214,12 +214,14 @@ NonCentralTail StudentOneSide(double x, double df, double nc, bool upper, SumCar
   const ChiSaddle saddle = FindSaddle(quotient, nc_square.high);
   if (nc_square.high * saddle.w >= kStudentIntegralFrom) {
     // P(T < -x) is too small to count: what is left is that T^2 has the non-central F distribution.
-    const bool both = care == SumCare::kFull && ReachesBothSides(quotient, nc_square.high, saddle);
-    return FromSmaller(saddle.u > 0.0, upper, both, [&](bool above) {
+    const auto side = [&](bool above) {
       const NonCentralTail tail = IntegrateSaddle(quotient, nc_square, saddle, above, care);
       return NonCentralTail{tail.share, 2.0 * nc * tail.slope,
                             2.0 * tail.slope + 4.0 * nc_square.high * tail.bend};
-    });
+    };
+    if (IsCloseToPole(quotient, nc_square.high, saddle)) return side(upper);
+    const bool both = care == SumCare::kFull && ReachesBothSides(quotient, nc_square.high, saddle);
+    return FromSmaller(saddle.u > 0.0, upper, both, side);
   }
   const bool beyond = square.high * ChiMedian(df, 0.0) > nc_square.high;
   return FromSmaller(beyond, upper, care == SumCare::kFull,
@@ -277,6 +279,8 @@ NonCentralTail FindChiTail(double x, double df, double nc, bool upper, SumCare c
   const ChiQuotient quotient = ChiAgainstNumber(df, x);
   const ChiSaddle saddle = FindSaddle(quotient, nc);
   const bool integrates = nc * saddle.w >= kIntegralFrom;
+  if (integrates && IsCloseToPole(quotient, nc, saddle))
+    return IntegrateSaddle(quotient, nc, saddle, upper, care);
   const bool both = care == SumCare::kFull && (!integrates || ReachesBothSides(quotient, nc, saddle));
   return FromSmaller(saddle.u > 0.0, upper, both, [&](bool above) {
     if (integrates) return IntegrateSaddle(quotient, nc, saddle, above, care);
@@ -296,6 +300,7 @@ NonCentralTail FindBetaTail(DoubleDouble odds, double a, double b, double nc, bo
   const bool full = care == SumCare::kFull;
   const bool reaches = ReachesBothSides(quotient, nc, saddle);
   const bool sums = !integrates || (full && !reaches && nc <= kLongSumTo);
+  if (!sums && IsCloseToPole(quotient, nc, saddle)) return IntegrateSaddle(quotient, nc, saddle, upper, care);
   // The integral is best on the saddle point's side as long as that is not much the larger.
   const bool beyond = sums ? odds.high * ChiMedian(2.0 * b, 0.0) > ChiMedian(2.0 * a, nc) : saddle.u > 0.0;
   return FromSmaller(beyond, upper, full && (sums || reaches), [&](bool above) {
