@@ -31,15 +31,19 @@ constexpr const char* kTableHelp =
     "\n";
 
 constexpr const char* kScoreHelp =
-    "The output has the columns that are kept, then\n"
+    "The output has the columns that are kept, then the output fields that the model's document declares, in "
+    "its\n"
+    "order. Without any, and behind them with --all, there are\n"
     "  prediction              the predicted number or category\n"
     "  probability             of the predicted category (classifications)\n"
     "  probability_<category>  of each category that the target lists, in its order (classifications)\n"
-    "  explanation             with --explain: the nodes that the case passed, or the rules that fired\n"
-    "A case without prediction has empty cells (null in jsonl), but is explained as far as it came. A name "
-    "that a\n"
-    "kept column has already gets \"_2\" behind it. A file that is written appears when it is complete, not "
-    "before.\n";
+    "and with --explain, behind all others,\n"
+    "  explanation             the nodes that the case passed, or the rules that fired\n"
+    "A case without prediction has empty cells (null in jsonl), but is explained as far as it came, and its "
+    "output\n"
+    "fields tell what they have to tell. A name that another column has already gets \"_2\" behind it. A "
+    "file that is\n"
+    "written appears when it is complete, not before.\n";
 
 constexpr const char* kDeriveHelp =
     "The output has the columns that are kept, then one for each derived field, named like it. A missing "
@@ -71,6 +75,7 @@ struct Values {
   std::vector<std::string> keep;
   std::vector<std::string> missing;
   std::vector<std::string> fields;
+  bool shows_all = false;
   bool explains = false;
   bool shows_statistics = false;
   bool as_json = false;
@@ -156,6 +161,8 @@ void AddScore(CLI::App& program, Values& values) {
   AddModel(command, values);
   AddTable(command, values);
   AddCases(command, values, "predictions");
+  command.add_flag("--all", values.shows_all,
+                   "Write the prediction and its probabilities also where the model has output fields");
   command.add_flag("--explain", values.explains,
                    "Tell which nodes of a tree, or rules of a rule set, led to each prediction");
   command.footer(std::string(kTableHelp) + kScoreHelp + "\n" + kExitCodesHelp);
@@ -235,7 +242,7 @@ TableOptions TableOf(const Values& values) {
 
 ExitCode Run(const CLI::App& program, const Values& values) {
   if (program.got_subcommand("score")) {
-    return Score({TableOf(values), values.names_file, values.explains});
+    return Score({TableOf(values), values.names_file, values.shows_all, values.explains});
   }
   if (program.got_subcommand("derive")) return Derive({TableOf(values), values.fields});
   if (program.got_subcommand("describe")) return Describe(values.model, values.names_file, values.as_json);

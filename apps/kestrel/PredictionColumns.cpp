@@ -41,10 +41,20 @@ std::string TextOf(const ScoreValue& value) {
   return text;
 }
 
-PredictionColumns::PredictionColumns(ScoreModel& model)
-    : result_(model.MakeResult()),
-      classification_(dynamic_cast<ScoreClsResult*>(result_.get())),
-      by_position_(dynamic_cast<const ClsResult*>(result_.get())),
+void WriteValue(const ScoreValue& value, TableWriter& writer) {
+  if (value.GetType() == ScoreValue::kNumeric) {
+    writer.AddNumber(value.GetDouble());
+  } else if (const auto* text = dynamic_cast<const StringValue*>(&value)) {
+    writer.AddText(text->GetText());
+  } else {
+    writer.AddText(value.GetString());
+  }
+}
+
+PredictionColumns::PredictionColumns(ScoreModel& model, ScoreResult* result)
+    : result_(result),
+      classification_(dynamic_cast<ScoreClsResult*>(result)),
+      by_position_(dynamic_cast<const ClsResult*>(result)),
       names_{"prediction"} {
   if (classification_ == nullptr) return;
   names_.push_back("probability");
@@ -75,7 +85,7 @@ void PredictionColumns::FindCategoriesByScoring(ScoreModel& model) {
   CaseRecord record;
   for (const ScoreDictVar* variable : model.GetPredictors())
     record.Add(variable->GetName(), AnyValueOf(*variable));
-  if (!model.Score(&record, result_.get()).IsError()) {
+  if (!model.Score(&record, result_).IsError()) {
     for (std::size_t i = 0; i < by_position_->GetCategoryCount(); ++i)
       categories_.emplace_back(by_position_->GetCategory(i)->Clone());
   }
@@ -85,13 +95,7 @@ void PredictionColumns::FindCategoriesByScoring(ScoreModel& model) {
 void PredictionColumns::Write(TableWriter& writer) {
   const ScoreValue* prediction = result_->GetPrediction();
   if (prediction == nullptr || prediction->IsSystemMissingValue()) return WriteMissing(writer);
-  if (prediction->GetType() == ScoreValue::kNumeric) {
-    writer.AddNumber(prediction->GetDouble());
-  } else if (const auto* text = dynamic_cast<const StringValue*>(prediction)) {
-    writer.AddText(text->GetText());
-  } else {
-    writer.AddText(prediction->GetString());
-  }
+  WriteValue(*prediction, writer);
   if (classification_ == nullptr) return;
   writer.AddNumber(classification_->GetProbability());
   WriteCategories(writer);

@@ -1,17 +1,21 @@
 #include "apps/kestrel/ScoreCommand.h"
 
+#include <algorithm>
 #include <memory>
 #include <optional>
 #include <vector>
 
 #include "apps/kestrel/AddedColumns.h"
 #include "apps/kestrel/ExplanationColumn.h"
+#include "apps/kestrel/KeptColumns.h"
 #include "apps/kestrel/LoadedModel.h"
+#include "apps/kestrel/OutputColumns.h"
 #include "apps/kestrel/PredictionColumns.h"
 #include "apps/kestrel/ShownText.h"
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/foundation/MCStatus.h"
 #include "kestrel/model/ScoreModel.h"
+#include "kestrel/model/ScoreResult.h"
 
 namespace kestrel_program {
 namespace {
@@ -46,44 +50,67 @@ std::string AcceptedCategories(const ScoreDictVar& variable) {
   return labels->Size() > kMost ? list + ", ..." : list;
 }
 
-/// Predictions and, where they are wanted, explanations.
+/// The output fields that the document declares, or else predictions; where they are wanted, both, and
+/// explanations.
 class ScoredColumns : public AddedColumns {
  public:
-  ScoredColumns(std::unique_ptr<ScoreModel> model, bool explains)
+  ScoredColumns(std::unique_ptr<ScoreModel> model, bool shows_all, bool explains)
       : model_(std::move(model)),
         predictors_(model_->GetPredictors()),
-        predictions_(*model_),
-        names_(predictions_.GetNames()) {
-    if (!explains) return;
-    explanation_.emplace(predictions_.GetResult());
-    names_.push_back(ExplanationColumn::kName);
+        result_(model_->MakeResult()),
+        outputs_(*model_, result_.get()) {
+    SetInputs();
+    std::vector<std::string> names = outputs_.GetNames();
+    if (names.empty() || shows_all) {
+      predictions_.emplace(*model_, result_.get());
+      names.insert(names.end(), predictions_->GetNames().begin(), predictions_->GetNames().end());
+    }
+    if (explains) {
+      explanation_.emplace(result_.get());
+      names.push_back(ExplanationColumn::kName);
+    }
+    // A document may call its output fields as we call our columns.
+    names_ = NameOutputColumns({}, names);
   }
 
   const ColumnWords& GetWords() const override { return kWords; }
-  const std::vector<const ScoreDictVar*>& GetInputs() const override { return predictors_; }
+  const std::vector<const ScoreDictVar*>& GetInputs() const override { return inputs_; }
   const std::vector<std::string>& GetNames() const override { return names_; }
 
   void BeginCase() override {
+    outputs_.BeginCase();
     if (explanation_.has_value()) explanation_->BeginCase();
   }
 
   bool Compute(const CaseReader& cases, const TableRow& row, CaseReader::Fault& fault) override {
-    const MCStatus status = model_->Score(&cases.GetRecord(), predictions_.GetResult());
+    const MCStatus status = model_->Score(&cases.GetRecord(), result_.get());
     if (!status.IsError()) return true;
     DescribeStatus(status, cases, row, fault);
     return false;
   }
 
   void Write(bool is_computed, TableWriter& writer, Progress& progress) override {
-    if (is_computed) {
-      predictions_.Write(writer);
-    } else {
-      predictions_.WriteMissing(writer);
+    // A case without prediction has output fields all the same: they may tell why.
+    outputs_.Write(writer);
+    if (predictions_.has_value()) {
+      if (is_computed) {
+        predictions_->Write(writer);
+      } else {
+        predictions_->WriteMissing(writer);
+      }
     }
     if (explanation_.has_value()) WriteExplanation(is_computed, writer, progress);
   }
 
  private:
+  /// The true value of the target stands behind what the model predicts from.
+  void SetInputs() {
+    inputs_ = predictors_;
+    const ScoreDictVar* target = model_->GetTargetVar();
+    if (target == nullptr || !ComparesWithTrueValue(*model_)) return;
+    if (std::find(inputs_.begin(), inputs_.end(), target) == inputs_.end()) inputs_.push_back(target);
+  }
+
   /// A model that has nothing to tell would leave the user to wonder about an empty column.
   void WriteExplanation(bool is_scored, TableWriter& writer, Progress& progress) {
     if (is_scored && !any_is_scored_ && !explanation_->HasPath()) {
@@ -128,7 +155,10 @@ class ScoredColumns : public AddedColumns {
 
   std::unique_ptr<ScoreModel> model_;
   std::vector<const ScoreDictVar*> predictors_;
-  PredictionColumns predictions_;
+  std::vector<const ScoreDictVar*> inputs_;
+  std::unique_ptr<ScoreResult> result_;
+  OutputColumns outputs_;
+  std::optional<PredictionColumns> predictions_;
   std::optional<ExplanationColumn> explanation_;
   std::vector<std::string> names_;
   bool any_is_scored_ = false;
@@ -138,7 +168,8 @@ class ScoredColumns : public AddedColumns {
 
 ExitCode Score(const ScoreOptions& options) {
   RefuseClashes(options.table, "the model");
-  ScoredColumns columns(LoadModel(options.table.document, options.names_file), options.explains);
+  ScoredColumns columns(LoadModel(options.table.document, options.names_file), options.shows_all,
+                        options.explains);
   return TableRun(options.table, columns).Run();
 }
 

@@ -13,6 +13,7 @@ namespace kestrel_program {
 struct ScoreOptions {
   TableOptions table;
   std::string names_file;  ///< empty: the standard's model elements
+  bool shows_all = false;  ///< predictions also where the document declares output fields
   bool explains = false;   ///< tells which parts of the model led to each prediction
 };
 

@@ -35,9 +35,10 @@ TEST(KestrelCommandLine, HasHelpEverywhereWithTheExitCodes) {
 
 TEST(KestrelCommandLine, HelpOfScoreTellsOfEveryOption) {
   const std::string help = RunKestrel({"score", "--help"}).output;
-  for (const char* word : {"MODEL", "DATA", "-o,--output", "--models", "--delimiter", "--format",
-                           "{csv,jsonl}", "--keep[=NAME,...]", "--missing", "--on-error", "{stop,null}",
-                           "--explain", "--stats", "--version", "probability_<category>", "explanation"}) {
+  for (const char* word :
+       {"MODEL", "DATA", "-o,--output", "--models", "--delimiter", "--format", "{csv,jsonl}",
+        "--keep[=NAME,...]", "--missing", "--on-error", "{stop,null}", "--all", "--explain", "--stats",
+        "--version", "probability_<category>", "explanation"}) {
     EXPECT_NE(help.find(word), std::string::npos) << word;
   }
 }
