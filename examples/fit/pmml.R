@@ -42,6 +42,22 @@ mining_schema <- function(inputs, target, replacements = list()) c(
   sprintf("      <MiningField name=%s usageType=\"target\"/>", quoted(target)),
   "    </MiningSchema>")
 
+# What the document is to tell of each case. Further attributes of a field stand behind its feature: value = "yes".
+output_field <- function(name, feature, ...) {
+  attributes <- c(...)
+  more <- if (length(attributes) == 0) "" else paste0(" ", names(attributes), "=", vapply(attributes, quoted, ""), collapse = "")
+  sprintf("      <OutputField name=%s feature=%s%s/>", quoted(name), quoted(feature), more)
+}
+output_lines <- function(...) c("    <Output>", ..., "    </Output>")
+
+# What the target is when data are missing: a number, or the most probable category.
+default_value <- function(value) sprintf("        <TargetValue defaultValue=\"%s\"/>", number(value))
+prior_values <- function(categories, shown, priors) sprintf(
+  "        <TargetValue value=%s displayValue=%s priorProbability=\"%s\"/>", vapply(categories, quoted, ""),
+  vapply(shown, quoted, ""), number(priors))
+targets_lines <- function(target, values) c(
+  "    <Targets>", sprintf("      <Target field=%s>", quoted(target)), values, "      </Target>", "    </Targets>")
+
 # fields: lines of DataField elements; count: how many fields they are; model: lines of the model element.
 write_document <- function(path, name, fields, count, model) writeLines(c(
   "<?xml version=\"1.0\" encoding=\"UTF-8\"?>",
@@ -50,11 +66,12 @@ write_document <- function(path, name, fields, count, model) writeLines(c(
   sprintf("  <DataDictionary numberOfFields=\"%d\">", count), fields, "  </DataDictionary>",
   model, "</PMML>"), path)
 
-# replacements: by the inputs' names.
-write_model <- function(path, name, fields, count, inputs, target, normalization, tables, func, replacements = list())
+# replacements: by the inputs' names; behind_schema: lines.
+write_model <- function(path, name, fields, count, inputs, target, normalization, tables, func, replacements = list(),
+                        behind_schema = NULL)
   write_document(path, name, fields, count, c(
     sprintf("  <RegressionModel modelName=%s functionName=\"%s\" normalizationMethod=\"%s\">", quoted(name), func, normalization),
-    mining_schema(inputs, target, replacements), tables, "  </RegressionModel>"))
+    mining_schema(inputs, target, replacements), behind_schema, tables, "  </RegressionModel>"))
 
 # Missing cells are empty.
 cells_of <- function(column) {

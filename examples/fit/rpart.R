@@ -29,6 +29,15 @@ node_predicate <- function(fitted, row, left) {
   compound_predicate("surrogate", unlist(predicates))
 }
 
+# Where the splits alone lead a case, as a row of the tree: a leaf, or the node whose split it has no value for. The tree
+# must have been fitted without the use of surrogates.
+rows_reached <- function(fitted, cases) {
+  stopifnot(fitted$control$usesurrogate == 0)
+  unname(rpart:::pred.rpart(fitted, rpart:::rpart.matrix(
+    model.frame(delete.response(fitted$terms), cases, na.action = na.pass, xlev = attr(fitted, "xlevels")))))
+}
+node_numbers <- function(fitted) as.integer(rownames(fitted$frame))
+
 # A node of one of the tree's rows; default is the child that the undecided go to, if it has any.
 row_element <- function(fitted, row, id, predicate, default = NULL, children = NULL) {
   categories <- attr(fitted, "ylevels")

@@ -24,13 +24,13 @@ node_element <- function(id, score, predicate, categories, counts, default = NUL
     paste0("  ", c(predicate, distribution, children)), "</Node>")
 }
 
-# cases: a data frame of factors and numbers, the target among them; root: lines; attributes: further ones of the model.
-write_tree <- function(path, name, cases, target, root, attributes = "") {
+# cases: a data frame of factors and numbers, the target among them; root and behind_schema: lines; attributes: further ones of the model.
+write_tree <- function(path, name, cases, target, root, attributes = "", behind_schema = NULL) {
   fields <- unlist(lapply(names(cases), function(field)
     if (is.factor(cases[[field]])) categorical_field(field, levels(cases[[field]])) else continuous_field(field)))
   write_document(path, name, fields, length(cases), c(
     sprintf("  <TreeModel modelName=%s functionName=\"classification\"%s>", quoted(name), attributes),
-    mining_schema(setdiff(names(cases), target), target), paste0("    ", root), "  </TreeModel>"))
+    mining_schema(setdiff(names(cases), target), target), behind_schema, paste0("    ", root), "  </TreeModel>"))
 }
 
 # The fitting program's own answers.

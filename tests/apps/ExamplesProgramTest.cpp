@@ -20,13 +20,14 @@ bool Agree(const std::string& expected, const std::string& actual) {
   return AgreesWith(number, std::strtod(actual.c_str(), nullptr));
 }
 
-TEST_P(KestrelExamples, AgreeWithTheirTrainingPrograms) {
+/// Scores an example and compares with a table in its folder.
+void ExpectAnswers(const std::string& example, const std::string& answers) {
   const ProgramOutcome outcome =
-      RunKestrel({"score", ExamplePath(GetParam(), "model.xml"), ExamplePath(GetParam(), "data.csv")});
+      RunKestrel({"score", ExamplePath(example, "model.xml"), ExamplePath(example, "data.csv")});
   ASSERT_EQ(outcome.exit_code, 0) << outcome.errors;
   std::istringstream output(outcome.output);
   const PlainTable actual = ParsePlainTable(output);
-  const PlainTable expected = ReadPlainTable(ExamplePath(GetParam(), "expected.csv"));
+  const PlainTable expected = ReadPlainTable(ExamplePath(example, answers));
   EXPECT_EQ(actual.header, expected.header);
   ASSERT_EQ(actual.rows.size(), expected.rows.size());
   for (std::size_t row = 0; row < expected.rows.size(); ++row) {
@@ -36,7 +37,20 @@ TEST_P(KestrelExamples, AgreeWithTheirTrainingPrograms) {
   }
 }
 
+TEST_P(KestrelExamples, AgreeWithTheirTrainingPrograms) {
+  ExpectAnswers(GetParam(), "expected.csv");
+}
+
 INSTANTIATE_TEST_SUITE_P(Examples, KestrelExamples, testing::ValuesIn(ExampleFolders()),
+                         [](const auto& example) { return TestNameOf(example.param); });
+
+class KestrelOutputExamples : public testing::TestWithParam<std::string> {};
+
+TEST_P(KestrelOutputExamples, AgreeWithTheirTrainingPrograms) {
+  ExpectAnswers(GetParam(), "outputs.csv");
+}
+
+INSTANTIATE_TEST_SUITE_P(Examples, KestrelOutputExamples, testing::ValuesIn(FoldersWith("outputs.csv")),
                          [](const auto& example) { return TestNameOf(example.param); });
 
 }  // namespace
