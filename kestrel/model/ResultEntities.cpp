@@ -31,9 +31,4 @@ void ResultEntities::AddToPath(std::string_view id) {
   ++path_length_;
 }
 
-void ResultEntities::Reset() {
-  deciding_id_.clear();
-  path_length_ = 0;
-}
-
 }  // namespace MCKestrel_800

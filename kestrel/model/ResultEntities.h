@@ -55,7 +55,10 @@ class KESTREL_API ResultEntities {
   const std::string& GetPathId(std::size_t position) const { return path_[position]; }
 
   /// Forgets the case; what is wanted stays.
-  void Reset();
+  void Reset() {
+    deciding_id_.clear();
+    path_length_ = 0;
+  }
 
  private:
   bool deciding_id_wanted_ = false;

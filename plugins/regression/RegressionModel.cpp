@@ -67,8 +67,7 @@ double RegressionModel::Normalize(double y) const {
 bool RegressionModel::PredictNumber(ScoreResult& result) {
   const double prediction = definition_.normalization == Normalization::kNone ? y_[0] : Normalize(y_[0]);
   if (!std::isfinite(prediction)) return false;
-  prediction_.SetDoubleValue(prediction);
-  result.SetPrediction(&prediction_);
+  SetNumber(result, prediction);
   return true;
 }
 

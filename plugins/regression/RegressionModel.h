@@ -8,7 +8,6 @@
 #include <string>
 #include <vector>
 
-#include "kestrel/foundation/NumericValue.h"
 #include "plugins/regression/CategoryPlan.h"
 #include "plugins/regression/Normalization.h"
 #include "plugins/regression/RegressionEquation.h"
@@ -58,7 +57,6 @@ class RegressionModel : public VectorModel {
   // Per case, kept so that scoring allocates nothing.
   std::vector<double> y_;
   std::vector<double> probabilities_;
-  NumericValue prediction_;
 };
 
 }  // namespace MCKestrel_800

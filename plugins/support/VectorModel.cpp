@@ -1,5 +1,6 @@
 #include "plugins/support/VectorModel.h"
 
+#include <typeinfo>
 #include <utility>
 
 #include "kestrel/model/ResultEntities.h"
@@ -26,29 +27,28 @@ MCStatus VectorModel::Score(const ScoreCaseRecord* record, ScoreResult* result) 
   return ScoreInputs(inputs_.GetValues(), outcome, record, *result);
 }
 
-MCStatus VectorModel::ScoreInputs(const double* values, unsigned outcome, const ScoreCaseRecord* record,
-                                  ScoreResult& result) {
-  ScoredCase scored;
-  if (frame_.outputs.IsEmpty()) return Answer(values, outcome, result, scored);
+MCStatus VectorModel::ScoreWithOutputs(const double* values, unsigned outcome, const ScoreCaseRecord* record,
+                                       ScoreResult& result) {
   if (frame_.outputs.TellEntities()) {
     if (ResultEntities* entities = ResultEntities::Of(&result)) entities->SetDecidingIdWanted(true);
   }
+  ScoredCase scored;
   scored.record = record;
   scored.is_decided_by_rule = DecidesByRules();
-  const MCStatus status = Answer(values, outcome, result, scored);
+  MCStatus status;
+  result.Reset();
+  if (!Predict(values, outcome, result)) {
+    status = PredictDefault(result);
+    scored.basis =
+        result.GetPrediction() != nullptr ? ScoredCase::Basis::kDefault : ScoredCase::Basis::kNothing;
+  }
   frame_.outputs.Write(scored, result);
   return status;
 }
 
-MCStatus VectorModel::Answer(const double* values, unsigned outcome, ScoreResult& result,
-                             ScoredCase& scored) {
-  result.Reset();
-  if (Predict(values, outcome, result)) return MCStatus();
-  scored.basis = ScoredCase::Basis::kNothing;
+MCStatus VectorModel::PredictDefault(ScoreResult& result) {
   if (GetMissingValuePolicy() != kDefaultPrediction) return MCStatus(kNoPredictionStatus, false);
-  const MCStatus status = HandleMissingValue(&result);
-  if (!status.IsError() && result.GetPrediction() != nullptr) scored.basis = ScoredCase::Basis::kDefault;
-  return status;
+  return HandleMissingValue(&result);
 }
 
 MCStatus VectorModel::RefuseCase(const ScoreCaseRecord& record, ScoreResult& result) {
@@ -67,6 +67,13 @@ MCStatus VectorModel::RefuseCase(const ScoreCaseRecord& record, ScoreResult& res
     frame_.outputs.Write(scored, result);
   }
   return status;
+}
+
+// Mostly the result is of the class that MakeResult gives, which takes a number as it is.
+void VectorModel::SetNumber(ScoreResult& result, double prediction) {
+  if (&typeid(result) == &typeid(RegResult)) return static_cast<RegResult&>(result).SetNumber(prediction);
+  prediction_.SetDoubleValue(prediction);
+  result.SetPrediction(&prediction_);
 }
 
 std::vector<const ScoreDictVar*> VectorModel::GetPredictors() const {

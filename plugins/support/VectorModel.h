@@ -6,7 +6,9 @@
 
 #include <vector>
 
+#include "kestrel/foundation/NumericValue.h"
 #include "kestrel/model/BaseModel.h"
+#include "kestrel/model/ScoreResult.h"
 #include "plugins/support/CaseVector.h"
 #include "plugins/support/ModelDictionaries.h"
 #include "plugins/support/ModelFrame.h"
@@ -53,16 +55,26 @@ class VectorModel : public BaseModel {
   /// Scores a case whose inputs are at hand, as Score does.
   /// record  the case, which output fields may ask for the true value of the target; null when there is none
   MCScore::MCStatus ScoreInputs(const double* values, unsigned outcome, const ScoreCaseRecord* record,
-                                ScoreResult& result);
+                                ScoreResult& result) {
+    if (!frame_.outputs.IsEmpty()) return ScoreWithOutputs(values, outcome, record, result);
+    result.Reset();
+    return Predict(values, outcome, result) ? MCScore::MCStatus() : PredictDefault(result);
+  }
+
+  /// Sets a number as the prediction.
+  void SetNumber(ScoreResult& result, double prediction);
 
   const ModelFrame& GetFrame() const { return frame_; }
 
  private:
-  MCScore::MCStatus Answer(const double* values, unsigned outcome, ScoreResult& result, ScoredCase& scored);
+  MCScore::MCStatus ScoreWithOutputs(const double* values, unsigned outcome, const ScoreCaseRecord* record,
+                                     ScoreResult& result);
+  MCScore::MCStatus PredictDefault(ScoreResult& result);
   MCScore::MCStatus RefuseCase(const ScoreCaseRecord& record, ScoreResult& result);
 
   ModelFrame frame_;
   CaseVector& inputs_;
+  NumericValue prediction_;                      ///< per case, kept so that scoring allocates nothing
   std::vector<const ScoreDictVar*> predictors_;  ///< kept from the first case that is refused
 };
 

@@ -25,6 +25,14 @@ MCScore::MCStatus TreeModel::ScoreVector(const double* values, ScoreResult* resu
 }
 
 bool TreeModel::Predict(const double* values, unsigned, ScoreResult& result) {
+  // Most cases of most trees: a number at a leaf, into a result of the class that MakeResult gives.
+  if (!tree_->options.is_classification && &typeid(result) == &typeid(RegResult)) {
+    auto& number = static_cast<RegResult&>(result);
+    if (!number.GetEntities().IsDecidingIdWanted() && walker_.Walk(values) == TreeWalker::End::kNode) {
+      number.SetNumber(tree_->scores.GetNumber(walker_.GetNode()));
+      return true;
+    }
+  }
   switch (Walk(values, result)) {
     case TreeWalker::End::kNode:
       PredictByNode(result);
@@ -72,15 +80,7 @@ double TreeModel::Penalize(double confidence) const {
 void TreeModel::PredictByNode(ScoreResult& result) {
   const NodeScores& scores = tree_->scores;
   const int node = walker_.GetNode();
-  if (!tree_->options.is_classification) {
-    // Most cases of most trees: a number at a leaf, into a result of the class that MakeResult gives.
-    if (&typeid(result) == &typeid(RegResult)) {
-      return static_cast<RegResult&>(result).SetNumber(scores.GetNumber(node));
-    }
-    prediction_.SetDoubleValue(scores.GetNumber(node));
-    result.SetPrediction(&prediction_);
-    return;
-  }
+  if (!tree_->options.is_classification) return SetNumber(result, scores.GetNumber(node));
   const int winner = scores.GetWinner(node);
   result.SetPrediction(&tree_->categories.Get(winner));
   const CategoryShare* share = scores.FirstShare(node);
@@ -104,11 +104,7 @@ void TreeModel::PredictByNode(ScoreResult& result) {
 
 void TreeModel::PredictTogether(ScoreResult& result) {
   const std::vector<double>& votes = walker_.GetVotes();
-  if (!tree_->options.is_classification) {
-    prediction_.SetDoubleValue(votes[0]);
-    result.SetPrediction(&prediction_);
-    return;
-  }
+  if (!tree_->options.is_classification) return SetNumber(result, votes[0]);
   const auto winner = static_cast<int>(std::max_element(votes.begin(), votes.end()) - votes.begin());
   result.SetPrediction(&tree_->categories.Get(winner));
   result.SetProbability(Penalize(votes[static_cast<std::size_t>(winner)]));

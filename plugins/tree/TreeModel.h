@@ -8,7 +8,6 @@
 #include <string_view>
 #include <vector>
 
-#include "kestrel/foundation/NumericValue.h"
 #include "plugins/support/VectorModel.h"
 #include "plugins/tree/Tree.h"
 #include "plugins/tree/TreeWalker.h"
@@ -53,7 +52,6 @@ class TreeModel : public VectorModel {
   std::unique_ptr<Tree> tree_;
   TreeWalker walker_;
   // Per case, kept so that scoring allocates nothing.
-  NumericValue prediction_;
   std::string name_;
 };
 
