@@ -27,7 +27,7 @@ constexpr std::uint32_t kNoRow = static_cast<std::uint32_t>(-1);
 // Behind the one for texts without a code.
 std::size_t PlaceOfCode(int code) {
   static_assert(TextCodes::kUnknown == -1);
-  return static_cast<std::size_t>(code + 1);
+  return static_cast<std::size_t>(code) + 1;
 }
 
 unsigned long long StampOf(const ScoreDictionary* dictionary) {
