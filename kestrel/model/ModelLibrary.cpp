@@ -5,12 +5,23 @@
 namespace MCKestrel_800 {
 namespace {
 
+using GiveVersion = const char* (*)();
 using GiveTranslator = ScoreTranslator* (*)();
 using TakeModelNames = void (*)(ScoreTranslator* translator, std::vector<std::string>* names);
 
 /// The marks of folders and drives on every system, and what would end a name early. An element's tag holds
 /// none of them but the colon, yet a library's name must not depend on who chose the tag.
 constexpr char kNotInFileNames[] = {'/', '\\', ':', '\0'};
+
+/// Why a library cannot be used that tells what it was built for; empty for one that does not tell.
+std::string VersionFault(SharedLibrary& library) {
+  const auto give = reinterpret_cast<GiveVersion>(library.FindSymbol("GiveMyVersion"));
+  if (give == nullptr) return std::string();
+  const char* const version = give();
+  if (version == nullptr) return library.GetFileName() + ": GiveMyVersion gave no version.";
+  if (std::string(version) == KESTREL_PLUGIN_VERSION) return std::string();
+  return library.GetFileName() + ": built for Kestrel " + version + ", this is " KESTREL_PLUGIN_VERSION ".";
+}
 
 }  // namespace
 
@@ -31,8 +42,14 @@ std::unique_ptr<ScoreTranslator> ModelLibrary::MakeTranslator(std::vector<std::s
     last_error_ = "The element's tag cannot be part of a library's name.";
     return nullptr;
   }
-  const GiveTranslator give =
-      library_.Load() ? reinterpret_cast<GiveTranslator>(library_.FindSymbol("GiveMyTranslator")) : nullptr;
+  if (!library_.Load()) {
+    last_error_ = library_.GetLastErrorText();
+    return nullptr;
+  }
+  // Before anything of the library is called that has to do with objects.
+  last_error_ = VersionFault(library_);
+  if (!last_error_.empty()) return nullptr;
+  const auto give = reinterpret_cast<GiveTranslator>(library_.FindSymbol("GiveMyTranslator"));
   if (give == nullptr) {
     last_error_ = library_.GetLastErrorText();
     return nullptr;

@@ -28,8 +28,10 @@ class KESTREL_API ModelLibrary {
 
   /// Loads the library and calls its entry point "GiveMyTranslator". Offers the translator the names through
   /// the entry point "PassModelNames" where the library has one; it may keep the pointer as long as it lives.
-  /// Null, with the error text set, when there is no such library, it cannot be loaded, or it gives no
-  /// translator. What the entry points throw passes through.
+  /// A library that has the entry point "GiveMyVersion" must give KESTREL_PLUGIN_VERSION there; one without
+  /// it is taken as it is.
+  /// Null, with the error text set, when there is no such library, it cannot be loaded, is built for another
+  /// version, or gives no translator. What the entry points throw passes through.
   std::unique_ptr<ScoreTranslator> MakeTranslator(std::vector<std::string>& names);
 
   /// Why MakeTranslator gave null, in the system's words where it was the system; else empty.

@@ -17,4 +17,9 @@
 #define KESTREL_PLUGIN_API __attribute__((visibility("default")))
 #endif
 
+/// The version that a plug-in built with these headers is for, "major.minor"; the build checks it against the
+/// project's. Objects of other versions are laid out otherwise, so the core loads no plug-in that tells
+/// another one.
+#define KESTREL_PLUGIN_VERSION "8.0"
+
 #endif  // KESTREL_PLATFORM_EXPORT_H

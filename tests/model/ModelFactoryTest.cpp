@@ -141,6 +141,8 @@ TEST(ModelFactory, SaysWhichModelHasNoUsableLibrary) {
       {"Fault_NEEDS_ABSENT", "Fault_NEEDS_ABSENT", "needs a library that is absent"},
       {"Fault_NO_ENTRY", "Fault_NO_ENTRY", "no entry point"},
       {"Fault_NULL_TRANSLATOR", "Fault_NULL_TRANSLATOR", "no translator"},
+      {"Fault_OTHER_VERSION", "Fault_OTHER_VERSION", "built for another version"},
+      {"Fault_NULL_VERSION", "Fault_NULL_VERSION", "does not know its version"},
       {"x:TreeModel", "x:TreeModel", "a tag that is no file name"},
   };
   for (const Row& row : rows) {
@@ -148,6 +150,8 @@ TEST(ModelFactory, SaysWhichModelHasNoUsableLibrary) {
     ExpectFault([&] { MakeFrom(text, {row.tag}); }, 5, TextForNoLibrary(row.named), row.why);
     EXPECT_NE(ModelFactory::GetLastLoadError(), "") << row.why;
   }
+  MakeFrom("<PMML><VersionedModel/></PMML>", {"VersionedModel"});
+  EXPECT_EQ(ModelFactory::GetLastLoadError(), "") << "the right version";
   MakeFrom(kTreeDocument, {"TreeModel"});
   EXPECT_EQ(ModelFactory::GetLastLoadError(), "") << "a load that works leaves nothing behind";
 }

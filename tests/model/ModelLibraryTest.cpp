@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "kestrel/translate/ScoreTranslator.h"
@@ -52,29 +53,53 @@ TEST(ModelLibrary, LoadsNothingForATagThatIsNoName) {
 }
 
 TEST(ModelLibrary, GivesATranslator) {
+  const std::pair<const char*, const char*> rows[] = {
+      {"TreeModel", "without the entry points that may be absent"},
+      {"VersionedModel", "built for this version"},
+  };
   std::vector<std::string> names;
-  ModelLibrary library("TreeModel");
-  EXPECT_NE(library.MakeTranslator(names), nullptr) << library.GetLastErrorText();
-  EXPECT_EQ(library.GetLastErrorText(), "") << "the missing second entry point is no failure";
+  for (const auto& [tag, why] : rows) {
+    ModelLibrary library(tag);
+    EXPECT_NE(library.MakeTranslator(names), nullptr) << library.GetLastErrorText() << why;
+    EXPECT_EQ(library.GetLastErrorText(), "") << why;
+  }
 }
 
 TEST(ModelLibrary, TellsWhatWentWrong) {
   struct Row {
     const char* tag;
+    const char* text;  ///< all behind the name when it begins with a colon, else a part
     const char* why;
   };
   const Row rows[] = {
-      {"NoSuchModel", "absent"},
-      {"NotALibrary", "a text file"},
-      {"Fault_NEEDS_ABSENT", "needs a library that is absent"},
-      {"Fault_NO_ENTRY", "no entry point"},
-      {"Fault_NULL_TRANSLATOR", "no translator"},
+      {"NoSuchModel", "", "absent"},
+      {"NotALibrary", "", "a text file"},
+      {"Fault_NEEDS_ABSENT", "", "needs a library that is absent"},
+      {"Fault_NO_ENTRY", "GiveMyTranslator", "no entry point"},
+      {"Fault_NULL_TRANSLATOR", ": GiveMyTranslator gave no translator.", "no translator"},
+      {"Fault_OTHER_VERSION", ": built for Kestrel 7.2, this is " KESTREL_PLUGIN_VERSION ".",
+       "built for another version"},
+      {"Fault_NULL_VERSION", ": GiveMyVersion gave no version.", "does not know its version"},
   };
   std::vector<std::string> names;
   for (const Row& row : rows) {
     ModelLibrary library(row.tag);
     EXPECT_EQ(library.MakeTranslator(names), nullptr) << row.why;
-    EXPECT_NE(library.GetLastErrorText(), "") << row.why;
+    const std::string text = library.GetLastErrorText();
+    EXPECT_NE(text, "") << row.why;
+    if (row.text[0] == ':') {
+      EXPECT_EQ(text, ModelLibrary::FileNameFor(row.tag) + row.text) << row.why;
+    }
+    EXPECT_NE(text.find(row.text), std::string::npos) << row.why << ": " << text;
+  }
+}
+
+TEST(ModelLibrary, SaysWhyAgainWhenAskedAgain) {
+  std::vector<std::string> names;
+  ModelLibrary library("Fault_OTHER_VERSION");
+  for (int i = 0; i < 2; ++i) {
+    EXPECT_EQ(library.MakeTranslator(names), nullptr);
+    EXPECT_NE(library.GetLastErrorText().find("built for Kestrel 7.2"), std::string::npos);
   }
 }
 

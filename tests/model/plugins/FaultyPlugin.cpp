@@ -57,3 +57,13 @@ extern "C" KESTREL_PLUGIN_API void PassModelNames(ScoreTranslator*, std::vector<
   throw KestrelException(KestrelException::kInvalidDocument, "no such names");
 }
 #endif
+
+#if defined(FAULT_OTHER_VERSION) || defined(FAULT_NULL_VERSION)
+extern "C" KESTREL_PLUGIN_API const char* GiveMyVersion() {
+#ifdef FAULT_OTHER_VERSION
+  return "7.2";
+#else
+  return nullptr;
+#endif
+}
+#endif
