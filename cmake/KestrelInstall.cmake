@@ -13,6 +13,10 @@ foreach(header kestrel/kestrel.h kestrel/translate/PMMLModelTags.inc ${headers})
   cmake_path(GET header PARENT_PATH folder)
   install(FILES ${PROJECT_SOURCE_DIR}/${header} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/${folder})
 endforeach()
+# For plug-ins of one's own; by itself, because it asks for the XML parser, which hosts have no need of.
+install(EXPORT kestrelPluginTargets NAMESPACE kestrel:: DESTINATION ${KESTREL_PACKAGE_DIR})
+install(FILES ${CMAKE_CURRENT_LIST_DIR}/KestrelPlugin.cmake ${CMAKE_CURRENT_LIST_DIR}/PluginVersion.cpp
+  DESTINATION ${KESTREL_PACKAGE_DIR})
 install(FILES ${PROJECT_SOURCE_DIR}/kestrel/model/modeldll.txt DESTINATION ${CMAKE_INSTALL_DATADIR}/kestrel)
 install(FILES ${PROJECT_SOURCE_DIR}/LICENSE ${PROJECT_SOURCE_DIR}/README.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
 

@@ -1,18 +1,12 @@
 # The functions that the folders of this project build their targets with.
 
-# kestrel_add_plugin(TAG SOURCE...) builds the model library of one model element: tag + "800r" + the system's suffix.
-function(kestrel_add_plugin tag)
-  set(target plugin_${tag})
-  add_library(${target} MODULE ${ARGN})
-  set_target_properties(${target} PROPERTIES
-    PREFIX ""
-    OUTPUT_NAME ${tag}800r
-    LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib/kestrel/plugins
-    BUILD_WITH_INSTALL_RPATH ON
-    INSTALL_RPATH "$ORIGIN/../..")
-  target_link_libraries(${target} PRIVATE kestrel::kestrel XercesC::XercesC)
-  install(TARGETS ${target} LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}/kestrel/plugins)
-endfunction()
+include(${CMAKE_CURRENT_LIST_DIR}/KestrelPlugin.cmake)
+
+# The headers say the version too, for the plug-ins that are built with them.
+file(STRINGS ${PROJECT_SOURCE_DIR}/kestrel/platform/Export.h plugin_version REGEX "define KESTREL_PLUGIN_VERSION")
+if(NOT plugin_version MATCHES "\"${PROJECT_VERSION_MAJOR}\\.${PROJECT_VERSION_MINOR}\"")
+  message(FATAL_ERROR "KESTREL_PLUGIN_VERSION in kestrel/platform/Export.h is not the project's version")
+endif()
 
 # kestrel_add_test(ROOM SOURCE... [LIBRARIES LIBRARY...]) builds one GoogleTest program for a room and registers it.
 # The programs find test data under KESTREL_SOURCE_DIR and built files under KESTREL_BINARY_DIR.
