@@ -48,27 +48,23 @@ constexpr FeatureRow kFeatures[] = {
     {Tag::XML_ATT_VAL_MINING_WARNING, Feature::kWarning},
     {Tag::XML_ATT_VAL_MINING_RULEVALUE, Feature::kRuleValue},
     {Tag::XML_ATT_VAL_MINING_STANDARDDEVIATION, Feature::kStandardDeviation},
-    // The later name of an entity's affinity.
+    // Later names: of an entity's affinity, and of what is told of a rule.
     {u"affinity", Feature::kEntityAffinity, true},
+    {u"antecedent", Feature::kRuleValue, true},
+    {u"consequent", Feature::kRuleValue, true},
+    {u"rule", Feature::kRuleValue, true},
+    {u"ruleId", Feature::kRuleValue, true},
+    {u"confidence", Feature::kRuleValue, true},
+    {u"support", Feature::kRuleValue, true},
+    {u"lift", Feature::kRuleValue, true},
+    {u"leverage", Feature::kRuleValue, true},
     {u"", Feature::kNoFeature},
 };
 
 /// What an OutputField may ask for that no model here can tell. To say so helps more than to call it a
 /// mistake.
 constexpr const char16_t* kOtherFeatures[] = {
-    u"transformedValue",
-    u"decision",
-    u"reasonCode",
-    u"antecedent",
-    u"consequent",
-    u"rule",
-    u"ruleId",
-    u"confidence",
-    u"support",
-    u"lift",
-    u"leverage",
-    u"confidenceIntervalLower",
-    u"confidenceIntervalUpper",
+    u"transformedValue", u"decision", u"reasonCode", u"confidenceIntervalLower", u"confidenceIntervalUpper",
 };
 
 std::string ReadName(const DOMElement* field, const ScoreDictionary& others) {

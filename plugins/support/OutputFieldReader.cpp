@@ -35,7 +35,10 @@ constexpr Word<RuleFeature> kRuleFeatures[] = {
     {"affinity", RuleFeature::kOther},
 };
 
+// Older documents say it beside the feature "ruleValue", newer ones with the feature itself.
 RuleFeature ReadRuleFeature(const DOMElement* element) {
+  const std::string feature = AttributeText(element, Tags::XML_ATT_VAL_MINING_FEATURE);
+  if (const Word<RuleFeature>* word = FindWord(kRuleFeatures, feature)) return word->meaning;
   const XMLCh* text = FindAttribute(element, u"ruleFeature");
   if (text == nullptr) return RuleFeature::kConsequent;
   const Word<RuleFeature>* word = FindWord(kRuleFeatures, Narrow(text));

@@ -72,7 +72,8 @@ struct OutputField {
 ///             the number of a part without identifier ("#7").
 ///   entityAffinity, clusterAffinity   the confidence with which that part predicts
 ///   ruleValue     of the rule that decided, by `ruleFeature`: "consequent" (also without the attribute) what
-///             it predicts, "rule" and "ruleId" its identifier, "confidence" its confidence
+///             it predicts, "rule" and "ruleId" its identifier, "confidence" its confidence; an `OutputField`
+///             may have these words as its feature
 ///   warning       why there is no prediction or only the target's default; in a number field the status code
 ///   standardDeviation, and every rule feature but those above: no model here has them, so always missing
 ///

@@ -224,10 +224,21 @@ TEST(Output, RefusesWithCodeTextAndPlace) {
 
 TEST(Output, SaysWhichFeaturesAreNotSupported) {
   for (const char* feature :
-       {"transformedValue", "decision", "reasonCode", "antecedent", "consequent", "rule", "ruleId",
-        "confidence", "support", "lift", "leverage", "confidenceIntervalLower", "confidenceIntervalUpper"}) {
+       {"transformedValue", "decision", "reasonCode", "confidenceIntervalLower", "confidenceIntervalUpper"}) {
     ExpectFaultOf("<OutputField name='f' feature='" + std::string(feature) + "'/>", 5,
                   "f: feature -- " + std::string(feature) + ": Not supported!");
+    ExpectFaultOf("<ResultField name='f' feature='" + std::string(feature) + "'/>", 11,
+                  "f: Invalid feature Type");
+  }
+}
+
+TEST(Output, KnowsTheLaterNamesOfWhatIsToldOfARule) {
+  for (const char* feature :
+       {"antecedent", "consequent", "rule", "ruleId", "confidence", "support", "lift", "leverage"}) {
+    BaseDictionary dictionary;
+    const auto document = ReadText("<OutputField name='f' feature='" + std::string(feature) + "'/>");
+    EXPECT_EQ(PMMLTranslator::ParseResultField(document->GetRoot(), dictionary).GetFeature(),
+              ScoreResultField::kRuleValue);
     ExpectFaultOf("<ResultField name='f' feature='" + std::string(feature) + "'/>", 11,
                   "f: Invalid feature Type");
   }
