@@ -22,6 +22,21 @@ DOMElement* RequiredChild(DOMElement* parent, const char* tag) {
   return static_cast<DOMElement*>(BaseTranslator::GetChildByTagForced(parent, tag));
 }
 
+/// Root elements of documents that may hold a model and are no PMML.
+constexpr const char16_t* kOlderRoots[] = {u"vexa-ml", u"Tree", u"AssocLattice",
+                                           u"SequentialAssociationLattice"};
+
+DOMElement* RequiredDictionary(DOMElement* root) {
+  if (DOMElement* const dictionary = FirstChild(root, Tags::XML_ELE_DATADICTIONARY)) return dictionary;
+  for (const char16_t* const tag : kOlderRoots) {
+    if (!ElementIs(root, tag)) continue;
+    FailAt(root, KestrelException::kUnsupported,
+           "<" + Narrow(root->getTagName()) + ">: models of the older document format are not supported!");
+  }
+  // Said here and not by ParseDictionary, which cannot know where the element should stand.
+  FailAt(root, KestrelException::kStructure, "<DataDictionary is required !!");
+}
+
 bool ReadIsClassification(const DOMElement* element) {
   const XMLCh* function = BaseTranslator::GetAttributeForced(element, PMMLModelTags::XML_ATT_FUNCTIONNAME);
   if (Equals(function, Tags::XML_VAL_MINING_CLASSIFICATION)) return true;
@@ -63,13 +78,8 @@ std::string ReadTarget(const DOMElement* element, const MiningSchema& schema,
 }  // namespace
 
 ScoreModel* ModelTranslator::ParseFromTree(DOMElement* root, const std::string&) {
-  DOMElement* const dictionaryElement = FirstChild(root, Tags::XML_ELE_DATADICTIONARY);
-  // Said here and not by ParseDictionary, which cannot know where the element should stand.
-  if (dictionaryElement == nullptr) {
-    FailAt(root, KestrelException::kStructure, "<DataDictionary is required !!");
-  }
   ModelDictionaries dictionaries;
-  dictionaries.data.reset(ParseDictionary(dictionaryElement, false));
+  dictionaries.data.reset(ParseDictionary(RequiredDictionary(root), false));
   ReadDerivedFields(FirstChild(root, Tags::XML_ELE_TRANSFORMATION), dictionaries);
   std::unique_ptr<ScoreModel> model = BuildModel(RequiredChild(root, tag_), std::move(dictionaries));
   const std::string version = AttributeText(root, Tags::XML_ATT_VERSION);

@@ -54,16 +54,32 @@ TEST(ModelFinder, DispatchesOnTheRoot) {
        "regression-model", "the sign goes before the names, however deep"},
       {"<vexa-ml><TreeModel/></vexa-ml>", "TreeModel", "TreeModel",
        "the older format without the sign is searched"},
+      {"<vexa-ml><AssociationModelLattice/></vexa-ml>", "AssociationModel", "AssociationModelLattice",
+       "and the lattice found in it is its model's"},
+      {"<PMML><regression-model/><TreeModel/></PMML>", "TreeModel", "TreeModel",
+       "elsewhere the sign says nothing"},
       {"<Tree/>", "TreeModel", "Tree", "a tree alone"},
       {"<Tree><NeuralNetwork/></Tree>", "TreeModel", "Tree", "a tree is not searched"},
       {"<AssocLattice><Only/></AssocLattice>", "Only", "Only", "searched"},
+      {"<AssocLattice><AssociationModelLattice/></AssocLattice>", "AssociationModel",
+       "AssociationModelLattice", "the lattice is its model's"},
       {"<SequentialAssociationLattice><Only/></SequentialAssociationLattice>", "Only", "Only", "searched"},
+      {"<SequentialAssociationLattice><Only/><AssociationModelLattice/></SequentialAssociationLattice>",
+       "AssociationModel", "AssociationModelLattice", "searched in the list's order"},
   };
   for (const Row& row : rows) {
     const auto document = Parse(row.text);
     const FoundModel found = FindModel(document->GetRoot(), names);
     EXPECT_EQ(found.tag, row.tag) << row.why;
     EXPECT_EQ(Narrow(found.element->getTagName()), row.element) << row.why;
+  }
+}
+
+TEST(ModelFinder, NeedsNoNamesWhereTheRootSettlesTheModel) {
+  for (const Names& names : {Names{}, Names{"NeuralNetwork"}}) {
+    EXPECT_EQ(FindModel(Parse("<Tree/>")->GetRoot(), names).tag, "TreeModel");
+    EXPECT_EQ(FindModel(Parse("<vexa-ml><a><regression-model/></a></vexa-ml>")->GetRoot(), names).tag,
+              "GeneralRegressionModel");
   }
 }
 

@@ -164,6 +164,58 @@ constexpr RootRow kRoots[] = {
     {"a tree", "Tree", 4, "Node is missing --- TreeModel ---"},
 };
 
+struct OlderRow {
+  const char* why;
+  const char* document;
+  const char* text;
+  unsigned line;
+};
+
+constexpr OlderRow kOlder[] = {
+    {"a tree", "<?xml version='1.0'?>\n<Tree><Node/></Tree>",
+     "<Tree>: models of the older document format are not supported!", 2},
+    {"a tree in the older format", "<vexa-ml>\n<dictionary/><TreeModel/></vexa-ml>",
+     "<vexa-ml>: models of the older document format are not supported!", 1},
+    {"a regression in the older format", "<vexa-ml>\n<RegressionModel/></vexa-ml>",
+     "<vexa-ml>: models of the older document format are not supported!", 1},
+    {"the older format's own regression", "<vexa-ml>\n<regression-model/></vexa-ml>",
+     "Doesn't Support GeneralRegressionModel  Model: No Required dll or lib available!", 2},
+    {"a lattice", "<AssocLattice>\n<TreeModel/></AssocLattice>",
+     "<AssocLattice>: models of the older document format are not supported!", 1},
+    {"a sequence", "<SequentialAssociationLattice>\n<RegressionModel/></SequentialAssociationLattice>",
+     "<SequentialAssociationLattice>: models of the older document format are not supported!", 1},
+    {"a lattice of another kind", "<AssocLattice>\n<AssociationModelLattice/></AssocLattice>",
+     "Doesn't Support AssociationModel  Model: No Required dll or lib available!", 2},
+    {"a lattice without a model", "<AssocLattice/>", kUnsupportedModel, 1},
+};
+
+TEST(BrokenModel, OlderDocumentsAreRefused) {
+  for (const OlderRow& row : kOlder) {
+    std::istringstream in(row.document);
+    try {
+      const std::unique_ptr<ScoreModel> model(ModelFactory::MakeModelFromXML(
+          in, {"TreeModel", "RegressionModel", "AssociationModelLattice"}, std::string()));
+      ADD_FAILURE() << row.why;
+    } catch (const KestrelException& fault) {
+      EXPECT_EQ(fault.GetErrorCode(), 5) << row.why;
+      EXPECT_EQ(fault.GetErrorMessage(), row.text) << row.why;
+      EXPECT_EQ(fault.GetLine(), row.line) << row.why;
+    }
+  }
+}
+
+// The root's name alone does no harm.
+TEST(BrokenModel, AnOlderRootMayHoldADataDictionary) {
+  for (const char* root : {"vexa-ml", "AssocLattice", "SequentialAssociationLattice"}) {
+    std::string document = Replaced(DocumentText(kOrders), "<PMML", std::string("<") + root);
+    document = Replaced(document, "</PMML>", std::string("</") + root + ">");
+    const Sample orders = Samples().front();
+    const Outcome outcome = LoadAndScore(document, orders.cells, root);
+    EXPECT_EQ(outcome.code, kLoaded) << root << ": " << outcome.text;
+    EXPECT_EQ(outcome.text, orders.prediction) << root;
+  }
+}
+
 TEST(BrokenModel, OtherRootsAreRefused) {
   for (const RootRow& row : kRoots) {
     const std::string tag = row.root;
