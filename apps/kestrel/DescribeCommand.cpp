@@ -1,6 +1,7 @@
 #include "apps/kestrel/DescribeCommand.h"
 
 #include <algorithm>
+#include <cstdio>
 #include <nlohmann/json.hpp>
 #include <string>
 #include <vector>
@@ -43,6 +44,7 @@ Json ToJson(const FieldDescription& field) {
 Json ToJson(const ModelDescription& model) {
   Json object;
   object["kind"] = model.kind.empty() ? Json() : Json(model.kind);
+  if (model.is_legacy) object["format"] = "vexa-ml";
   object["version"] = model.version;
   object["target"] = model.has_target ? ToJson(model.target) : Json();
   object["inputs"] = Json::array();
@@ -65,7 +67,7 @@ std::string Join(const std::vector<std::string>& texts, std::size_t most) {
   return joined.empty() ? "-" : joined;
 }
 
-TableLine ToLine(const FieldDescription& field) {
+TableLine ToLine(const FieldDescription& field, bool shows_what_is_read = true) {
   constexpr std::size_t kMostMissing = 5;
   constexpr std::size_t kMostCategories = 20;
   std::vector<std::string> categories;
@@ -73,11 +75,11 @@ TableLine ToLine(const FieldDescription& field) {
     categories.push_back(category.label.empty() ? category.value
                                                 : category.value + " (" + category.label + ")");
   }
-  const bool is_target = field.role == "target";
+  const bool is_idle = shows_what_is_read && !field.is_read && field.role != "target";
   return {ShownText(field.name),
           field.type,
           field.level,
-          field.role + (field.is_read || is_target ? "" : " (not read)"),
+          field.role + (is_idle ? " (not read)" : ""),
           Join(field.missing, kMostMissing),
           Join(categories, kMostCategories)};
 }
@@ -104,8 +106,13 @@ void AppendAligned(const std::vector<TableLine>& lines, std::string& out) {
   }
 }
 
+std::string KindText(const ModelDescription& model) {
+  if (model.is_legacy) return "none, the dictionary of a document in the older format (vexa-ml) alone";
+  return model.kind.empty() ? "none, derived fields alone" : model.kind;
+}
+
 void AppendText(const ModelDescription& model, std::string& out) {
-  out += "kind:    " + (model.kind.empty() ? std::string("none, derived fields alone") : model.kind) + "\n";
+  out += "kind:    " + KindText(model) + "\n";
   out += "version: " + (model.version.empty() ? std::string("-") : ShownText(model.version)) + "\n";
   const TableLine kHeading = {"name", "type", "level", "role", "missing values", "categories"};
   out += "target:\n";
@@ -118,7 +125,7 @@ void AppendText(const ModelDescription& model, std::string& out) {
   if (!model.inputs.empty()) {
     std::vector<TableLine> lines = {kHeading};
     for (const FieldDescription& field : model.inputs)
-      lines.push_back(ToLine(field));
+      lines.push_back(ToLine(field, !model.is_legacy));
     AppendAligned(lines, out);
   }
   if (model.derived.empty()) return;
@@ -129,6 +136,12 @@ void AppendText(const ModelDescription& model, std::string& out) {
   AppendAligned(lines, out);
 }
 
+ModelDescription DescribeDocument(const LoadedDocument& loaded, const ExpressionText& expressions) {
+  if (loaded.model != nullptr) return ModelDescription(*loaded.model, expressions);
+  if (loaded.legacy != nullptr) return ModelDescription(*loaded.legacy);
+  return ModelDescription(*loaded.fields.dictionary, *loaded.fields.derived, expressions);
+}
+
 }  // namespace
 
 ExitCode Describe(const std::string& model, const std::string& names_file, bool as_json) {
@@ -136,10 +149,7 @@ ExitCode Describe(const std::string& model, const std::string& names_file, bool 
   constexpr std::size_t kMostRows = 10;
   const LoadedDocument loaded = LoadDocument(model, names_file);
   const ExpressionText expressions = as_json ? ExpressionText() : ExpressionText::Short(kMostRows);
-  const ModelDescription description =
-      loaded.model != nullptr
-          ? ModelDescription(*loaded.model, expressions)
-          : ModelDescription(*loaded.fields.dictionary, *loaded.fields.derived, expressions);
+  const ModelDescription description = DescribeDocument(loaded, expressions);
   OutputFile output("-");
   if (as_json) {
     output.GetBuffer() += ToJson(description).dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
@@ -147,6 +157,8 @@ ExitCode Describe(const std::string& model, const std::string& names_file, bool 
     AppendText(description, output.GetBuffer());
   }
   output.Finish();
+  if (!loaded.refusal.empty())
+    std::fprintf(stderr, "kestrel: the model cannot be scored: %s\n", loaded.refusal.c_str());
   return kDone;
 }
 

@@ -1,17 +1,16 @@
 #include "apps/kestrel/LoadedModel.h"
 
 #include <exception>
-#include <fstream>
-#include <iostream>
+#include <istream>
 #include <new>
 
 #include "apps/kestrel/DocumentHints.h"
 #include "apps/kestrel/DocumentInput.h"
-#include "apps/kestrel/InputFile.h"
 #include "apps/kestrel/ProgramError.h"
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ModelNames.h"
+#include "kestrel/translate/VEXATranslator.h"
 
 namespace kestrel_program {
 namespace {
@@ -24,7 +23,7 @@ std::string WithoutLeadingLineEnds(const std::string& text) {
   return first == std::string::npos ? std::string() : text.substr(first);
 }
 
-/// own_hint  takes the place of the general one.
+/// own_hint  takes the place of the general ones.
 ProgramError Describe(const std::string& name, const KestrelException& fault,
                       const char* own_hint = nullptr) {
   std::string text = name;
@@ -35,12 +34,13 @@ ProgramError Describe(const std::string& name, const KestrelException& fault,
   text += ": " + WithoutLeadingLineEnds(fault.GetErrorMessage()) + " (code " + std::to_string(code) + ")";
   const std::string reason = ModelFactory::GetLastLoadError();
   if (code == KestrelException::kUnsupported && !reason.empty()) {
-    text += "\n  the system says: " + reason +
-            "\n  hint: install the library for this kind of model beside the others, in lib/kestrel/plugins";
-  } else if (const char* hint =
-                 own_hint != nullptr ? own_hint : HintForFault(code, fault.GetErrorMessage())) {
-    text += std::string("\n  hint: ") + hint;
+    text += "\n  the system says: " + reason;
+    if (own_hint == nullptr)
+      own_hint = "install the library for this kind of model beside the others, in lib/kestrel/plugins";
+  } else if (own_hint == nullptr) {
+    own_hint = HintForFault(code, fault.GetErrorMessage());
   }
+  if (own_hint != nullptr) text += std::string("\n  hint: ") + own_hint;
   return ProgramError(code == KestrelException::kFile ? kInputOutput : kDocument, text);
 }
 
@@ -53,10 +53,6 @@ std::vector<std::string> ModelElements(const std::string& names_file) {
     throw ProgramError(kInputOutput, names_file + ": " + fault.GetErrorMessage());
   }
   return names;
-}
-
-std::unique_ptr<ScoreModel> MakeModel(std::istream& document, const std::vector<std::string>& elements) {
-  return std::unique_ptr<ScoreModel>(ModelFactory::MakeModelFromXML(document, elements, std::string()));
 }
 
 LoadedFields MakeFields(std::istream& document) {
@@ -77,6 +73,36 @@ bool IsWithoutModel(const KestrelException& fault) {
          std::string(fault.GetErrorMessage()).find("Unsupported Model found!") != std::string::npos;
 }
 
+/// Makes the document's model. What the older format's models lack is another export, not an installation.
+std::unique_ptr<ScoreModel> MakeModel(DocumentInput& document, const std::vector<std::string>& elements) {
+  std::unique_ptr<ScoreModel> model;
+  try {
+    model.reset(ModelFactory::MakeModelFromXML(document.Open(), elements, std::string()));
+  } catch (const KestrelException& fault) {
+    const bool lacks_support = fault.GetErrorCode() == KestrelException::kUnsupported;
+    if (!lacks_support || IsWithoutModel(fault) || !document.Holds("<vexa-ml")) throw;
+    throw Describe(
+        document.GetName(), fault,
+        "no library that is installed reads models of the older format (vexa-ml); export the model "
+        "as PMML");
+  }
+  if (model == nullptr)
+    throw ProgramError(kDocument, document.GetName() + ": the model's library made no model of it");
+  return model;
+}
+
+/// The dictionary of a document in the older format; null for another document and for one without it.
+std::unique_ptr<ScoreDictionary> MakeLegacyDictionary(std::istream& document) {
+  try {
+    return ReadLegacyDictionary(document);
+  } catch (const KestrelException& fault) {
+    const bool is_without_dictionary = fault.GetErrorCode() == KestrelException::kStructure &&
+                                       fault.GetErrorMessage() == "<DataDictionary is required !!";
+    if (IsWithoutModel(fault) || is_without_dictionary) return nullptr;
+    throw;
+  }
+}
+
 /// Calls a reader of the document and puts into words what it throws: a model's library may throw anything.
 template <class Reader>
 auto Guard(const std::string& name, const Reader& reader) {
@@ -93,16 +119,6 @@ auto Guard(const std::string& name, const Reader& reader) {
   } catch (...) {
     throw ProgramError(kDocument, name + ": the model's library failed without saying why");
   }
-}
-
-std::unique_ptr<ScoreModel> RequireModel(std::unique_ptr<ScoreModel> model, const std::string& name) {
-  if (model == nullptr) throw ProgramError(kDocument, name + ": the model's library made no model of it");
-  return model;
-}
-
-std::unique_ptr<ScoreModel> ReadModel(std::istream& document, const std::string& name,
-                                      const std::vector<std::string>& elements) {
-  return RequireModel(Guard(name, [&] { return MakeModel(document, elements); }), name);
 }
 
 constexpr char kAcceptedFields[] =
@@ -139,9 +155,8 @@ const std::vector<std::string>& StandardModelElements() {
 
 std::unique_ptr<ScoreModel> LoadModel(const std::string& path, const std::string& names_file) {
   const std::vector<std::string> elements = ModelElements(names_file);
-  if (IsStandardStream(path)) return ReadModel(std::cin, "standard input", elements);
-  std::ifstream document = OpenForReading(path);
-  return ReadModel(document, path, elements);
+  DocumentInput document(path);
+  return Guard(document.GetName(), [&] { return MakeModel(document, elements); });
 }
 
 LoadedFields LoadFields(const std::string& path) {
@@ -168,17 +183,30 @@ LoadedDocument LoadDocument(const std::string& path, const std::string& names_fi
   const std::vector<std::string> elements = ModelElements(names_file);
   DocumentInput document(path);
   const std::string& name = document.GetName();
-  return Guard(name, [&] {
-    LoadedDocument loaded;
-    try {
-      loaded.model = RequireModel(MakeModel(document.Open(), elements), name);
-    } catch (const KestrelException& fault) {
-      if (!names_file.empty() || !IsWithoutModel(fault)) throw;
-      loaded.fields = MakeFields(document.Open());
-      if (!HasFields(loaded.fields)) throw;
+  LoadedDocument loaded;
+  bool is_without_model = false;
+  try {
+    loaded.model = Guard(name, [&] {
+      try {
+        return MakeModel(document, elements);
+      } catch (const KestrelException& fault) {
+        is_without_model = IsWithoutModel(fault);
+        throw;
+      }
+    });
+  } catch (const ProgramError& fault) {
+    // Who names the models that there may be wants one of these.
+    if (fault.GetCode() != kDocument || (is_without_model && !names_file.empty())) throw;
+    loaded.legacy = Guard(name, [&] { return MakeLegacyDictionary(document.Open()); });
+    if (loaded.legacy != nullptr) {
+      if (!is_without_model) loaded.refusal = fault.GetText();
+      return loaded;
     }
-    return loaded;
-  });
+    if (!is_without_model) throw;
+    loaded.fields = Guard(name, [&] { return MakeFields(document.Open()); });
+    if (!HasFields(loaded.fields)) throw;
+  }
+  return loaded;
 }
 
 }  // namespace kestrel_program

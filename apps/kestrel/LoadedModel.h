@@ -20,10 +20,13 @@ struct LoadedFields {
   std::unique_ptr<MCKestrel_800::TransformationDictionary> derived;
 };
 
-/// A document's model or, when it has none, its derived fields.
+/// What a document holds: its model, or else its dictionary in the older format, or else its derived fields.
+/// The others are null.
 struct LoadedDocument {
   std::unique_ptr<MCKestrel_800::ScoreModel> model;
-  LoadedFields fields;  ///< null when there is a model
+  std::unique_ptr<MCKestrel_800::ScoreDictionary> legacy;
+  std::string refusal;  ///< beside `legacy`: why there is no model of the one that is in the document
+  LoadedFields fields;
 };
 
 /// The tags of the model elements that PMML knows, those that may hold others first, because the first one
@@ -41,8 +44,10 @@ std::unique_ptr<MCKestrel_800::ScoreModel> LoadModel(const std::string& path, co
 /// Errors as above, also for a document without derived fields.
 LoadedFields LoadFields(const std::string& path);
 
-/// Reads the model as LoadModel does. A document without any of the standard's models is looked at for
-/// derived fields. Errors as above; for a document with neither, that there is no model.
+/// Reads the model as LoadModel does. Where that fails, a document in the older format (root "vexa-ml") gives
+/// its dictionary; a document without any of the standard's models is looked at for derived fields. Errors as
+/// above, also for a dictionary of the older format that is not good; for a document with nothing of all
+/// this, that there is no model. With a names file there must be one of its models.
 LoadedDocument LoadDocument(const std::string& path, const std::string& names_file);
 
 }  // namespace kestrel_program

@@ -144,6 +144,15 @@ ModelDescription::ModelDescription(const ScoreDictionary& dictionary,
   }
 }
 
+ModelDescription::ModelDescription(const ScoreDictionary& legacy) : is_legacy(true) {
+  for (const std::string& name : legacy.GetVarNames()) {
+    const ScoreDictVar* variable = legacy.GetVar(name);
+    if (variable == nullptr) continue;
+    inputs.push_back(Describe(*variable));
+    inputs.back().role = "data field";
+  }
+}
+
 ModelDescription::~ModelDescription() = default;
 
 }  // namespace kestrel_program

@@ -41,9 +41,12 @@ struct ModelDescription {
   ModelDescription(const MCKestrel_800::ScoreDictionary& dictionary,
                    const MCKestrel_800::TransformationDictionary& transformations,
                    const ExpressionText& expressions);
+  /// Of a dictionary in the older format, without anything that reads its fields.
+  explicit ModelDescription(const MCKestrel_800::ScoreDictionary& legacy);
   ~ModelDescription();
 
-  std::string kind;  ///< empty without a model
+  std::string kind;        ///< empty without a model
+  bool is_legacy = false;  ///< a dictionary of the older format alone
   std::string version;
   bool has_target = false;
   FieldDescription target;

@@ -60,6 +60,20 @@ constexpr HintRow kRows[] = {
     {6, "Variable type doesn't match!", "take numbers"},
     {8, "x: not predefined", "stands before"},
     {8, "d: has to have the same type as x", "mapMissingTo"},
+    {1, "field: should be variable", "variable elements"},
+    {1, "value: should be category", "category elements"},
+    {4, "category is required in range element node!!", "two category elements"},
+    {5, "<Tree>: models of the older document format are not supported!", "as PMML"},
+    {6, "category values are required!!!", "not empty"},
+    {6, "Missing Value and Valid value intersect", "not both"},
+    {6, "Dicitonary is empty!!", "variable elements"},
+    {7, "Varname or storage type can't be null!!", "storage-type"},
+    {7, "Measurement-level can't be null!!", "ORDINAL"},
+    {7, "category value is null!!", "not empty"},
+    {7, "category value is required!!", "not empty"},
+    {8, "x is duplicated!!!", "every variable"},
+    {11, "Invalid measurement-level attribute!!", "upper case"},
+    {11, "VEXATranslator::parseDictionary():Continuous variable should be numeric!!", "NOMINAL"},
 };
 
 TEST(DocumentHints, SayWhatWouldBeAccepted) {
