@@ -1,5 +1,5 @@
-// Bytes as the inside of a DataDictionary: either a proper refusal, or variables whose copies and encoders
-// agree.
+// Bytes as the inside of a DataDictionary, or as a whole document of the older format: either a proper
+// refusal, or variables whose copies and encoders agree.
 
 #include <cstdint>
 #include <memory>
@@ -13,6 +13,7 @@
 #include "kestrel/dictionary/ScoreValueLabelSet.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
+#include "kestrel/translate/VEXATranslator.h"
 #include "tests/support/DictionaryText.h"
 
 namespace {
@@ -27,6 +28,13 @@ int CountFields(const std::string& text) {
   for (size_t at = text.find(tag); at != std::string::npos; at = text.find(tag, at + tag.size()))
     ++count;
   return count;
+}
+
+std::unique_ptr<ScoreDictionary> Read(const std::string& text) {
+  if (text.rfind("<vexa-ml", 0) != 0)
+    return kestrel_test::ReadDictionary(kestrel_test::DictionaryOf(CountFields(text), text));
+  std::istringstream in(text);
+  return ReadLegacyDictionary(in);
 }
 
 std::string Shown(const ScoreDictionary& dictionary) {
@@ -63,10 +71,8 @@ void CheckVariable(const ScoreDictVar& variable) {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
-  const std::string fields(reinterpret_cast<const char*>(data), size);
   try {
-    const auto dictionary =
-        kestrel_test::ReadDictionary(kestrel_test::DictionaryOf(CountFields(fields), fields));
+    const auto dictionary = Read(std::string(reinterpret_cast<const char*>(data), size));
     Check(dictionary != nullptr && dictionary->Size() > 0, "a dictionary that is not refused has variables");
     const auto& variables = dictionary->GetScoreDictVars();
     Check(variables.size() == dictionary->Size(), "all variables are listed");
