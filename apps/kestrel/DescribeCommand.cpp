@@ -41,6 +41,16 @@ Json ToJson(const FieldDescription& field) {
   return object;
 }
 
+Json ToJson(const OutputDescription& field) {
+  Json object;
+  object["name"] = field.name;
+  if (!field.label.empty()) object["label"] = field.label;
+  object["type"] = field.type;
+  object["feature"] = field.feature.empty() ? Json() : Json(field.feature);
+  if (!field.value.empty()) object["value"] = field.value;
+  return object;
+}
+
 Json ToJson(const ModelDescription& model) {
   Json object;
   object["kind"] = model.kind.empty() ? Json() : Json(model.kind);
@@ -53,6 +63,9 @@ Json ToJson(const ModelDescription& model) {
   object["derived"] = Json::array();
   for (const FieldDescription& field : model.derived)
     object["derived"].push_back(ToJson(field));
+  object["outputs"] = Json::array();
+  for (const OutputDescription& field : model.outputs)
+    object["outputs"].push_back(ToJson(field));
   return object;
 }
 
@@ -111,6 +124,28 @@ std::string KindText(const ModelDescription& model) {
   return model.kind.empty() ? "none, derived fields alone" : model.kind;
 }
 
+void AppendDerived(const std::vector<FieldDescription>& derived, std::string& out) {
+  if (derived.empty()) return;
+  out += "derived fields: " + std::to_string(derived.size()) + "\n";
+  std::vector<TableLine> lines = {{"name", "type", "level", "expression"}};
+  for (const FieldDescription& field : derived)
+    lines.push_back({ShownText(field.name), field.type, field.level, field.expression});
+  AppendAligned(lines, out);
+}
+
+void AppendOutputs(const std::vector<OutputDescription>& outputs, std::string& out) {
+  if (outputs.empty()) return;
+  const auto shown = [](const std::string& text) {
+    return text.empty() ? std::string("-") : ShownText(text);
+  };
+  out += "output fields: " + std::to_string(outputs.size()) + "\n";
+  std::vector<TableLine> lines = {{"name", "type", "feature", "value", "label"}};
+  for (const OutputDescription& field : outputs)
+    lines.push_back(
+        {ShownText(field.name), field.type, shown(field.feature), shown(field.value), shown(field.label)});
+  AppendAligned(lines, out);
+}
+
 void AppendText(const ModelDescription& model, std::string& out) {
   out += "kind:    " + KindText(model) + "\n";
   out += "version: " + (model.version.empty() ? std::string("-") : ShownText(model.version)) + "\n";
@@ -128,12 +163,8 @@ void AppendText(const ModelDescription& model, std::string& out) {
       lines.push_back(ToLine(field, !model.is_legacy));
     AppendAligned(lines, out);
   }
-  if (model.derived.empty()) return;
-  out += "derived fields: " + std::to_string(model.derived.size()) + "\n";
-  std::vector<TableLine> lines = {{"name", "type", "level", "expression"}};
-  for (const FieldDescription& field : model.derived)
-    lines.push_back({ShownText(field.name), field.type, field.level, field.expression});
-  AppendAligned(lines, out);
+  AppendDerived(model.derived, out);
+  AppendOutputs(model.outputs, out);
 }
 
 ModelDescription DescribeDocument(const LoadedDocument& loaded, const ExpressionText& expressions) {

@@ -9,9 +9,10 @@
 
 namespace kestrel_program {
 
-/// Writes the model's kind, version, target, inputs and derived fields to the standard output, as a table for
-/// people or as one JSON object. A document without a model has derived fields alone, or in the older format
-/// its dictionary; a model that it has all the same is told of on standard error. Errors: ProgramError.
+/// Writes the model's kind, version, target, inputs, derived and output fields to the standard output, as a
+/// table for people or as one JSON object. A document without a model has derived fields alone, or in the
+/// older format its dictionary; a model that it has all the same is told of on standard error. Errors:
+/// ProgramError.
 ExitCode Describe(const std::string& model, const std::string& names_file, bool as_json);
 
 }  // namespace kestrel_program

@@ -6,6 +6,7 @@
 
 #include "apps/kestrel/DerivedInputs.h"
 #include "apps/kestrel/ExpressionText.h"
+#include "apps/kestrel/OutputColumns.h"
 #include "apps/kestrel/PredictionColumns.h"
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/dictionary/ScoreDictionary.h"
@@ -13,6 +14,7 @@
 #include "kestrel/model/ScoreVersionInfo.h"
 #include "kestrel/transform/TransformVar.h"
 #include "kestrel/transform/TransformationDictionary.h"
+#include "kestrel/translate/ResultVar.h"
 
 namespace kestrel_program {
 namespace {
@@ -22,6 +24,21 @@ using namespace MCKestrel_800;
 /// By the numbers of ScoreModel::VarRole.
 constexpr const char* kRoles[] = {"unused", "target",           "predictor",       "supplementary",
                                   "order",  "frequency weight", "analysis weight", "group"};
+
+/// By the numbers of ScoreResultField::ResultFeature.
+constexpr const char* kFeatures[] = {"",
+                                     "predictedValue",
+                                     "predictedDisplayValue",
+                                     "probability",
+                                     "residual",
+                                     "standardError",
+                                     "clusterId",
+                                     "clusterAffinity",
+                                     "entityId",
+                                     "entityAffinity",
+                                     "warning",
+                                     "ruleValue",
+                                     "standardDeviation"};
 
 /// By the numbers of DateTimeType, as documents write them.
 constexpr const char* kDateTimeTypes[] = {
@@ -95,10 +112,26 @@ std::vector<FieldDescription> DescribeDerived(const TransformationDictionary& di
   return fields;
 }
 
+std::vector<OutputDescription> DescribeOutputs(const ScoreModel& model) {
+  std::vector<OutputDescription> outputs;
+  const ScoreDictionary* dictionary = model.GetResultDictionary();
+  if (dictionary == nullptr) return outputs;
+  for (const std::string& name : dictionary->GetVarNames()) {
+    const ScoreDictVar* variable = dictionary->GetVar(name);
+    if (variable == nullptr) continue;
+    const auto* field = dynamic_cast<const ResultVar*>(variable);
+    const ScoreValue* value = variable->GetDefValue();
+    outputs.push_back({name, variable->GetLabel(), TypeOf(*variable),
+                       field == nullptr ? std::string() : NameOf(field->GetFeature(), kFeatures),
+                       value == nullptr ? std::string() : TextOf(*value)});
+  }
+  return outputs;
+}
+
 }  // namespace
 
 ModelDescription::ModelDescription(const ScoreModel& model, const ExpressionText& expressions)
-    : kind(model.GetModelKind()) {
+    : kind(model.GetModelKind()), outputs(DescribeOutputs(model)) {
   if (const TransformationDictionary* transformations = model.GetTransformationDictionary())
     derived = DescribeDerived(*transformations, expressions);
   if (const ScoreVersionInfo* info = model.GetVersionInfo()) version = info->GetVersionInfo();
@@ -107,6 +140,7 @@ ModelDescription::ModelDescription(const ScoreModel& model, const ExpressionText
     has_target = true;
     target = Describe(*target_variable);
     target.role = NameOf(model.GetVarRole(target_variable), kRoles);
+    target.is_read = ComparesWithTrueValue(model);
   }
   std::unordered_set<std::string> read;
   for (const ScoreDictVar* variable : model.GetPredictors())

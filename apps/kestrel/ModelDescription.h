@@ -35,6 +35,15 @@ struct FieldDescription {
   std::string expression;            ///< of derived fields
 };
 
+/// One output field of the model.
+struct OutputDescription {
+  std::string name;
+  std::string label;
+  std::string type;     ///< as of a FieldDescription
+  std::string feature;  ///< what it tells, by its name in documents; empty for a field that tells nothing
+  std::string value;    ///< the category that a probability or residual is about; empty for the predicted one
+};
+
 struct ModelDescription {
   ModelDescription(const MCKestrel_800::ScoreModel& model, const ExpressionText& expressions);
   /// Of a document that has derived fields and no model.
@@ -53,6 +62,8 @@ struct ModelDescription {
   /// The model's other fields, in the document's order.
   std::vector<FieldDescription> inputs;
   std::vector<FieldDescription> derived;
+  /// In the document's order.
+  std::vector<OutputDescription> outputs;
 };
 
 }  // namespace kestrel_program

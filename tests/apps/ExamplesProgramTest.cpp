@@ -50,6 +50,15 @@ TEST_P(KestrelOutputExamples, AgreeWithTheirTrainingPrograms) {
   ExpectAnswers(GetParam(), "outputs.csv");
 }
 
+TEST_P(KestrelOutputExamples, AreGoodAndCanBeDescribed) {
+  const std::string model = ExamplePath(GetParam(), "model.xml");
+  EXPECT_EQ(RunKestrel({"check", model}).exit_code, 0);
+  const ProgramOutcome description = RunKestrel({"describe", model});
+  EXPECT_EQ(description.exit_code, 0) << description.errors;
+  for (const std::string& name : ReadPlainTable(ExamplePath(GetParam(), "outputs.csv")).header)
+    EXPECT_NE(description.output.find("\n  " + name + "  "), std::string::npos) << name;
+}
+
 INSTANTIATE_TEST_SUITE_P(Examples, KestrelOutputExamples, testing::ValuesIn(FoldersWith("outputs.csv")),
                          [](const auto& example) { return TestNameOf(example.param); });
 
