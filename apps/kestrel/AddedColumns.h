@@ -36,6 +36,8 @@ class AddedColumns {
   virtual const ColumnWords& GetWords() const = 0;
   /// The variables that the table must have columns for. They stay these columns'.
   virtual const std::vector<const MCKestrel_800::ScoreDictVar*>& GetInputs() const = 0;
+  /// A variable whose column is read when the table has it, behind the inputs; null for none.
+  virtual const MCKestrel_800::ScoreDictVar* GetOptionalInput() const { return nullptr; }
   virtual const std::vector<std::string>& GetNames() const = 0;
 
   /// Called before a row is read; not every row can be.

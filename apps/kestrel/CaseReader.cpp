@@ -53,7 +53,8 @@ std::string HintForAbsent(const std::vector<std::string>& absent, const std::vec
 }  // namespace
 
 CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*>& inputs,
-                       const std::vector<std::string>& missing_texts, const char* reader)
+                       const ScoreDictVar* optional, const std::vector<std::string>& missing_texts,
+                       const char* reader)
     : is_number_(table.GetHeader().size(), false),
       missing_texts_(missing_texts),
       record_(static_cast<int>(inputs.size())) {
@@ -67,12 +68,10 @@ CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*
       absent.push_back(variable->GetName());
       continue;
     }
-    inputs_.push_back(MakeInput(*variable, found->second));
-    columns_.push_back(found->second);
-    const Kind kind = inputs_.back().kind;
-    is_number_[found->second] = kind == Kind::kNumber || kind == Kind::kDateTimeNumber;
-    AddSlot(inputs_.back());
+    AddInput(*variable, found->second);
   }
+  const auto found = optional == nullptr ? positions.end() : positions.find(optional->GetName());
+  if (found != positions.end()) AddInput(*optional, found->second);
   if (absent.empty()) return;
   throw ProgramError(kData, table.DescribePlace(table.GetHeaderLine()) + reader + " " + ListNames(absent) +
                                 ", for which there is no column; the columns are " +
@@ -81,6 +80,14 @@ CaseReader::CaseReader(TableReader& table, const std::vector<const ScoreDictVar*
 }
 
 CaseReader::~CaseReader() = default;
+
+void CaseReader::AddInput(const ScoreDictVar& variable, std::size_t column) {
+  inputs_.push_back(MakeInput(variable, column));
+  columns_.push_back(column);
+  const Kind kind = inputs_.back().kind;
+  is_number_[column] = kind == Kind::kNumber || kind == Kind::kDateTimeNumber;
+  AddSlot(inputs_.back());
+}
 
 CaseReader::Input CaseReader::MakeInput(const ScoreDictVar& variable, std::size_t column) {
   Kind kind = Kind::kNumber;

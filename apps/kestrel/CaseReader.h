@@ -33,11 +33,13 @@ class CaseReader {
   };
 
   /// inputs         the variables that are read; they must outlive this object
+  /// optional       another one, read when the table has its column; null for none
   /// missing_texts  what stands for a missing value beside the empty cell
   /// reader         who reads them, as messages put it: "the model reads"
   /// Errors: ProgramError kData that names the inputs without a column and the columns that are there.
   CaseReader(TableReader& table, const std::vector<const MCKestrel_800::ScoreDictVar*>& inputs,
-             const std::vector<std::string>& missing_texts, const char* reader);
+             const MCKestrel_800::ScoreDictVar* optional, const std::vector<std::string>& missing_texts,
+             const char* reader);
   ~CaseReader();
   CaseReader(const CaseReader&) = delete;
   CaseReader& operator=(const CaseReader&) = delete;
@@ -48,7 +50,7 @@ class CaseReader {
 
   const MCKestrel_800::CaseRecord& GetRecord() const { return record_; }
 
-  /// The columns that feed inputs, in the inputs' order.
+  /// The columns that feed inputs, in the inputs' order, and that of the optional one if there is one.
   const std::vector<std::size_t>& GetColumns() const { return columns_; }
   /// Whether a column feeds an input that is a number.
   bool IsNumber(std::size_t column) const { return is_number_[column]; }
@@ -64,6 +66,7 @@ class CaseReader {
     std::unique_ptr<MCKestrel_800::StringValue> parked;
   };
 
+  void AddInput(const MCKestrel_800::ScoreDictVar& variable, std::size_t column);
   static Input MakeInput(const MCKestrel_800::ScoreDictVar& variable, std::size_t column);
   static std::string WhatIsAccepted(const Input& input);
   void AddSlot(const Input& input);

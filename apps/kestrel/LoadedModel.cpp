@@ -36,7 +36,9 @@ ProgramError Describe(const std::string& name, const KestrelException& fault,
   if (code == KestrelException::kUnsupported && !reason.empty()) {
     text += "\n  the system says: " + reason;
     if (own_hint == nullptr)
-      own_hint = "install the library for this kind of model beside the others, in lib/kestrel/plugins";
+      own_hint = reason.find("built for Kestrel") != std::string::npos
+                     ? "build the library for this kind of model again, with this version's headers"
+                     : "install the library for this kind of model beside the others, in lib/kestrel/plugins";
   } else if (own_hint == nullptr) {
     own_hint = HintForFault(code, fault.GetErrorMessage());
   }

@@ -6,7 +6,6 @@
 
 #include "apps/kestrel/DerivedInputs.h"
 #include "apps/kestrel/ExpressionText.h"
-#include "apps/kestrel/OutputColumns.h"
 #include "apps/kestrel/PredictionColumns.h"
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/dictionary/ScoreDictionary.h"
@@ -140,7 +139,6 @@ ModelDescription::ModelDescription(const ScoreModel& model, const ExpressionText
     has_target = true;
     target = Describe(*target_variable);
     target.role = NameOf(model.GetVarRole(target_variable), kRoles);
-    target.is_read = ComparesWithTrueValue(model);
   }
   std::unordered_set<std::string> read;
   for (const ScoreDictVar* variable : model.GetPredictors())

@@ -59,7 +59,6 @@ class ScoredColumns : public AddedColumns {
         predictors_(model_->GetPredictors()),
         result_(model_->MakeResult()),
         outputs_(*model_, result_.get()) {
-    SetInputs();
     std::vector<std::string> names = outputs_.GetNames();
     if (names.empty() || shows_all) {
       predictions_.emplace(*model_, result_.get());
@@ -74,7 +73,12 @@ class ScoredColumns : public AddedColumns {
   }
 
   const ColumnWords& GetWords() const override { return kWords; }
-  const std::vector<const ScoreDictVar*>& GetInputs() const override { return inputs_; }
+  const std::vector<const ScoreDictVar*>& GetInputs() const override { return predictors_; }
+  const ScoreDictVar* GetOptionalInput() const override {
+    const ScoreDictVar* target = model_->GetTargetVar();
+    const bool is_input = std::find(predictors_.begin(), predictors_.end(), target) != predictors_.end();
+    return !is_input && ComparesWithTrueValue(*model_) ? target : nullptr;
+  }
   const std::vector<std::string>& GetNames() const override { return names_; }
 
   void BeginCase() override {
@@ -103,14 +107,6 @@ class ScoredColumns : public AddedColumns {
   }
 
  private:
-  /// The true value of the target stands behind what the model predicts from.
-  void SetInputs() {
-    inputs_ = predictors_;
-    const ScoreDictVar* target = model_->GetTargetVar();
-    if (target == nullptr || !ComparesWithTrueValue(*model_)) return;
-    if (std::find(inputs_.begin(), inputs_.end(), target) == inputs_.end()) inputs_.push_back(target);
-  }
-
   /// A model that has nothing to tell would leave the user to wonder about an empty column.
   void WriteExplanation(bool is_scored, TableWriter& writer, Progress& progress) {
     if (is_scored && !any_is_scored_ && !explanation_->HasPath()) {
@@ -155,7 +151,6 @@ class ScoredColumns : public AddedColumns {
 
   std::unique_ptr<ScoreModel> model_;
   std::vector<const ScoreDictVar*> predictors_;
-  std::vector<const ScoreDictVar*> inputs_;
   std::unique_ptr<ScoreResult> result_;
   OutputColumns outputs_;
   std::optional<PredictionColumns> predictions_;

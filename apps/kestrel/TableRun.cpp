@@ -46,7 +46,7 @@ TableRun::TableRun(const TableOptions& options, AddedColumns& added)
       added_(added),
       input_(options.data),
       table_(input_, options.delimiter),
-      cases_(table_, added.GetInputs(), options.missing, added.GetWords().reader) {}
+      cases_(table_, added.GetInputs(), added.GetOptionalInput(), options.missing, added.GetWords().reader) {}
 
 TableRun::~TableRun() = default;
 

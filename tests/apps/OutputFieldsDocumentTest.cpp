@@ -86,19 +86,6 @@ TEST(KestrelDescribeOutputs, StandBehindTheDerivedFields) {
             "  y1    number  predictedValue  -      -\n");
 }
 
-TEST(KestrelDescribeOutputs, SaysWhenTheTargetIsRead) {
-  const std::pair<const char*, bool> rows[] = {
-      {"", false},
-      {"<Output><OutputField name='z'/></Output>", false},
-      {"<Output><OutputField name='z'/><OutputField name='r' feature='residual'/></Output>", true},
-  };
-  for (const auto& [output, is_read] : rows) {
-    const nlohmann::json model = nlohmann::json::parse(
-        RunKestrel({"describe", "-", "--json"}, DocumentWith("line.xml", output)).output);
-    EXPECT_EQ(model["target"]["read"], is_read) << output;
-  }
-}
-
 TEST(KestrelDescribeOutputs, AreNotThereWhenNoneAreDeclared) {
   EXPECT_EQ(RunKestrel({"describe", "D/line.xml"}).output.find("output"), std::string::npos);
   for (const char* document : {"D/line.xml", "D/derived.xml"}) {

@@ -36,6 +36,11 @@ inline std::vector<std::string> DerivedExampleFolders() {
   return FoldersWith("derived.csv");
 }
 
+/// Those whose documents declare output fields.
+inline std::vector<std::string> OutputExampleFolders() {
+  return FoldersWith("outputs.csv");
+}
+
 /// The model elements that examples hold.
 inline const std::vector<std::string>& ExampleKinds() {
   static const std::vector<std::string> kinds = {"RegressionModel", "TreeModel", "RuleSetModel"};
