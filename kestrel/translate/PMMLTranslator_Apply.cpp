@@ -209,7 +209,7 @@ std::unique_ptr<ScoreValue> ApplyReader::ReadReplacement(const DOMElement* apply
   if (function.result == Kind::kNumber) return std::make_unique<NumericValue>(VerifyDoubleAt(apply, text));
   const std::string narrow = Narrow(text);
   if (function.result != Kind::kText) {
-    if (auto number = NumberOf(narrow); number != nullptr && !variable_.IsString()) return number;
+    if (auto number = NumberOf(narrow); number != nullptr) return number;
   }
   return std::make_unique<StringValue>(narrow);
 }

@@ -165,4 +165,21 @@ TEST(DerivedFieldReader, WhatWasReadComputes) {
   }
 }
 
+TEST(DerivedFieldReader, ReplacementsAreNumbersInTheTreeOfATextToo) {
+  const char* const kReplaced[] = {
+      "<Apply function='if' mapMissingTo='3'><FieldRef field='y'/><FieldRef field='x'/></Apply>",
+      "<Apply function='imputeCatFieldMissingAgainstConTarget' mapMissingTo='3'><FieldRef field='code'/>"
+      "<FieldRef field='x'/><Array type='real' n='1'>1</Array><Array type='real' n='1'>1</Array></Apply>",
+  };
+  for (const char* replaced : kReplaced) {
+    const DerivedFields fields = ReadDerivedField(
+        kCategory, std::string("<Apply function='substr'><FieldRef field='free'/>") + replaced + "</Apply>");
+    fields.derived->SetUpDerivedCaseRecord();
+    CaseRecord record;
+    record.Add("free", new StringValue("abcdef"));
+    ASSERT_NE(fields.derived->GetValuesForDerivedVars(&record, fields.data.get()), nullptr);
+    EXPECT_EQ(TextOf(fields.derived->GetVarValue("d")), "cdef") << replaced;
+  }
+}
+
 }  // namespace
