@@ -75,20 +75,6 @@ StringValue TextOrEmpty(const ScoreValue* value) {
 
 }  // namespace
 
-/// Counts how deep the compiler is in the tree.
-class ApplyCompiler::Level {
- public:
-  explicit Level(ApplyCompiler& compiler) : compiler_(compiler) {
-    if (++compiler_.depth_ > ApplyProgram::kMaxDepth) compiler_.is_too_deep_ = true;
-  }
-  ~Level() { --compiler_.depth_; }
-  Level(const Level&) = delete;
-  Level& operator=(const Level&) = delete;
-
- private:
-  ApplyCompiler& compiler_;
-};
-
 FunctionValueKind ApplyCompiler::KindOf(const FunctionTree* node) const {
   // Down the arguments that decide: in a loop, since trees may be deep.
   for (int depth = 0; node != nullptr && depth < ApplyProgram::kMaxDepth; ++depth) {
@@ -160,7 +146,9 @@ const double* ApplyCompiler::Seconds(const FunctionTree* node) {
     const Level level(*this);
     return is_too_deep_ ? MissingNumber() : Choose(*node, &ApplyCompiler::Seconds);
   }
-  return KindOf(node) == Kind::kDateTime ? Number(node) : MissingNumber();
+  if (KindOf(node) != Kind::kDateTime) return MissingNumber();
+  // What replaces a missing result is a number, and no date/time.
+  return FunctionOf(*node) == kImputeFunction ? NumberOfImputation(*node) : Number(node);
 }
 
 const double* ApplyCompiler::NumberOfReference(Node node) {
@@ -243,6 +231,7 @@ const double* ApplyCompiler::NumberOfComparison(Node node) {
   const TransformFunction function = FunctionOf(node);
   const FunctionTree* const left = ChildOf(node, 0);
   const FunctionTree* const right = ChildOf(node, 1);
+  if (node.GetChildCount() == 2 && (IsOfOpenKind(left) || IsOfOpenKind(right))) return CompareValues(node);
   const Kind kind = KindOf(left);
   if (node.GetChildCount() != 2 || kind != KindOf(right)) {
     return NewConstant(function == kNotEqualFunction ? 1.0 : 0.0);
@@ -260,18 +249,23 @@ const double* ApplyCompiler::NumberOfValueList(Node node) {
   const TransformFunction function = FunctionOf(node);
   const FunctionTree* const argument = ChildOf(node, 0);
   if (argument == nullptr) return NewConstant(function == kIsNotInFunction ? 1.0 : 0.0);
+  const bool is_open = IsOfOpenKind(argument);
   const Kind kind = KindOf(argument);
   ApplyDetail& detail = NewDetail();
   for (const ScoreValue* value : node.GetNodeStats().GetArray(0)) {
-    if (value == nullptr || KindOfValue(value) != kind) continue;
-    if (kind == Kind::kText) {
+    const Kind listed = KindOfValue(value);
+    if (value == nullptr || (listed != kind && !is_open)) continue;
+    if (listed == Kind::kText) {
       detail.listed_texts.emplace_back(WithoutTrailingBlanks(value->GetString()));
     } else if (std::isfinite(value->GetDouble())) {  // anything else equals nothing
-      detail.listed_numbers.push_back(value->GetDouble());
+      (is_open && listed == Kind::kDateTime ? detail.listed_seconds : detail.listed_numbers)
+          .push_back(value->GetDouble());
     }
   }
   std::sort(detail.listed_texts.begin(), detail.listed_texts.end());
   std::sort(detail.listed_numbers.begin(), detail.listed_numbers.end());
+  std::sort(detail.listed_seconds.begin(), detail.listed_seconds.end());
+  if (is_open) return FindValue(node, detail);
   if (kind != Kind::kText) {
     return EmitNumber(ApplySteps::FindNumber, function, Number(argument), nullptr, &detail);
   }
@@ -311,27 +305,6 @@ const double* ApplyCompiler::MethodOfOutliers(const FunctionTree* node) {
   return NewConstant(name == "asMissingValues" ? ScoreDictVar::kAsMissingValues : ScoreDictVar::kAsIs);
 }
 
-// Both arguments are laid out as the kind that is needed, whatever the other one is.
-const double* ApplyCompiler::Choose(Node node, const double* (ApplyCompiler::*lay_out)(const FunctionTree*)) {
-  const double* const condition = Number(ChildOf(node, 0));
-  program_.numbers_.push_back(NumericValue::gSysmisValue);
-  double* const out = &program_.numbers_.back();
-  const std::size_t test = program_.code_.size();
-  Emit(ApplySteps::SkipUnlessOne).x = condition;
-  const auto copy = [this, out](const double* from) {
-    ApplyInstruction& step = Emit(ApplySteps::Copy);
-    step.x = from;
-    step.out = out;
-  };
-  copy((this->*lay_out)(ChildOf(node, 1)));
-  const std::size_t jump = program_.code_.size();
-  Emit(ApplySteps::Skip);
-  program_.code_[test].skip = static_cast<std::uint32_t>(jump - test);
-  copy((this->*lay_out)(ChildOf(node, 2)));
-  program_.code_[jump].skip = static_cast<std::uint32_t>(program_.code_.size() - jump - 1);
-  return out;
-}
-
 const double* ApplyCompiler::NumberOfImputation(Node node) {
   ApplyDetail& detail = NewDetail();
   if (!ReadImputation(node, detail) || KindOf(ChildOf(node, 0)) == Kind::kText) return MissingNumber();
@@ -362,10 +335,15 @@ bool ApplyCompiler::ReadImputation(Node node, ApplyDetail& detail) {
 }
 
 const double* ApplyCompiler::Replaced(Node node, const double* result) {
+  const double* const replacement = ReplacementOf(node);
+  return replacement == nullptr ? result
+                                : EmitNumber(ApplySteps::ReplaceSysmis, kNoFunction, result, replacement);
+}
+
+// Null when there is none.
+const double* ApplyCompiler::ReplacementOf(Node node) {
   const ScoreValue* const replacement = node.GetNodeStats().GetRecodeMissValueTo();
-  if (replacement == nullptr) return result;
-  return EmitNumber(ApplySteps::ReplaceSysmis, kNoFunction, result,
-                    NewConstant(NumberOrMissing(replacement)));
+  return replacement == nullptr ? nullptr : NewConstant(NumberOrMissing(replacement));
 }
 
 ApplyText ApplyCompiler::Text(const FunctionTree* node) {
@@ -419,38 +397,21 @@ ApplyText ApplyCompiler::TextOfFunction(Node node, const BuiltinFunction& functi
   return &program_.text_places_.front();
 }
 
-ApplyText ApplyCompiler::TextOfIf(Node node) {
-  const double* const condition = Number(ChildOf(node, 0));
-  program_.text_places_.push_front(*EmptyText());
-  const StringValue** const out = &program_.text_places_.front();
-  const std::size_t test = program_.code_.size();
-  Emit(ApplySteps::SkipUnlessOne).x = condition;
-  const auto copy = [this, out](ApplyText from) {
-    ApplyDetail& detail = NewDetail();
-    detail.texts = {from};
-    detail.place_out = out;
-    Emit(ApplySteps::CopyText).detail = &detail;
-  };
-  copy(Text(ChildOf(node, 1)));
-  const std::size_t jump = program_.code_.size();
-  Emit(ApplySteps::Skip);
-  program_.code_[test].skip = static_cast<std::uint32_t>(jump - test);
-  copy(Text(ChildOf(node, 2)));
-  program_.code_[jump].skip = static_cast<std::uint32_t>(program_.code_.size() - jump - 1);
-  return out;
-}
-
 ApplyText ApplyCompiler::TextOfImputation(Node node) {
   ApplyDetail& detail = NewDetail();
   if (!ReadImputation(node, detail) || KindOf(ChildOf(node, 0)) != Kind::kText) return EmptyText();
   detail.texts = {Text(ChildOf(node, 0))};
   const double* const number = Number(ChildOf(node, 1));
-  program_.text_places_.push_front(*EmptyText());
-  detail.place_out = &program_.text_places_.front();
+  detail.place_out = NewTextPlace();
   ApplyInstruction& step = Emit(ApplySteps::ImputeText, kImputeFunction);
   step.y = number;
   step.detail = &detail;
   return detail.place_out;
+}
+
+double* ApplyCompiler::NewPlace() {
+  program_.numbers_.push_back(NumericValue::gSysmisValue);
+  return &program_.numbers_.back();
 }
 
 const double* ApplyCompiler::NewConstant(double number) {

@@ -7,7 +7,7 @@
 
 namespace MCKestrel_800 {
 
-ApplyProgram::ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find,
+ApplyProgram::ApplyProgram(const FunctionTree& root, FunctionValueKind wanted, const FindSource& find,
                            std::deque<double>& numbers)
     : numbers_(numbers) {
   numbers_.push_back(NumericValue::gSysmisValue);
@@ -18,8 +18,10 @@ ApplyProgram::ApplyProgram(const FunctionTree& root, bool wants_text, const Find
   number_ = missing;
   text_ = empty;
   ApplyCompiler compiler(*this, find);
-  if (wants_text) {
+  if (wanted == FunctionValueKind::kText) {
     text_ = compiler.Text(&root);
+  } else if (wanted == FunctionValueKind::kDateTime) {
+    number_ = compiler.Seconds(&root);
   } else {
     number_ = compiler.Result(root);
   }

@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "kestrel/foundation/StringValue.h"
+#include "kestrel/transform/BuiltinFunctions.h"
 #include "kestrel/transform/TransformFunction.h"
 
 namespace MCKestrel_800 {
@@ -40,8 +41,8 @@ using ApplyText = const StringValue* const*;
 /// Computes the value of a tree for the case that its source fields hold.
 ///
 /// Every node is, by what it is and not by the case, a number, a text or a date/time (held as the number of
-/// its seconds); `if` and the imputation are what their chosen argument is. Where another kind is needed than
-/// a node is, it counts as missing, but that a date/time is a number where one is needed.
+/// its seconds); the imputation is what its field is, and `if` what its chosen argument is. Where another
+/// kind is needed than a node is, it counts as missing, but that a date/time is a number where one is needed.
 ///
 /// Nothing is allocated from the second case on, but for texts that are longer than all before.
 class ApplyProgram {
@@ -51,11 +52,12 @@ class ApplyProgram {
   /// Deeper trees have no value.
   static constexpr int kMaxDepth = 512;
 
+  /// wanted  what is needed of the tree: a number, a text or a date/time.
   /// find  gives the field of a name that the tree refers to, which must outlive the program. The tree is not
   ///       needed afterwards, but for the variables of its fields.
   /// numbers  where the program's constants and results are put, behind those of others: what is computed
   ///       together lies together. Must outlive the program.
-  ApplyProgram(const FunctionTree& root, bool wants_text, const FindSource& find,
+  ApplyProgram(const FunctionTree& root, FunctionValueKind wanted, const FindSource& find,
                std::deque<double>& numbers);
   ApplyProgram(const ApplyProgram&) = delete;
   ApplyProgram& operator=(const ApplyProgram&) = delete;
@@ -71,7 +73,8 @@ class ApplyProgram {
     for (const ApplyInstruction* step = code_.data(); step != end;)
       step = step->run(*step);
   }
-  /// The system-missing value, or what is no finite number, when the tree has none.
+  /// Or the seconds of a date/time. The system-missing value, or what is no finite number, when the tree has
+  /// none.
   double GetNumber() const { return *number_; }
   const StringValue& GetText() const { return **text_; }
 

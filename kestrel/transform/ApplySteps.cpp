@@ -5,6 +5,7 @@
 #include <string_view>
 
 #include "kestrel/foundation/NumericValue.h"
+#include "kestrel/transform/BuiltinFunctions.h"
 #include "kestrel/transform/FunctionEvaluation.h"
 #include "kestrel/transform/SourceField.h"
 
@@ -29,6 +30,28 @@ Next GiveTest(Step step, bool holds, TransformFunction opposite) {
 
 const StringValue& TextOf(Step step, std::size_t index = 0) {
   return **step.detail->texts[index];
+}
+
+// Whether a kind that the case has decided is this one.
+bool IsKind(double number, FunctionValueKind kind) {
+  return number == static_cast<double>(kind);
+}
+
+bool AreEqualTexts(Step step) {
+  return WithoutTrailingBlanks(TextOf(step).GetText()) == WithoutTrailingBlanks(TextOf(step, 1).GetText());
+}
+
+// What equals a number lies next to where it would stand itself.
+bool IsListed(const std::vector<double>& listed, double x) {
+  const auto above = std::lower_bound(listed.begin(), listed.end(), x);
+  return (above != listed.end() && NumericValue::IsEqual(*above, x)) ||
+         (above != listed.begin() && NumericValue::IsEqual(*(above - 1), x));
+}
+
+bool IsListed(const std::vector<std::string>& listed, const StringValue& value) {
+  const std::string_view text = WithoutTrailingBlanks(value.GetText());
+  const auto found = std::lower_bound(listed.begin(), listed.end(), text);
+  return found != listed.end() && *found == text;
 }
 
 }  // namespace
@@ -114,26 +137,37 @@ Next CompareNumbers(Step step) {
 }
 
 Next CompareTexts(Step step) {
-  const bool are_equal =
-      WithoutTrailingBlanks(TextOf(step).GetText()) == WithoutTrailingBlanks(TextOf(step, 1).GetText());
-  return GiveTest(step, are_equal, kNotEqualFunction);
+  return GiveTest(step, AreEqualTexts(step), kNotEqualFunction);
 }
 
-// What equals a number lies next to where it would stand itself.
 Next FindNumber(Step step) {
-  const std::vector<double>& listed = step.detail->listed_numbers;
-  const double x = *step.x;
-  const auto above = std::lower_bound(listed.begin(), listed.end(), x);
-  const bool is_listed = (above != listed.end() && NumericValue::IsEqual(*above, x)) ||
-                         (above != listed.begin() && NumericValue::IsEqual(*(above - 1), x));
-  return GiveTest(step, is_listed, kIsNotInFunction);
+  return GiveTest(step, IsListed(step.detail->listed_numbers, *step.x), kIsNotInFunction);
 }
 
 Next FindText(Step step) {
-  const std::vector<std::string>& listed = step.detail->listed_texts;
-  const std::string_view text = WithoutTrailingBlanks(TextOf(step).GetText());
-  const auto found = std::lower_bound(listed.begin(), listed.end(), text);
-  return GiveTest(step, found != listed.end() && *found == text, kIsNotInFunction);
+  return GiveTest(step, IsListed(step.detail->listed_texts, TextOf(step)), kIsNotInFunction);
+}
+
+Next CompareValues(Step step) {
+  const std::vector<const double*>& numbers = step.detail->numbers;
+  bool are_equal = *numbers[0] == *numbers[2];
+  if (are_equal) {
+    are_equal = IsKind(*numbers[0], FunctionValueKind::kText)
+                    ? AreEqualTexts(step)
+                    : NumericValue::IsEqual(*numbers[1], *numbers[3]);
+  }
+  return GiveTest(step, are_equal, kNotEqualFunction);
+}
+
+Next FindValue(Step step) {
+  const ApplyDetail& detail = *step.detail;
+  const double kind = *detail.numbers[0];
+  const double number = *detail.numbers[1];
+  const bool is_listed = IsKind(kind, FunctionValueKind::kText) ? IsListed(detail.listed_texts, TextOf(step))
+                         : IsKind(kind, FunctionValueKind::kDateTime)
+                             ? IsListed(detail.listed_seconds, number)
+                             : IsListed(detail.listed_numbers, number);
+  return GiveTest(step, is_listed, kIsNotInFunction);
 }
 
 Next TestMissing(Step step) {
@@ -178,6 +212,11 @@ Next ImputeText(Step step) {
 
 Next ReplaceSysmis(Step step) {
   return Give(step, IsMissingNumber(*step.x) ? *step.y : *step.x);
+}
+
+Next ReplaceSysmisNumber(Step step) {
+  const bool is_number = IsKind(*step.detail->numbers[0], FunctionValueKind::kNumber);
+  return Give(step, is_number && IsMissingNumber(*step.x) ? *step.y : *step.x);
 }
 
 Next ReplaceMissingNumber(Step step) {

@@ -27,6 +27,7 @@ struct ApplyDetail {
 
   // Of a list of values, ascending, texts without trailing blanks.
   std::vector<double> listed_numbers;
+  std::vector<double> listed_seconds;  ///< where the case decides whether a date/time is looked for
   std::vector<std::string> listed_texts;
   // Of an imputation, by category; the means are `values`.
   std::vector<double> variances;
@@ -63,7 +64,9 @@ Next CompareNumbers(Step step);
 Next CompareTexts(Step step);
 Next FindNumber(Step step);
 Next FindText(Step step);
-Next TestMissing(Step step);  ///< of the source
+Next CompareValues(Step step);  ///< numbers: kind and number of the first, then of the second
+Next FindValue(Step step);      ///< numbers: kind and number
+Next TestMissing(Step step);    ///< of the source
 Next TestSysmis(Step step);
 
 // Others.
@@ -74,6 +77,7 @@ Next ImputeText(Step step);
 
 // Replacing what is missing: x (the first text) is the value, y (the second) the replacement.
 Next ReplaceSysmis(Step step);
+Next ReplaceSysmisNumber(Step step);   ///< numbers: the kind; a missing date/time stays
 Next ReplaceMissingNumber(Step step);  ///< of the source
 Next ReplaceMissingText(Step step);
 

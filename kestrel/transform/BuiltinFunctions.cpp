@@ -187,9 +187,10 @@ constexpr BuiltinFunction kFunctions[] = {
     FieldTest("isNotMissing", kIsNotMissingFunction, Nesting::kOther,
               "0 when the value of the field is missing by the rules of the field, else 1"),
     Test("equal", kEqualFunction, Family::kComparison, kTwo,
-         "1 when both values are of one kind and equal, else 0; two missing numbers are equal"),
+         "1 when both values are of one kind and equal, else 0; two missing numbers are equal; an if is of "
+         "the kind that it chose"),
     Test("notEqual", kNotEqualFunction, Family::kComparison, kTwo,
-         "0 when both values are of one kind and equal, else 1"),
+         "0 when both values are of one kind and equal, else 1; an if is of the kind that it chose"),
     Logical("lessThan", kLessThanFunction, kTwo, "1 when x < y, else 0"),
     Logical("lessOrEqual", kLessOrEqualFunction, kTwo, "1 when x <= y, else 0"),
     Logical("greaterThan", kGreaterThanFunction, kTwo, "1 when x > y, else 0"),

@@ -30,6 +30,17 @@ std::size_t PlaceOfCode(int code) {
   return static_cast<std::size_t>(code) + 1;
 }
 
+FunctionValueKind KindOf(FieldEvaluation::Storage storage) {
+  switch (storage) {
+    case FieldEvaluation::Storage::kNumber:
+      return FunctionValueKind::kNumber;
+    case FieldEvaluation::Storage::kText:
+      return FunctionValueKind::kText;
+    default:
+      return FunctionValueKind::kDateTime;
+  }
+}
+
 unsigned long long StampOf(const ScoreDictionary* dictionary) {
   return dictionary == nullptr ? 0 : dictionary->GetLayoutStamp();
 }
@@ -176,12 +187,12 @@ void DerivationPlan::PrepareStep(Step& step, const ApplyProgram::FindSource& fin
   } else if (kind == TransExpression::kMapValues || kind == TransExpression::kNormDiscrete) {
     UseCodes(step);
   } else if (kind == TransExpression::kApply && step.field->GetRoot() != nullptr) {
-    const bool is_text = storage == FieldEvaluation::Storage::kText;
-    step.program = std::make_unique<ApplyProgram>(*step.field->GetRoot(), is_text, find, program_numbers_);
+    const FunctionValueKind wanted = KindOf(storage);
+    step.program = std::make_unique<ApplyProgram>(*step.field->GetRoot(), wanted, find, program_numbers_);
     step.task.program = step.program.get();
-    step.task.run = is_text                                        ? RunTextTree
-                    : storage == FieldEvaluation::Storage::kNumber ? RunNumberTree
-                                                                   : RunDateTree;
+    step.task.run = wanted == FunctionValueKind::kText     ? RunTextTree
+                    : wanted == FunctionValueKind::kNumber ? RunNumberTree
+                                                           : RunDateTree;
   }
 }
 

@@ -52,6 +52,13 @@ inline MCKestrel_800::FunctionTree* Call(MCKestrel_800::TransformFunction functi
     node->Add(argument);
   return node;
 }
+/// The same tree with a number in place of a missing result.
+inline MCKestrel_800::FunctionTree* WithReplacement(MCKestrel_800::FunctionTree* tree, double number) {
+  MCKestrel_800::ApplyNodeStats stats(tree->GetNodeStats());
+  stats.SetRecodeMissValueTo(Number(number));
+  tree->SetNodeStats(stats);
+  return tree;
+}
 
 /// A field of each kind as tests want it; the dictionary that it is added to owns it.
 inline MCKestrel_800::TransformVar* NewField(
