@@ -1,9 +1,13 @@
 """Apply expressions: trees whose nodes are functions, fields and constants.
 
 What a node is - a number, a text or a date/time - is known before any case: a field's by its variable, a constant's by
-its dataType, a function's by its result, that of "if" by its second argument. Where another kind is needed, a text
-counts as the missing number, a number as the empty text, a date/time as the number of its seconds. What "if" chooses is
-asked for the kind that is needed of the "if", whatever the other argument is.
+its dataType, a function's by its result. Where another kind is needed, a text counts as the missing number, a number as
+the empty text, a date/time as the number of its seconds. What "if" chooses is asked for the kind that is needed of the
+"if", whatever the other argument is; where none is needed, the value is that of the chosen argument as it is. An absent
+argument is the missing value of the second one's kind.
+
+"mapMissingTo" stands for a number that is missing, also where "if" or the imputation has something else to give and a
+number is needed of it.
 """
 import math
 
@@ -11,14 +15,15 @@ import functions
 from fields import children, local_name
 from functions import finite
 from values import (EMPTY, MISSING, MOMENT, NUMBER, TEXT, Moment, Text, date_of_days, is_system_missing, kind_of_type,
-                    listed_value, nothing, number_from_text, number_that_is, numbers_equal, text_of, value_from_text,
-                    values_equal)
+                    kind_of_value, listed_value, nothing, number_from_text, number_that_is, numbers_equal, text_of,
+                    value_from_text, values_equal)
 
 DIFFERENCES = {
     "date_years_difference": (86400.0, 365.25), "date_months_difference": (86400.0, 30.4375),
     "date_days_difference": (86400.0, 1.0), "time_hours_difference": (3600.0, 1.0),
     "time_minutes_difference": (60.0, 1.0), "time_seconds_difference": (1.0, 1.0),
 }
+IMPUTATION = "imputeCatFieldMissingAgainstConTarget"
 PARTS = ("year-from-date", "month-from-date", "day-from-date", "hour-from-time", "minute-from-time", "second-from-time")
 
 
@@ -100,17 +105,25 @@ class FunctionNode:
     def result_kind(self):
         if self.name in functions.TEXTS or self.name in ("concat", "substr"):
             return TEXT
-        decider = {"if": 1, "imputeCatFieldMissingAgainstConTarget": 0}.get(self.name)
+        decider = {"if": 1, IMPUTATION: 0}.get(self.name)
         return NUMBER if decider is None else self.arguments[decider].kind
 
     def value(self, case):
-        return self.value_as(case, self.kind)
+        if self.name != "if":
+            return self.value_as(case, self.kind)
+        chosen = self.choice(case, *self.arguments)
+        value = chosen.value(case) if chosen else nothing(self.kind)
+        return self.number_or_replacement(value) if kind_of_value(value) == NUMBER else value
 
     def value_as(self, case, kind):
-        if self.name != "if":
+        if self.name == "if":
+            chosen = self.choice(case, *self.arguments)
+            value = chosen.value_as(case, kind) if chosen else nothing(kind)
+        elif self.name == IMPUTATION:
+            value = AS_KIND[kind](self.compute(case))
+        else:
             value = AS_KIND[self.kind](self.compute(case))
             return AS_KIND[kind](value if self.kind != NUMBER else self.number_or_replacement(value))
-        value = self.choose(case, kind, *self.arguments)
         return value if kind != NUMBER else self.number_or_replacement(value)
 
     def number_or_replacement(self, number):
@@ -194,10 +207,9 @@ class FunctionNode:
     def is_not_in(self, case, argument):
         return 1.0 - self.is_in(case, argument)
 
-    def choose(self, case, kind, condition, *branches):
-        is_true = numbers_equal(condition.value_as(case, NUMBER), 1.0)
-        chosen = branches[:1] if is_true else branches[1:2]
-        return chosen[0].value_as(case, kind) if chosen else nothing(kind)
+    def choice(self, case, condition, second, third=None):
+        """The chosen argument, None when it is absent."""
+        return second if numbers_equal(condition.value_as(case, NUMBER), 1.0) else third
 
     def impute(self, case, category, number):
         # A host that has no text for a record's slot leaves it empty.
@@ -215,7 +227,7 @@ class FunctionNode:
         "concat": concat, "substr": substr, "length": length, "sysmis": sysmis, "value": number,
         "recast_to_ordinal": number, "recast_to_scale": number, "outlierHandle": outlier_handle,
         "isMissing": is_missing, "isNotMissing": is_not_missing, "equal": equal, "notEqual": not_equal,
-        "isIn": is_in, "isNotIn": is_not_in, "imputeCatFieldMissingAgainstConTarget": impute,
+        "isIn": is_in, "isNotIn": is_not_in, IMPUTATION: impute,
         **dict.fromkeys(DIFFERENCES, difference), **dict.fromkeys(PARTS, part),
     }
 

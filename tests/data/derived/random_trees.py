@@ -24,17 +24,15 @@ BY_KIND = {
     TEXT: sorted(set(TEXTS) | {"concat", "substr", "if", "imputeCatFieldMissingAgainstConTarget"}),
     MOMENT: ["if"],
 }
+CHOICES = ["if", "imputeCatFieldMissingAgainstConTarget"]
 PAIRS = ["equal", "notEqual", "lessThan", "lessOrEqual", "greaterThan", "greaterOrEqual"]
 
 
 class RandomTree:
-    """Makes trees over fields.
+    """Makes trees over fields: those that may be read."""
 
-    `fields` is the list of those that may be read; `mixed` are the kinds that the branches of an "if" may have side by
-    side; `replaces_choices` allows "mapMissingTo" of an "if"."""
-
-    def __init__(self, rng, fields, mixed=(NUMBER, TEXT, MOMENT), replaces_choices=True):
-        self.rng, self.fields, self.mixed, self.replaces_choices = rng, fields, mixed, replaces_choices
+    def __init__(self, rng, fields):
+        self.rng, self.fields = rng, fields
 
     def of_kind(self, kind, *unless):
         return [field for field in self.fields if field.kind == kind and field not in unless]
@@ -92,16 +90,11 @@ class RandomTree:
         if inner is None:
             return self.leaf(kind)
         replaced = ""
-        if self.may_replace(name, kind) and self.rng.random() < 0.2:
+        if (kind == NUMBER or name in CHOICES) and self.rng.random() < 0.2:
             replaced = f' mapMissingTo="{written_number(self.rng.choice(NUMBERS))}"'
         if self.rng.random() < 0.1:
             replaced += f' invalidValueTreatment="{self.rng.choice(["returnInvalid", "asIs", "asMissing"])}"'
         return f"<Apply function={quoteattr(name)}{replaced}>{inner}</Apply>"
-
-    def may_replace(self, name, kind):
-        if name != "if":
-            return kind == NUMBER
-        return self.replaces_choices and (kind == NUMBER or NUMBER in self.mixed)
 
     def inner(self, name, kind, depth):
         rng = self.rng
@@ -137,11 +130,23 @@ class RandomTree:
         fields = [field for field in self.fields if field.kind in kinds]
         if not fields or rng.random() < 0.4:
             kind = rng.choice(kinds)
-            # An "if" that is compared has branches of one kind: a comparison asks for none.
-            return RandomTree(rng, self.fields, (kind,), self.replaces_choices).arguments(2, kind, depth)
+            if name in ("equal", "notEqual") and rng.random() < 0.4:
+                return self.compared_choices(kind, depth)
+            return self.arguments(2, kind, depth)
         field = rng.choice(fields)
         constant = f'<Constant dataType="{field.data_type}">{escape(field.literal(rng))}</Constant>'
         return self.reference(field) + constant
+
+    def compared_choices(self, kind, depth):
+        """An "if", whose branches may be of several kinds, with another one or with what may be one of its branches."""
+        rng = self.rng
+        condition = self.apply(rng.choice(TESTS), NUMBER, depth - 2)
+        branches = [self.leaf(rng.choice([kind, NUMBER, TEXT, MOMENT])) for _ in range(rng.choice([1, 2, 2, 2]))]
+        replaced = f' mapMissingTo="{written_number(rng.choice(NUMBERS))}"' if rng.random() < 0.2 else ""
+        pair = [f'<Apply function="if"{replaced}>{condition}{"".join(branches)}</Apply>',
+                rng.choice(branches) if rng.random() < 0.6 else self.apply("if", kind, depth - 1)]
+        rng.shuffle(pair)
+        return "".join(pair)
 
     def special(self, name, kind, depth):
         rng = self.rng
@@ -159,9 +164,15 @@ class RandomTree:
                 return None
             field = rng.choice(fields)
             literals = [field.literal(rng) for _ in range(rng.randint(1, 4))]
+            value = self.reference(field)
             if rng.random() < 0.15:
-                return self.reference(field) + "".join(self.constant(field.kind, [text]) for text in literals)
-            return self.reference(field) + self.array(field.kind, literals)
+                # The elements of the list are what the second argument is.
+                condition = self.apply(rng.choice(TESTS), NUMBER, depth - 2)
+                value += self.leaf(rng.choice([NUMBER, TEXT, MOMENT]))
+                value = f'<Apply function="if">{condition}{value}</Apply>'
+            if rng.random() < 0.15:
+                return value + "".join(self.constant(field.kind, [text]) for text in literals)
+            return value + self.array(field.kind, literals)
         if name == "length":
             # That of a derived field may be another than its text's.
             derived = [field for field in self.of_kind(TEXT) if field.is_derived]
@@ -192,8 +203,8 @@ class RandomTree:
 
     def branch(self, kind, depth):
         """What an "if" may choose: often of another kind than the one that is needed."""
-        if kind in self.mixed and self.rng.random() < 0.3:
-            kind = self.rng.choice(self.mixed)
+        if self.rng.random() < 0.3:
+            kind = self.rng.choice([NUMBER, TEXT, MOMENT])
         return self.argument(kind, depth, BY_KIND[kind])
 
     def impute(self, kind):

@@ -57,6 +57,11 @@ def constants(values):
     return "".join(parts)
 
 
+def chosen(values, other="", attributes=""):
+    """An "if" by the field y."""
+    return f'<Apply function="if"{attributes}>{constants("y " + values + " " + other)}</Apply>'
+
+
 class TestEvaluator(unittest.TestCase):
     def expect(self, derived, given, wanted):
         """What the last of the derived fields is."""
@@ -139,6 +144,33 @@ class TestEvaluator(unittest.TestCase):
         self.expect(number('<Apply function="year-from-date"><FieldRef field="d"/></Apply>'), before, 1970.0)
         self.expect(number('<Apply function="hour-from-time"><FieldRef field="d"/></Apply>'), before, 23.0)
 
+    def test_choices_of_several_kinds(self):
+        given = {"t": text_of("abc"), "d": Moment(86400.0, "date")}
+        replaced = ' mapMissingTo="7"'
+        for left, right, when_true, when_false in [
+                (chosen("d", "86400"), "d", 1.0, 0.0), (chosen("d", "86400"), "86400", 0.0, 1.0),
+                (chosen("t", "5"), "5", 0.0, 1.0), (chosen("t", "5"), "t", 1.0, 0.0),
+                (chosen("t", "5"), chosen("t", "6"), 1.0, 0.0), (chosen("t", "5"), chosen("5", "t"), 0.0, 0.0),
+                (chosen("t"), "''", 0.0, 1.0), (chosen("t", "z"), "S", 0.0, 1.0),
+                (chosen("t", "z", replaced), "7", 0.0, 1.0), (chosen("h", "d", replaced), "e", 1.0, 0.0)]:
+            right = right if right.startswith("<") else constants(right)
+            for y, wanted in [(1.0, when_true), (0.0, when_false)]:
+                with self.subTest(left=left, right=right, y=y):
+                    self.expect(number(f'<Apply function="equal">{left}{right}</Apply>'), {**given, "y": y}, wanted)
+                    self.expect(number(f'<Apply function="notEqual">{right}{left}</Apply>'), {**given, "y": y},
+                                1.0 - wanted)
+        # A date/time field takes dates and times alone, and no number in place of a missing one.
+        for tree, when_true, when_false in [
+                (f'<Apply function="+">{constants("1 2")}</Apply>', S, S), (chosen("d", "5"), 86400.0, S),
+                (chosen("5", "d"), S, 86400.0), (chosen("d", "", replaced), 86400.0, S)]:
+            for y, wanted in [(1.0, when_true), (0.0, when_false)]:
+                self.expect(f'dataType="date">{tree}', {**given, "y": y}, Moment(wanted, "date"))
+        # A missing number is replaced in the tree of a text, too.
+        start = chosen("2", "z", ' mapMissingTo="3"')
+        for y, wanted in [(1.0, Text(b"bcd", 2)), (0.0, Text(b"cd", 3))]:
+            given = {"y": y, "u": text_of("abcd")}
+            self.expect(text(f'<Apply function="substr"><FieldRef field="u"/>{start}</Apply>'), given, wanted)
+
     def test_tests_and_choices(self):
         given = {"x": -99.0, "y": 10.0, "t": text_of("n/a"), "u": text_of("red  "), "n": 5.0}
         array = '<Array type="string" n="2">"red" blue</Array>'
@@ -167,6 +199,8 @@ class TestEvaluator(unittest.TestCase):
                 ('function="outlierHandle">' + constants("1 'asExtremeValues' 5 2 3 4"), 2.0)]:
             with self.subTest(expression=expression):
                 self.expect(number(f"<Apply {expression}</Apply>"), given, wanted)
+        self.expect(number('<Apply function="isIn">' + chosen("t", "5") + array + "</Apply>"), {**given, "y": 1.0}, 0.0)
+        self.expect(number('<Apply function="isIn">' + chosen("5", "u") + array + "</Apply>"), {**given, "y": 0.0}, 1.0)
         impute = ('<Apply function="imputeCatFieldMissingAgainstConTarget"><FieldRef field="t"/><FieldRef field="z"/>'
                   '<Array type="real" n="2">0 10</Array><Array type="real" n="2">1 4</Array></Apply>')
         self.expect(text(impute), {"t": text_of("n/a"), "z": 3.0}, "red")
