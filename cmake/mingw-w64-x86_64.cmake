@@ -1,0 +1,15 @@
+# Builds for 64-bit Windows on Debian, with mingw-w64's compiler. The one with POSIX threads: the other's standard
+# library has no std::thread. KESTREL_WINDOWS_DEPS is the folder that tools/windows/build-deps.sh filled.
+set(CMAKE_SYSTEM_NAME Windows)
+set(CMAKE_SYSTEM_PROCESSOR x86_64)
+set(KESTREL_TRIPLE x86_64-w64-mingw32)
+set(CMAKE_C_COMPILER ${KESTREL_TRIPLE}-gcc-posix)
+set(CMAKE_CXX_COMPILER ${KESTREL_TRIPLE}-g++-posix)
+set(CMAKE_RC_COMPILER ${KESTREL_TRIPLE}-windres)
+list(APPEND CMAKE_TRY_COMPILE_PLATFORM_VARIABLES KESTREL_WINDOWS_DEPS)
+set(CMAKE_FIND_ROOT_PATH /usr/${KESTREL_TRIPLE} ${KESTREL_WINDOWS_DEPS})
+set(CMAKE_FIND_ROOT_PATH_MODE_PROGRAM NEVER)
+set(CMAKE_FIND_ROOT_PATH_MODE_LIBRARY ONLY)
+set(CMAKE_FIND_ROOT_PATH_MODE_INCLUDE ONLY)
+set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
+set(CMAKE_CROSSCOMPILING_EMULATOR ${CMAKE_CURRENT_LIST_DIR}/../tools/windows/run-wine.sh)
