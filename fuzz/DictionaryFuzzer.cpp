@@ -13,7 +13,7 @@
 #include "kestrel/dictionary/ScoreValueLabelSet.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
-#include "kestrel/translate/VEXATranslator.h"
+#include "kestrel/translate/LegacyDictionary.h"
 #include "tests/support/DictionaryText.h"
 
 namespace {

@@ -89,6 +89,7 @@
 #include "kestrel/translate/BaseTranslator.h"
 #include "kestrel/translate/DOMElemUtility.h"
 #include "kestrel/translate/DocumentReader.h"
+#include "kestrel/translate/LegacyDictionary.h"
 #include "kestrel/translate/LoadArena.h"
 #include "kestrel/translate/MCXInputSource.h"
 #include "kestrel/translate/PMMLModelTags.h"

@@ -10,7 +10,7 @@
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ModelNames.h"
-#include "kestrel/translate/VEXATranslator.h"
+#include "kestrel/translate/LegacyDictionary.h"
 
 namespace kestrel_program {
 namespace {

@@ -25,9 +25,9 @@ using xercesc::DOMElement;
 using Tag = PMMLTagText;
 
 /// The categories of one target, until they are handed to its variable.
-class TargetCategories {
+class TargetValues {
  public:
-  explicit TargetCategories(ScoreDictVar& variable) : variable_(variable) {}
+  explicit TargetValues(ScoreDictVar& variable) : variable_(variable) {}
 
   void Read(const DOMElement* target);
 
@@ -42,7 +42,7 @@ class TargetCategories {
   std::unique_ptr<ValueProbabilitySet> priors_ = std::make_unique<ValueProbabilitySet>();
 };
 
-void TargetCategories::Read(const DOMElement* target) {
+void TargetValues::Read(const DOMElement* target) {
   for (const DOMElement* child : ChildElements(target, Tag::XML_ELE_TARGETVALUE))
     ReadValue(child);
   // A target may stand there for what is not read, without a word on the categories.
@@ -51,7 +51,7 @@ void TargetCategories::Read(const DOMElement* target) {
   Attach();
 }
 
-void TargetCategories::ReadValue(const DOMElement* element) {
+void TargetValues::ReadValue(const DOMElement* element) {
   std::unique_ptr<ScoreValue> category = MakeCategory(element);
   if (IsListed(*labels_, variable_, *category)) {
     FailOnField(element, KestrelException::kStructure, variable_.GetName(), ": Duplicated Category Value!");
@@ -70,7 +70,7 @@ void TargetCategories::ReadValue(const DOMElement* element) {
   label.release();
 }
 
-std::unique_ptr<ScoreValue> TargetCategories::MakeCategory(const DOMElement* element) const {
+std::unique_ptr<ScoreValue> TargetValues::MakeCategory(const DOMElement* element) const {
   const XMLCh* const text = RequiredAttribute(element, Tag::XML_ATT_VALUE_VALUE);
   std::unique_ptr<ScoreValue> value;
   try {
@@ -84,7 +84,7 @@ std::unique_ptr<ScoreValue> TargetCategories::MakeCategory(const DOMElement* ele
   return value;
 }
 
-void TargetCategories::AddPrior(const DOMElement* element, const ScoreValue& category) {
+void TargetValues::AddPrior(const DOMElement* element, const ScoreValue& category) {
   const XMLCh* const text = FindAttribute(element, Tag::XML_ATT_PRIORPROBABILITY);
   if (text == nullptr) return;
   auto prior = std::make_unique<ValueProbability>(category.Clone(), 0.0);
@@ -101,7 +101,7 @@ void TargetCategories::AddPrior(const DOMElement* element, const ScoreValue& cat
   prior.release();
 }
 
-void TargetCategories::Attach() {
+void TargetValues::Attach() {
   const std::unique_ptr<ScoreValueLabelSet> old_labels(variable_.GetValueLabels());
   const std::unique_ptr<ScoreValueProbabilitySet> old_priors(variable_.GetValueProbabilities());
   const std::unique_ptr<ScoreEncoder> old_encoder(variable_.GetEncoder());
@@ -156,7 +156,7 @@ void ReadTarget(const DOMElement* target, ScoreDictionary& dictionary) {
       return;
     case ScoreDictVar::kOrdinal:
     case ScoreDictVar::kNominal:
-      TargetCategories(variable).Read(target);
+      TargetValues(variable).Read(target);
       return;
   }
   // No document comes this far with another level; a program's dictionary may.

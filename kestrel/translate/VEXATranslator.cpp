@@ -13,6 +13,7 @@
 #include "kestrel/dictionary/VarStats.h"
 #include "kestrel/predicates/Range.h"
 #include "kestrel/translate/DocumentReader.h"
+#include "kestrel/translate/LegacyDictionary.h"
 #include "kestrel/translate/PMMLTranslator.h"
 #include "kestrel/translate/ReaderFault.h"
 #include "kestrel/translate/VerifiedText.h"

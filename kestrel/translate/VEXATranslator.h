@@ -5,11 +5,8 @@
 
 #include <xercesc/util/XercesDefs.hpp>
 
-#include <iosfwd>
-#include <memory>
 #include <string>
 
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/platform/Export.h"
 #include "kestrel/translate/BaseTranslator.h"
 
@@ -20,6 +17,7 @@ XERCES_CPP_NAMESPACE_END
 namespace MCKestrel_800 {
 
 class ScoreDictVar;
+class ScoreDictionary;
 
 /// The reader of a "dictionary" element. Errors: KestrelException at the first fault, with line and column
 /// where they are known. Keeps no state.
@@ -43,11 +41,6 @@ class KESTREL_API VEXATranslator : public BaseTranslator {
   /// labels in their order. Returns false, doing nothing, for null and for a continuous variable.
   bool SetupCatEncoder(ScoreDictVar* var);
 };
-
-/// Reads the dictionary of a whole document of the older format: the "dictionary" child of its root. Errors:
-/// those of ReadDocument and ParseDictionary; code 5 "Unsupported Model found!" for a root that is not
-/// "vexa-ml".
-KESTREL_API std::unique_ptr<ScoreDictionary> ReadLegacyDictionary(std::istream& in);
 
 }  // namespace MCKestrel_800
 

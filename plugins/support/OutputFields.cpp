@@ -26,11 +26,6 @@ namespace {
 using Feature = ScoreResultField;
 using RuleFeature = OutputField::RuleFeature;
 
-/// What the system-missing value stands for is not told.
-bool IsMissing(double number) {
-  return NumericValue::IsSystemMissingValue(number);
-}
-
 bool NeedsTarget(const OutputField& field) {
   return field.feature == Feature::kPredictedDisplayValue || field.feature == Feature::kResidual;
 }
@@ -81,7 +76,7 @@ class OutputFields::Cell {
   void SetNumber(double number) {
     if (!is_text_) {
       static_cast<NumericValue&>(value_).SetDoubleValue(number);
-    } else if (!IsMissing(number)) {
+    } else if (!NumericValue::IsSystemMissingValue(number)) {
       char digits[kShortestRoom];
       text_.assign(digits, FormatShortest(number, digits));
       SetText(text_);
@@ -226,7 +221,7 @@ void OutputFields::WriteDisplayValue(const ScoreValue& prediction, Cell cell) co
   cell.SetText(labels_[static_cast<std::size_t>(code)]);
 }
 
-void OutputFields::WriteRuleValue(OutputField& field, const ScoreResult& result, Cell cell) const {
+void OutputFields::WriteRuleValue(const OutputField& field, const ScoreResult& result, Cell cell) const {
   const std::string& id = DecidingId(result);
   const ScoreValue* const prediction = result.GetPrediction();
   if (id.empty() || prediction == nullptr) return;
@@ -289,7 +284,7 @@ double OutputFields::FindResidual(OutputField& field, const ScoredCase& scored, 
     return true_value->GetDouble() - prediction->GetDouble();
   }
   const double probability = FindProbability(field, result);
-  if (IsMissing(probability)) return probability;
+  if (NumericValue::IsSystemMissingValue(probability)) return probability;
   const bool is_category = *true_value == (field.category != nullptr ? *field.category : *prediction);
   return (is_category ? 1.0 : 0.0) - probability;
 }

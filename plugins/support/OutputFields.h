@@ -112,7 +112,7 @@ class OutputFields {
   void Prepare(ResultField& values);
   void WriteField(OutputField& field, const ScoredCase& scored, const ScoreResult& result, Cell cell);
   void WriteDisplayValue(const ScoreValue& prediction, Cell cell) const;
-  void WriteRuleValue(OutputField& field, const ScoreResult& result, Cell cell) const;
+  void WriteRuleValue(const OutputField& field, const ScoreResult& result, Cell cell) const;
   void WriteWarning(const ScoredCase& scored, Cell cell);
   double FindProbability(OutputField& field, const ScoreResult& result) const;
   double FindResidual(OutputField& field, const ScoredCase& scored, const ScoreResult& result);

@@ -3,53 +3,22 @@
 
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <map>
 #include <memory>
 
-#include "kestrel/dictionary/CaseRecord.h"
-#include "kestrel/dictionary/ScoreDictVar.h"
-#include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
-#include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/Results.h"
-#include "kestrel/model/ScoreModel.h"
-#include "tests/examples/ExampleFolders.h"
-#include "tests/support/PlainTable.h"
+#include "tests/examples/LoadedExample.h"
 
 namespace kestrel_tests {
 namespace {
 
 using namespace MCKestrel_800;
 
-class EveryExample : public testing::TestWithParam<std::string> {
+class EveryExample : public LoadedExample {
  protected:
-  void SetUp() override {
-    std::ifstream document(ExamplePath(GetParam(), "model.xml"), std::ios::binary);
-    ASSERT_TRUE(document.is_open());
-    model_.reset(ModelFactory::MakeModelFromXML(document, ExampleKinds(), std::string()));
-    ASSERT_NE(model_, nullptr);
-    data_ = ReadPlainTable(ExamplePath(GetParam(), "data.csv"));
-    expected_ = ReadPlainTable(ExamplePath(GetParam(), "expected.csv"));
-    ASSERT_FALSE(expected_.rows.empty());
-    ASSERT_EQ(data_.rows.size(), expected_.rows.size());
-  }
-
-  std::unique_ptr<CaseRecord> MakeRecord(const std::vector<std::string>& cells) const {
-    auto record = std::make_unique<CaseRecord>(static_cast<int>(cells.size()));
-    for (size_t i = 0; i < cells.size(); ++i) {
-      const ScoreDictVar* var = model_->GetDictionary()->GetVar(data_.header[i]);
-      EXPECT_NE(var, nullptr) << data_.header[i];
-      if (var == nullptr || model_->GetVarRole(var) == ScoreModel::kTarget) continue;
-      record->Add(data_.header[i], var->ToMyValue(cells[i]));
-    }
-    return record;
-  }
-
-  std::unique_ptr<ScoreModel> model_;
-  PlainTable data_;
-  PlainTable expected_;
+  void SetUp() override { Load("expected.csv"); }
 };
 
 TEST_P(EveryExample, AgreesWithItsTrainingProgram) {
@@ -61,7 +30,7 @@ TEST_P(EveryExample, AgreesWithItsTrainingProgram) {
     const std::vector<std::string>& expected = expected_.rows[row];
     SCOPED_TRACE("case " + std::to_string(row + 1));
     result->Reset();
-    ASSERT_TRUE(model_->Score(MakeRecord(data_.rows[row]).get(), result.get()).IsOK());
+    ASSERT_TRUE(model_->Score(MakeRecord(data_.rows[row], /*has_target=*/false).get(), result.get()).IsOK());
     ASSERT_NE(result->GetPrediction(), nullptr);
     if (regression) {
       EXPECT_PRED2(AgreesWith, std::stod(expected[0]), result->GetPrediction()->GetDouble());

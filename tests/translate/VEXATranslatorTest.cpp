@@ -19,6 +19,7 @@
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
 #include "kestrel/translate/DocumentReader.h"
+#include "kestrel/translate/LegacyDictionary.h"
 #include "tests/support/ExpectFault.h"
 
 namespace {
