@@ -260,6 +260,8 @@ ExitCode Run(const CLI::App& program, const Values& values) {
 ExitCode RunCommandLine(const std::vector<std::string>& arguments) {
   Values values;
   CLI::App program("Scores predictive models and computes derived fields (PMML documents).", "kestrel");
+  // A word that begins with a slash is a path on Windows too.
+  program.allow_windows_style_options(false);
   program.formatter(std::make_shared<HelpFormatter>());
   AddScore(program, values);
   AddDerive(program, values);

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <cstdio>
 #include <random>
+#include <utility>
 
 #include "apps/kestrel/InputFile.h"
 #include "apps/kestrel/ProgramError.h"
@@ -30,7 +31,10 @@ fs::path TemporaryNameFor(const fs::path& target) {
 OutputFile::OutputFile(const std::string& path)
     : name_(IsStandardStream(path) ? "standard output" : path), is_standard_(IsStandardStream(path)) {
   buffer_.reserve(kBlock + kBlock / 4);
-  if (is_standard_) return;
+  if (is_standard_) {
+    file_ = stdout;
+    return;
+  }
   target_ = fs::u8path(path);
   std::error_code failure;
   const fs::file_status status = fs::status(target_, failure);
@@ -38,9 +42,7 @@ OutputFile::OutputFile(const std::string& path)
     throw ProgramError(kInputOutput, name_ + ": this is a folder; the name of a file is expected");
   }
   if (fs::exists(status) && !fs::is_regular_file(status)) {
-    errno = 0;
-    file_.open(target_, std::ios::binary);
-    if (!file_.is_open()) throw ProgramError(kInputOutput, name_ + ": cannot be written" + SystemReason());
+    Open(target_);
     return;
   }
   if (fs::exists(status)) {
@@ -48,30 +50,39 @@ OutputFile::OutputFile(const std::string& path)
     const fs::path real = fs::canonical(target_, failure);
     if (!failure) target_ = real;
   }
-  OpenTemporary(target_);
+  temporary_ = TemporaryNameFor(target_);
+  MCKestrel_800::RemoveWhenInterrupted(temporary_.u8string());
+  Open(temporary_);
   // Who may read the file that is replaced may read the new one, and nobody else.
   if (fs::exists(status)) fs::permissions(temporary_, status.permissions(), failure);
 }
 
 OutputFile::~OutputFile() {
   RemoveTemporary();
+  Close();
 }
 
-void OutputFile::OpenTemporary(const fs::path& target) {
-  temporary_ = TemporaryNameFor(target);
-  MCKestrel_800::RemoveWhenInterrupted(temporary_.u8string());
+void OutputFile::Open(const fs::path& path) {
   errno = 0;
-  file_.open(temporary_, std::ios::binary | std::ios::trunc);
-  if (!file_.is_open()) {
-    const std::string reason = SystemReason();
-    RemoveTemporary();
-    throw ProgramError(kInputOutput, name_ + ": cannot be written" + reason);
+  file_ = MCKestrel_800::OpenForWriting(path.u8string());
+  if (file_ != nullptr) {
+    // The text comes in large blocks already.
+    std::setvbuf(file_, nullptr, _IONBF, 0);
+    return;
   }
+  const std::string reason = SystemReason();
+  RemoveTemporary();
+  throw ProgramError(kInputOutput, name_ + ": cannot be written" + reason);
+}
+
+bool OutputFile::Close() noexcept {
+  if (is_standard_ || file_ == nullptr) return true;
+  return std::fclose(std::exchange(file_, nullptr)) == 0;
 }
 
 void OutputFile::RemoveTemporary() noexcept {
   if (temporary_.empty()) return;
-  file_.close();
+  Close();
   std::error_code ignored;
   fs::remove(temporary_, ignored);
   temporary_.clear();
@@ -83,13 +94,8 @@ void OutputFile::FailToWrite() const {
 }
 
 void OutputFile::Flush() {
-  if (MCKestrel_800::WasInterrupted()) throw ProgramError(kInputOutput, "interrupted");
   errno = 0;
-  if (is_standard_) {
-    if (std::fwrite(buffer_.data(), 1, buffer_.size(), stdout) != buffer_.size()) FailToWrite();
-  } else if (!file_.write(buffer_.data(), static_cast<std::streamsize>(buffer_.size()))) {
-    FailToWrite();
-  }
+  if (std::fwrite(buffer_.data(), 1, buffer_.size(), file_) != buffer_.size()) FailToWrite();
   buffer_.clear();
 }
 
@@ -99,8 +105,7 @@ void OutputFile::Finish() {
     if (std::fflush(stdout) != 0) FailToWrite();
     return;
   }
-  file_.close();
-  if (file_.fail()) FailToWrite();
+  if (!Close()) FailToWrite();
   if (temporary_.empty()) return;
   std::error_code failure;
   fs::rename(temporary_, target_, failure);

@@ -4,8 +4,8 @@
 #define KESTREL_APPS_KESTREL_OUTPUTFILE_H
 
 #include <cstddef>
+#include <cstdio>
 #include <filesystem>
-#include <fstream>
 #include <string>
 
 namespace kestrel_program {
@@ -38,7 +38,9 @@ class OutputFile {
   static constexpr std::size_t kBlock = 256 * 1024;
 
   void Flush();
-  void OpenTemporary(const std::filesystem::path& target);
+  void Open(const std::filesystem::path& path);
+  /// Whether closing went well.
+  bool Close() noexcept;
   void RemoveTemporary() noexcept;
   [[noreturn]] void FailToWrite() const;
 
@@ -47,7 +49,7 @@ class OutputFile {
   bool is_standard_;
   std::filesystem::path target_;
   std::filesystem::path temporary_;  ///< empty when the target is written directly
-  std::ofstream file_;
+  std::FILE* file_ = nullptr;        ///< the standard output is the system's to close
 };
 
 }  // namespace kestrel_program

@@ -7,6 +7,7 @@
 #include "apps/kestrel/CommandLine.h"
 #include "apps/kestrel/ProgramError.h"
 #include "kestrel/foundation/KestrelException.h"
+#include "kestrel/foundation/Locale.h"
 #include "kestrel/platform/Terminal.h"
 
 namespace {
@@ -21,6 +22,8 @@ int Fail(kestrel_program::ExitCode code, const char* text) {
 int main(int argc, char** argv) {
   try {
     MCKestrel_800::PrepareStandardStreams();
+    // Documents, tables and file names are UTF-8 on every system, whatever code page the process has.
+    MCXML_800::SetUTF8mode(1);
     return kestrel_program::RunCommandLine(MCKestrel_800::GetUtf8Arguments(argc, argv));
   } catch (const kestrel_program::ProgramError& fault) {
     return Fail(fault.GetCode(), fault.GetText().c_str());

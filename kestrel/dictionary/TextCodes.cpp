@@ -49,6 +49,9 @@ std::uint64_t Hash(std::string_view text) {
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take its address.
+constexpr int TextCodes::kUnknown;
+
 std::string_view TextCodes::KeyOf(std::string_view text) const {
   if (keep_trailing_blanks_) return text;
   while (!text.empty() && text.back() == ' ')

@@ -139,6 +139,9 @@ ValueKey KeyOfNumber(double number, ValueKey::Kind kind) {
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take its address.
+constexpr std::size_t ValueIndex::kNone;
+
 ValueKey MakeValueKey(const ScoreValue* value) {
   ValueKey key;
   if (value == nullptr) return key;

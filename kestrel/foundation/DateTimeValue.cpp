@@ -120,6 +120,12 @@ int64_t DaysSince1970(int64_t y, int64_t m, int64_t d) {
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take their address.
+constexpr int64_t DateTimeValue::fJan_1_1970_JulianDay;
+constexpr int64_t DateTimeValue::fSeconds_Per_Day;
+constexpr const int64_t (&DateTimeValue::fDaysInMonth)[13];
+constexpr const int64_t (&DateTimeValue::fDaysBeforeMonth)[13];
+
 DateTimeValue::DateTimeValue(double number, DateTimeType type) {
   SetDateTimeValue(number, type);
 }

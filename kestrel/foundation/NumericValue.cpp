@@ -19,6 +19,11 @@ bool Comparable(const NumericValue& value, const ScoreValue& other) {
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take their address.
+constexpr double NumericValue::gSysmisValue;
+constexpr double NumericValue::gInfinity;
+constexpr double NumericValue::fEpsilon;
+
 // The constructor is constexpr, so this stands before any initialiser of another source can read it.
 const NumericValue NumericValue::SYSMIS;
 

@@ -64,6 +64,9 @@ bool IsBlank(char16_t unit) {
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take its address.
+constexpr size_t PliantString::npos;
+
 PliantString::PliantString() = default;
 PliantString::PliantString(const char* text) : text_(FromNarrow(text, Length(text))) {}
 PliantString::PliantString(const std::string& text) : text_(NarrowToUtf16(text)) {}

@@ -30,6 +30,9 @@ bool AskOrder(const std::string& text, const ScoreValue& other, Test test) {
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take its address.
+constexpr int StringValue::MAX_STRING;
+
 StringValue::StringValue() = default;
 StringValue::StringValue(const std::string& text) : text_(text), length_(static_cast<int32_t>(text.size())) {}
 StringValue::StringValue(const char* text) : StringValue(std::string(text == nullptr ? "" : text)) {}

@@ -11,6 +11,7 @@
 #include "kestrel/foundation/MultibyteConversions.h"
 #include "kestrel/foundation/Utf8Text.h"
 #include "kestrel/platform/Environment.h"
+#include "kestrel/platform/ThreadObject.h"
 
 namespace MCXML_800 {
 
@@ -80,7 +81,7 @@ UConverter* DefaultConverter() {
     ConverterHolder converter;
     int id = 0;
   };
-  thread_local Own own;
+  Own& own = MCKestrel_800::ThreadObject<Own>();
   const SharedConverter* const shared = Current();
   if (own.id != shared->id) {
     own.converter.reset(CloneConverter(shared->converter.get()));
@@ -94,7 +95,7 @@ UConverter* ProcessCodePageConverter() {
     ConverterHolder converter;
     std::string name;
   };
-  thread_local Own own;
+  Own& own = MCKestrel_800::ThreadObject<Own>();
   std::string name = ProcessCodePageName();
   if (own.converter == nullptr || own.name != name) {
     own.converter = Open(name);

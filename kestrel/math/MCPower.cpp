@@ -15,6 +15,12 @@ constexpr double kRootTolerance = 32.0;
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take their address.
+constexpr double MCPower::gMachineEpsilon;
+constexpr int MCPower::gMachineMaxInt;
+constexpr double MCPower::gMachineMaxExp;
+constexpr double MCPower::gMachineMinExp;
+
 double MCPower::MaxExp() {
   return gMachineMaxExp;
 }

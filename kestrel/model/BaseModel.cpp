@@ -27,6 +27,9 @@ bool RecordsProbabilities(int kind) {
 
 }  // namespace
 
+// Defined here too, so that hosts and plug-ins can take its address.
+constexpr long BaseModel::kNoPrediction;
+
 BaseModel::~BaseModel() {
   delete version_;
   roles_.clear();

@@ -11,6 +11,7 @@
 #include "kestrel/model/ModelFinder.h"
 #include "kestrel/model/ModelLibrary.h"
 #include "kestrel/model/ModelNames.h"
+#include "kestrel/platform/ThreadObject.h"
 #include "kestrel/translate/BaseTranslator.h"
 #include "kestrel/translate/DocumentReader.h"
 #include "kestrel/translate/ReaderFault.h"
@@ -28,8 +29,10 @@ std::mutex& NamesMutex() {
 }
 
 std::string& LoadError() {
-  thread_local std::string text;
-  return text;
+  struct Own {
+    std::string text;
+  };
+  return ThreadObject<Own>().text;
 }
 
 /// The names that one load works with. Its translator is offered this list, and another load may read a names

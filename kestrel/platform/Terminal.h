@@ -22,13 +22,15 @@ KESTREL_API std::vector<std::string> GetUtf8Arguments(int argc, const char* cons
 /// Whether the stream shows on a terminal rather than going to a file or a pipe.
 KESTREL_API bool IsTerminal(std::FILE* stream);
 
-/// From now on an interrupt or a request to end removes this one file before the process ends; an empty path
-/// ends the watch. The path is UTF-8. Where the system cannot remove a file that is open, WasInterrupted
-/// turns true instead, and the process has two seconds to clean up and end by itself.
+/// Opens a file for writing, byte for byte, in such a way that it can be removed while it is open. What is
+/// there is cut off. The path is UTF-8. Null when that fails, with the reason in errno.
+KESTREL_API std::FILE* OpenForWriting(const std::string& path);
+
+/// From now on an interrupt or a request to end removes this one file, which OpenForWriting may have opened,
+/// before the process ends; an empty path ends the watch. The path is UTF-8.
 ///
 /// Threads: to be called from one thread.
 KESTREL_API void RemoveWhenInterrupted(const std::string& path);
-KESTREL_API bool WasInterrupted();
 
 }  // namespace MCKestrel_800
 

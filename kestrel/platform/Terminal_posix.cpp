@@ -45,6 +45,10 @@ bool IsTerminal(std::FILE* stream) {
   return isatty(fileno(stream)) == 1;
 }
 
+std::FILE* OpenForWriting(const std::string& path) {
+  return std::fopen(path.c_str(), "wb");
+}
+
 void RemoveWhenInterrupted(const std::string& path) {
   is_watching = 0;
   if (path.empty() || path.size() >= sizeof watched_path) return;
@@ -52,10 +56,6 @@ void RemoveWhenInterrupted(const std::string& path) {
   is_watching = 1;
   for (const int signal_number : kEndingSignals)
     Catch(signal_number);
-}
-
-bool WasInterrupted() {
-  return false;
 }
 
 }  // namespace MCKestrel_800

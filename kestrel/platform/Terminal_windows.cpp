@@ -7,21 +7,57 @@
 #include <io.h>
 #include <shellapi.h>
 
-#include <atomic>
+#include <cerrno>
+#include <mutex>
 
 #include "kestrel/platform/Terminal.h"
 
 namespace MCKestrel_800 {
 namespace {
 
-std::atomic<bool> is_watching{false};
-std::atomic<bool> was_interrupted{false};
+// The system calls RemoveAndEnd on a thread of its own.
+std::mutex watch_guard;
+std::wstring watched_path;
 
-// Runs on a thread of its own; the process ends when it returns.
-BOOL WINAPI WaitForCleaning(DWORD) {
-  was_interrupted = true;
-  if (is_watching) Sleep(2000);
+// The process ends when this returns.
+BOOL WINAPI RemoveAndEnd(DWORD) {
+  const std::lock_guard<std::mutex> lock(watch_guard);
+  if (!watched_path.empty()) DeleteFileW(watched_path.c_str());
   return FALSE;
+}
+
+/// What the C library would say of the system's error, for the errors of opening a file.
+int ErrnoOf(DWORD error) {
+  switch (error) {
+    case ERROR_FILE_NOT_FOUND:
+    case ERROR_PATH_NOT_FOUND:
+    case ERROR_INVALID_NAME:
+    case ERROR_BAD_PATHNAME:
+    case ERROR_BAD_NETPATH:
+      return ENOENT;
+    case ERROR_ACCESS_DENIED:
+    case ERROR_SHARING_VIOLATION:
+      return EACCES;
+    case ERROR_TOO_MANY_OPEN_FILES:
+      return EMFILE;
+    case ERROR_FILENAME_EXCED_RANGE:
+      return ENAMETOOLONG;
+    case ERROR_DISK_FULL:
+    case ERROR_HANDLE_DISK_FULL:
+      return ENOSPC;
+    case ERROR_WRITE_PROTECT:
+      return EROFS;
+    default:
+      return EIO;
+  }
+}
+
+std::wstring FromUtf8(const std::string& text) {
+  const int size = static_cast<int>(text.size());
+  std::wstring wide(text.size(), L'\0');
+  const int length = MultiByteToWideChar(CP_UTF8, 0, text.data(), size, wide.data(), size);
+  wide.resize(length > 0 ? static_cast<size_t>(length) : 0);
+  return wide;
 }
 
 std::string ToUtf8(const wchar_t* text) {
@@ -58,13 +94,30 @@ bool IsTerminal(std::FILE* stream) {
   return _isatty(_fileno(stream)) != 0;
 }
 
-void RemoveWhenInterrupted(const std::string& path) {
-  static const BOOL installed = SetConsoleCtrlHandler(WaitForCleaning, TRUE);
-  is_watching = installed != 0 && !path.empty();
+// The C library opens files without the sharing that removing needs.
+std::FILE* OpenForWriting(const std::string& path) {
+  const HANDLE handle =
+      CreateFileW(FromUtf8(path).c_str(), GENERIC_WRITE, FILE_SHARE_READ | FILE_SHARE_DELETE, nullptr,
+                  CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
+  if (handle == INVALID_HANDLE_VALUE) {
+    errno = ErrnoOf(GetLastError());
+    return nullptr;
+  }
+  const int descriptor = _open_osfhandle(reinterpret_cast<intptr_t>(handle), _O_BINARY);
+  if (descriptor == -1) {
+    CloseHandle(handle);
+    return nullptr;
+  }
+  std::FILE* const file = _fdopen(descriptor, "wb");
+  if (file == nullptr) _close(descriptor);
+  return file;
 }
 
-bool WasInterrupted() {
-  return was_interrupted;
+void RemoveWhenInterrupted(const std::string& path) {
+  static const BOOL installed = SetConsoleCtrlHandler(RemoveAndEnd, TRUE);
+  static_cast<void>(installed);
+  const std::lock_guard<std::mutex> lock(watch_guard);
+  watched_path = FromUtf8(path);
 }
 
 }  // namespace MCKestrel_800

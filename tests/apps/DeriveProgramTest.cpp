@@ -330,13 +330,13 @@ TEST(KestrelDerive, SaysThatThereAreNoDerivedFields) {
       "for the model" +
       accepted;
   // Long enough that the element's name stands in two of the blocks that documents are read in.
-  const std::string far = ModelDocument("LocalTransformations");
-  const std::string filler(65536 - far.find("DerivedField") - 6 - std::string("<!---->").size(), ' ');
+  const std::string distant = ModelDocument("LocalTransformations");
+  const std::string filler(65536 - distant.find("DerivedField") - 6 - std::string("<!---->").size(), ' ');
   const std::pair<std::string, std::string> rows[] = {
       {FileText(DataPath("line.xml")), none},
       {Replaced(Document("DerivedField", "Extension"), "TransformationDictionary", "Extension"), none},
       {ModelDocument("LocalTransformations"), local},
-      {Replaced(far, "<Header", "<!--" + filler + "--><Header"), local},
+      {Replaced(distant, "<Header", "<!--" + filler + "--><Header"), local},
   };
   for (const auto& [document, want] : rows) {
     folder.Write("m.xml", document);

@@ -12,7 +12,7 @@
 namespace kestrel_tests {
 
 inline std::string KestrelPath() {
-  return std::string(KESTREL_BINARY_DIR) + "/bin/kestrel";
+  return BuiltProgram("bin/kestrel");
 }
 
 inline std::string DataPath(const std::string& name) {

@@ -15,7 +15,7 @@ namespace kestrel_tests {
 namespace {
 
 std::string Program() {
-  return std::string(KESTREL_BINARY_DIR) + "/bin/kestrel";
+  return BuiltProgram("bin/kestrel");
 }
 
 class EveryExampleByProgram : public testing::TestWithParam<std::string> {};

@@ -3,22 +3,31 @@
 #ifndef KESTREL_TESTS_SUPPORT_RUNPROGRAM_H
 #define KESTREL_TESTS_SUPPORT_RUNPROGRAM_H
 
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <signal.h>
-#include <spawn.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
+#include <filesystem>
 #include <string>
 #include <vector>
 
 #include "tests/support/FileText.h"
 #include "tests/support/TempFolder.h"
-
-extern char** environ;
+#if defined(_WIN32)
+#include "tests/support/ChildProcess_windows.h"
+#else
+#include "tests/support/ChildProcess_posix.h"
+#endif
 
 namespace kestrel_tests {
+
+/// The path of a program that was built, given as in "tools/print_functions".
+inline std::string BuiltProgram(const std::string& place) {
+#if defined(_WIN32)
+  // All lie together, beside the libraries.
+  return KESTREL_BINARY_DIR "/bin/" + place.substr(place.rfind('/') + 1) + ".exe";
+#else
+  return KESTREL_BINARY_DIR "/" + place;
+#endif
+}
 
 struct RunOptions {
   /// What the program finds on its standard input.
@@ -43,48 +52,17 @@ struct ProgramOutcome {
 class RunningProgram {
  public:
   RunningProgram(const std::string& path, const std::vector<std::string>& arguments,
-                 const RunOptions& options = {}) {
-    const std::string input = folder_.Write("input", options.input);
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    Redirect(actions, 0, options.input_descriptor, input, O_RDONLY);
-    Redirect(actions, 1, options.output_descriptor, folder_.PathOf("output"), O_WRONLY | O_CREAT);
-    Redirect(actions, 2, options.error_descriptor, folder_.PathOf("errors"), O_WRONLY | O_CREAT);
-    std::vector<std::string> words = {path};
-    words.insert(words.end(), arguments.begin(), arguments.end());
-    std::vector<std::string> environment = options.environment;
-    std::vector<char*> environment_pointers = Pointers(environment);
-    environment_pointers.pop_back();
-    for (char** variable = environ; *variable != nullptr; ++variable) {
-      if (!IsGiven(*variable, environment)) environment_pointers.push_back(*variable);
-    }
-    environment_pointers.push_back(nullptr);
-    const int failure = posix_spawn(&process_, path.c_str(), &actions, nullptr, Pointers(words).data(),
-                                    environment_pointers.data());
-    posix_spawn_file_actions_destroy(&actions);
-    EXPECT_EQ(failure, 0) << path << " could not be started";
-    if (failure != 0) process_ = -1;
-  }
-  ~RunningProgram() {
-    if (process_ == -1) return;
-    Send(SIGKILL);
-    Wait();
-  }
-  RunningProgram(const RunningProgram&) = delete;
-  RunningProgram& operator=(const RunningProgram&) = delete;
+                 const RunOptions& options = {})
+      : process_(Words(path, arguments), options.environment,
+                 {{options.input_descriptor, folder_.Write("input", options.input)},
+                  {options.output_descriptor, folder_.PathOf("output")},
+                  {options.error_descriptor, folder_.PathOf("errors")}}) {}
 
-  void Send(int signal_number) const {
-    if (process_ != -1) kill(process_, signal_number);
-  }
+  ChildProcess& GetProcess() { return process_; }
 
   ProgramOutcome Wait() {
     ProgramOutcome outcome;
-    if (process_ == -1) return outcome;
-    int status = 0;
-    EXPECT_EQ(waitpid(process_, &status, 0), process_);
-    process_ = -1;
-    if (WIFEXITED(status)) outcome.exit_code = WEXITSTATUS(status);
-    if (WIFSIGNALED(status)) outcome.signal = WTERMSIG(status);
+    process_.Wait(outcome.exit_code, outcome.signal);
     for (const char* name : {"output", "errors"}) {
       if (!std::filesystem::exists(folder_.GetPath() / name)) continue;
       (name[0] == 'o' ? outcome.output : outcome.errors) = FileText(folder_.PathOf(name));
@@ -93,33 +71,14 @@ class RunningProgram {
   }
 
  private:
-  static void Redirect(posix_spawn_file_actions_t& actions, int stream, int descriptor,
-                       const std::string& path, int flags) {
-    if (descriptor != -1) {
-      posix_spawn_file_actions_adddup2(&actions, descriptor, stream);
-    } else {
-      posix_spawn_file_actions_addopen(&actions, stream, path.c_str(), flags, 0600);
-    }
-  }
-
-  static std::vector<char*> Pointers(std::vector<std::string>& texts) {
-    std::vector<char*> pointers;
-    for (std::string& text : texts)
-      pointers.push_back(&text[0]);
-    pointers.push_back(nullptr);
-    return pointers;
-  }
-
-  static bool IsGiven(const std::string& variable, const std::vector<std::string>& environment) {
-    const std::string name = variable.substr(0, variable.find('=') + 1);
-    for (const std::string& given : environment) {
-      if (given.compare(0, name.size(), name) == 0) return true;
-    }
-    return false;
+  static std::vector<std::string> Words(const std::string& path, const std::vector<std::string>& arguments) {
+    std::vector<std::string> words = {path};
+    words.insert(words.end(), arguments.begin(), arguments.end());
+    return words;
   }
 
   TempFolder folder_;
-  pid_t process_ = -1;
+  ChildProcess process_;
 };
 
 inline ProgramOutcome RunProgram(const std::string& path, const std::vector<std::string>& arguments,

@@ -12,7 +12,7 @@ namespace {
 
 TEST(FunctionDocument, IsWhatTheTablePrints) {
   const kestrel_tests::ProgramOutcome printed =
-      kestrel_tests::RunProgram(KESTREL_BINARY_DIR "/tools/print_functions", {});
+      kestrel_tests::RunProgram(kestrel_tests::BuiltProgram("tools/print_functions"), {});
   EXPECT_EQ(printed.exit_code, 0) << printed.errors;
   EXPECT_EQ(kestrel_tests::FileText(KESTREL_SOURCE_DIR "/docs/functions.md"), printed.output)
       << "write it anew: build/release/tools/print_functions > docs/functions.md";
