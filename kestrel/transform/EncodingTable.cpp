@@ -66,7 +66,7 @@ std::size_t EncodingTable::FindWith(const SourceField& source, const Matches& ma
 
 std::size_t EncodingTable::Find(const SourceField& source) const {
   const ScoreValue& value = *source.GetValue();
-  const auto asks = [this, &value](const Row& row) {
+  const auto asks = [&value](const Row& row) {
     return row.kind == ValueKey::kForeign && row.matcher->Matches(value);
   };
   const std::type_info& type = typeid(value);
