@@ -28,7 +28,8 @@ function(kestrel_add_test room)
   target_compile_definitions(${target} PRIVATE
     KESTREL_SOURCE_DIR="${PROJECT_SOURCE_DIR}" KESTREL_BINARY_DIR="${PROJECT_BINARY_DIR}")
   kestrel_place_program(${target} tests)
-  add_test(NAME ${room} COMMAND ${target})
+  # Some systems look for libraries in the current folder, where none of ours must lie.
+  add_test(NAME ${room} COMMAND ${target} WORKING_DIRECTORY ${PROJECT_BINARY_DIR})
   kestrel_set_test_environment(${room})
 endfunction()
 

@@ -4,6 +4,7 @@
 #include <iostream>
 #include <string>
 
+#include "kestrel/platform/Terminal.h"
 #include "kestrel/transform/BuiltinFunctions.h"
 
 namespace {
@@ -129,6 +130,7 @@ void PrintSection(const Section& section) {
 }  // namespace
 
 int main() {
+  MCKestrel_800::PrepareStandardStreams();
   std::cout << kHead;
   for (const Section& section : kSections)
     PrintSection(section);

@@ -10,6 +10,7 @@
 #include "kestrel/foundation/KestrelException.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/ModelNames.h"
+#include "kestrel/platform/SharedLibrary.h"
 #include "kestrel/translate/LegacyDictionary.h"
 
 namespace kestrel_program {
@@ -35,10 +36,14 @@ ProgramError Describe(const std::string& name, const KestrelException& fault,
   const std::string reason = ModelFactory::GetLastLoadError();
   if (code == KestrelException::kUnsupported && !reason.empty()) {
     text += "\n  the system says: " + reason;
-    if (own_hint == nullptr)
+    if (own_hint == nullptr) {
+      static const std::string kInstall =
+          std::string("install the library for this kind of model beside the others, in ") +
+          MCKestrel_800::SharedLibrary::GetUsualPlace();
       own_hint = reason.find("built for Kestrel") != std::string::npos
                      ? "build the library for this kind of model again, with this version's headers"
-                     : "install the library for this kind of model beside the others, in lib/kestrel/plugins";
+                     : kInstall.c_str();
+    }
   } else if (own_hint == nullptr) {
     own_hint = HintForFault(code, fault.GetErrorMessage());
   }

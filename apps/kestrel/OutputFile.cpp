@@ -41,7 +41,7 @@ OutputFile::OutputFile(const std::string& path)
   if (fs::is_directory(status)) {
     throw ProgramError(kInputOutput, name_ + ": this is a folder; the name of a file is expected");
   }
-  if (fs::exists(status) && !fs::is_regular_file(status)) {
+  if (MCKestrel_800::IsDevice(path)) {
     Open(target_);
     return;
   }

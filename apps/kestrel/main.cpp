@@ -22,6 +22,7 @@ int Fail(kestrel_program::ExitCode code, const char* text) {
 int main(int argc, char** argv) {
   try {
     MCKestrel_800::PrepareStandardStreams();
+    MCKestrel_800::IgnoreLibrariesOfCurrentFolder();
     // Documents, tables and file names are UTF-8 on every system, whatever code page the process has.
     MCXML_800::SetUTF8mode(1);
     return kestrel_program::RunCommandLine(MCKestrel_800::GetUtf8Arguments(argc, argv));

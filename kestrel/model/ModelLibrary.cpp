@@ -23,6 +23,11 @@ std::string VersionFault(SharedLibrary& library) {
   return library.GetFileName() + ": built for Kestrel " + version + ", this is " KESTREL_PLUGIN_VERSION ".";
 }
 
+/// Some systems' words do not tell what they are about.
+std::string NamedText(const std::string& name, const std::string& text) {
+  return text.find(name) != std::string::npos ? text : name + ": " + text;
+}
+
 }  // namespace
 
 ModelLibrary::ModelLibrary(const std::string& tag) : library_(FileNameFor(tag)) {}
@@ -43,15 +48,16 @@ std::unique_ptr<ScoreTranslator> ModelLibrary::MakeTranslator(std::vector<std::s
     return nullptr;
   }
   if (!library_.Load()) {
-    last_error_ = library_.GetLastErrorText();
+    last_error_ = NamedText(library_.GetFileName(), library_.GetLastErrorText());
     return nullptr;
   }
   // Before anything of the library is called that has to do with objects.
   last_error_ = VersionFault(library_);
   if (!last_error_.empty()) return nullptr;
-  const auto give = reinterpret_cast<GiveTranslator>(library_.FindSymbol("GiveMyTranslator"));
+  const char entry[] = "GiveMyTranslator";
+  const auto give = reinterpret_cast<GiveTranslator>(library_.FindSymbol(entry));
   if (give == nullptr) {
-    last_error_ = library_.GetLastErrorText();
+    last_error_ = NamedText(library_.GetFileName(), NamedText(entry, library_.GetLastErrorText()));
     return nullptr;
   }
   std::unique_ptr<ScoreTranslator> translator(give());

@@ -38,6 +38,9 @@ class KESTREL_API SharedLibrary {
   /// What the system said about the last failure; empty until there is one.
   const std::string& GetLastErrorText() const { return last_error_; }
 
+  /// Where the libraries of model kinds are installed, in words for the user.
+  static const char* GetUsualPlace();
+
   /// What this system's library names end in: ".dll" or ".so".
   static const char* GetSuffix();
 

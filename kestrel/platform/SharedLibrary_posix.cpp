@@ -14,6 +14,10 @@ std::string TakeSystemText(const char* otherwise) {
 
 }  // namespace
 
+const char* SharedLibrary::GetUsualPlace() {
+  return "lib/kestrel/plugins";
+}
+
 const char* SharedLibrary::GetSuffix() {
   return ".so";
 }

@@ -86,6 +86,10 @@ class QuietErrors {
 
 }  // namespace
 
+const char* SharedLibrary::GetUsualPlace() {
+  return "the folder of kestrel.dll";
+}
+
 const char* SharedLibrary::GetSuffix() {
   return ".dll";
 }

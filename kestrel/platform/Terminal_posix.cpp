@@ -1,5 +1,6 @@
 #include <limits.h>
 #include <signal.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <cstring>
@@ -16,7 +17,7 @@ char watched_path[PATH_MAX];
 volatile sig_atomic_t is_watching = 0;
 
 extern "C" void RemoveAndEnd(int signal_number) {
-  if (is_watching != 0) unlink(watched_path);
+  RemoveWatchedFile();
   // The action was reset on entry, so the signal now does what it does to every program.
   raise(signal_number);
 }
@@ -33,6 +34,10 @@ void Catch(int signal_number) {
 
 }  // namespace
 
+void RemoveWatchedFile() noexcept {
+  if (is_watching != 0) unlink(watched_path);
+}
+
 void PrepareStandardStreams() {
   signal(SIGPIPE, SIG_IGN);
 }
@@ -43,6 +48,14 @@ std::vector<std::string> GetUtf8Arguments(int argc, const char* const* argv) {
 
 bool IsTerminal(std::FILE* stream) {
   return isatty(fileno(stream)) == 1;
+}
+
+void IgnoreLibrariesOfCurrentFolder() {}
+
+bool IsDevice(const std::string& path) {
+  struct stat status {};
+  if (stat(path.c_str(), &status) != 0) return false;
+  return !S_ISREG(status.st_mode) && !S_ISDIR(status.st_mode);
 }
 
 std::FILE* OpenForWriting(const std::string& path) {

@@ -21,8 +21,7 @@ std::wstring watched_path;
 
 // The process ends when this returns.
 BOOL WINAPI RemoveAndEnd(DWORD) {
-  const std::lock_guard<std::mutex> lock(watch_guard);
-  if (!watched_path.empty()) DeleteFileW(watched_path.c_str());
+  RemoveWatchedFile();
   return FALSE;
 }
 
@@ -71,6 +70,11 @@ std::string ToUtf8(const wchar_t* text) {
 
 }  // namespace
 
+void RemoveWatchedFile() noexcept {
+  const std::lock_guard<std::mutex> lock(watch_guard);
+  if (!watched_path.empty()) DeleteFileW(watched_path.c_str());
+}
+
 void PrepareStandardStreams() {
   for (std::FILE* stream : {stdin, stdout, stderr})
     _setmode(_fileno(stream), _O_BINARY);
@@ -92,6 +96,18 @@ std::vector<std::string> GetUtf8Arguments(int argc, const char* const* argv) {
 
 bool IsTerminal(std::FILE* stream) {
   return _isatty(_fileno(stream)) != 0;
+}
+
+void IgnoreLibrariesOfCurrentFolder() {
+  SetDllDirectoryW(L"");
+}
+
+// Names such as NUL are devices in every folder; their full path says so.
+bool IsDevice(const std::string& path) {
+  std::wstring full(32767, L'\0');
+  const DWORD length =
+      GetFullPathNameW(FromUtf8(path).c_str(), static_cast<DWORD>(full.size()), full.data(), nullptr);
+  return length < full.size() && full.compare(0, 4, L"\\\\.\\") == 0;
 }
 
 // The C library opens files without the sharing that removing needs.

@@ -6,8 +6,10 @@
 #include <set>
 
 #include "apps/kestrel/LoadedModel.h"
+#include "kestrel/platform/SharedLibrary.h"
 #include "tests/apps/KestrelProgram.h"
 #include "tests/support/FileText.h"
+#include "tests/support/SystemFiles.h"
 
 namespace kestrel_tests {
 namespace {
@@ -137,12 +139,12 @@ TEST(KestrelModels, SaysWhyAModelLibraryCannotBeLoaded) {
     EXPECT_NE(outcome.errors.find(": Doesn't Support " + element +
                                   "  Model: No Required dll or lib available! (code 5)\n"
                                   "  the system says: " +
-                                  element + "800r.so: "),
+                                  element + "800r" + MCKestrel_800::SharedLibrary::GetSuffix() + ": "),
               std::string::npos)
         << outcome.errors;
     EXPECT_NE(
-        outcome.errors.find("\n  hint: install the library for this kind of model beside the others, in "
-                            "lib/kestrel/plugins\n"),
+        outcome.errors.find("\n  hint: install the library for this kind of model beside the others, in " +
+                            std::string(MCKestrel_800::SharedLibrary::GetUsualPlace()) + "\n"),
         std::string::npos)
         << outcome.errors;
   }
@@ -153,10 +155,10 @@ ProgramOutcome CheckWithFaultyLibrary(const std::string& fault) {
   const TempFolder folder;
   folder.Write("names.txt", "Fault_" + fault);
   folder.Write("m.xml", "<PMML><Fault_" + fault + "/></PMML>");
-  const char* present = std::getenv("LD_LIBRARY_PATH");
+  const char* present = std::getenv(kLibraryPath);
   RunOptions options;
-  options.environment = {"LD_LIBRARY_PATH=" + std::string(KESTREL_BINARY_DIR) + "/tests/plugins" +
-                         (present == nullptr ? std::string() : ":" + std::string(present))};
+  options.environment = {kLibraryPath + std::string("=") + KESTREL_BINARY_DIR + "/tests/plugins" +
+                         (present == nullptr ? std::string() : kBetweenFolders + std::string(present))};
   return RunKestrel(folder, {"check", "T/m.xml", "--models", "T/names.txt"}, options);
 }
 

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <cctype>
 #include <cmath>
 #include <cstdint>
 #include <cstdio>
@@ -84,8 +86,18 @@ TEST(NumberText, ParsesWholeTextsAlone) {
   }
 }
 
-/// The same answer and the same number left behind as with a standard stream, and the same infinity as with
-/// the C library. Both references run in the classic locale.
+/// Whether C's atof reads an infinity; some C libraries do not know it by its name.
+bool IsInfinityToC(const std::string& text) {
+  size_t at = std::min(text.find_first_not_of(" \t\n\v\f\r"), text.size());
+  if (text[at] == '+') ++at;
+  std::string name = text.substr(at, 3);
+  for (char& c : name)
+    c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  return name == "inf" || std::atof(text.c_str()) == kInfinity;
+}
+
+/// The same answer and the same number left behind as with a standard stream, and the same infinity as in C.
+/// Both references run in the classic locale.
 void ExpectAsStandardLibrary(const std::string& text) {
   std::istringstream in(text);
   in.imbue(std::locale::classic());
@@ -94,7 +106,7 @@ void ExpectAsStandardLibrary(const std::string& text) {
   EXPECT_EQ(ReadDouble(text, value), reads) << '"' << text << '"';
   EXPECT_EQ(value, wanted) << '"' << text << '"';
   EXPECT_EQ(std::signbit(value), std::signbit(wanted)) << '"' << text << '"';
-  EXPECT_EQ(StartsWithInfinity(text), std::atof(text.c_str()) == kInfinity) << '"' << text << '"';
+  EXPECT_EQ(StartsWithInfinity(text), IsInfinityToC(text)) << '"' << text << '"';
 }
 
 TEST(NumberText, ReadsFromTheStartAsAStreamDoes) {

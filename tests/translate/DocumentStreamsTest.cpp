@@ -12,6 +12,7 @@
 #include "kestrel/translate/DocumentReader.h"
 #include "kestrel/translate/XmlText.h"
 #include "tests/support/ExpectFault.h"
+#include "tests/support/SystemFiles.h"
 
 namespace {
 
@@ -142,12 +143,20 @@ TEST(DocumentStreams, StreamsThatGiveNothing) {
   std::istringstream atEnd("<a/>");
   atEnd.ignore(100);
   ExpectFault([&] { ReadDocument(atEnd); }, 4, kNoRoot, "read before");
-  std::ifstream device("/dev/null");
+  std::ifstream device(kestrel_tests::NullDevice());
   ExpectFault([&] { ReadDocument(device); }, 4, kNoRoot, "an empty device");
 }
 
 TEST(DocumentStreams, EndlessStreamMeetsTheCap) {
-  std::ifstream zero("/dev/zero");
+  struct Endless : std::streambuf {
+    int_type underflow() override {
+      setg(zeros, zeros, zeros + sizeof zeros);
+      return 0;
+    }
+    char zeros[4096] = {};
+  };
+  Endless zeros;
+  std::istream zero(&zeros);
   MCKestrel_800::DocumentLimits limits;
   limits.maxInputBytes = size_t{10} << 20;
   ExpectFault([&] { ReadDocument(zero, limits); }, 6, kInvalid);
