@@ -3,6 +3,7 @@
 #ifndef KESTREL_PLATFORM_THREADOBJECT_H
 #define KESTREL_PLATFORM_THREADOBJECT_H
 
+#include <cstdint>
 #include <memory>
 #include <new>
 
@@ -23,7 +24,7 @@ class ThreadSlot {
   bool Set(void* pointer);
 
  private:
-  unsigned long index_;
+  std::uint32_t index_;
 };
 
 /// The calling thread's object of a type; it is made at the first call and destroyed when the thread ends.

@@ -14,6 +14,7 @@
 #include <xercesc/dom/DOMElement.hpp>
 
 #include "kestrel/dictionary/BaseDictionary.h"
+#include "kestrel/foundation/Locale.h"
 #include "kestrel/model/Results.h"
 #include "kestrel/model/ScoreModel.h"
 #include "kestrel/platform/SharedLibrary.h"
@@ -325,7 +326,13 @@ TEST(ModelFactory, TakesUtf8FileNames) {
   const TempFolder folder;
   const std::string model = folder.Write("mod\xC3\xA8le \xE6\xA8\xA1.xml", kTreeDocument);
   const std::string names = folder.Write("n\xC3\xA4men.txt", "TreeModel");
-  EXPECT_EQ(StoryOf(ModelFactory::MakeModelFromXML(model, names, "")), "TreeModel: root=PMML arg=");
+  const int before = MCXML_800::qUTF8mode();
+  // Also where all other narrow text is in a code page that has not all of these characters.
+  for (const int mode : {0, 1}) {
+    MCXML_800::SetUTF8mode(mode);
+    EXPECT_EQ(StoryOf(ModelFactory::MakeModelFromXML(model, names, "")), "TreeModel: root=PMML arg=") << mode;
+  }
+  MCXML_800::SetUTF8mode(before);
 }
 
 TEST(ModelFactory, ThrowsForFilesThatItCannotOpen) {
