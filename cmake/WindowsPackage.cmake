@@ -21,7 +21,7 @@ endif()
 configure_file(${PROJECT_SOURCE_DIR}/tools/windows/README.txt.in ${PROJECT_BINARY_DIR}/README.txt
   @ONLY NEWLINE_STYLE DOS)
 install(FILES ${PROJECT_BINARY_DIR}/README.txt DESTINATION .)
-foreach(document program documents functions errors operations accuracy plugin-guide)
+foreach(document windows program documents functions errors operations accuracy plugin-guide)
   install(FILES ${PROJECT_SOURCE_DIR}/docs/${document}.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
 endforeach()
 # Without the scripts that fitted the models.
