@@ -19,3 +19,9 @@ foreach(library ${libraries})
   list(APPEND KESTREL_RUNTIME_LIBRARIES ${copy})
 endforeach()
 add_custom_target(windows_runtime ALL DEPENDS ${KESTREL_RUNTIME_LIBRARIES})
+
+# The licences of the compiler's libraries, as NAME=FILE. GCC's is the GPL with an exception that its text explains.
+set(KESTREL_RUNTIME_LICENCES
+  GCC-runtime.txt=/usr/share/doc/gcc-mingw-w64-base/copyright
+  GPL-3.txt=/usr/share/common-licenses/GPL-3
+  mingw-w64.txt=/usr/share/doc/mingw-w64-x86-64-dev/copyright)
