@@ -58,8 +58,9 @@ quiet cmake --install "$work/xerces/src"
 
 say "libcsv and what is headers alone"
 csv=$(echo "$work"/src/libcsv-*/)
-quiet x86_64-w64-mingw32-gcc-posix -O2 -c "$csv/libcsv.c" -I "$csv" -o "$work/csv.o"
-quiet x86_64-w64-mingw32-ar rcs "$prefix/lib/libcsv.a" "$work/csv.o"
+# A DLL, because its licence (LGPL) lets whoever has the program put another one in its place.
+quiet x86_64-w64-mingw32-gcc-posix -O2 -shared "$csv/libcsv.c" -I "$csv" -o "$prefix/bin/libcsv.dll" \
+  -Wl,--out-implib,"$prefix/lib/libcsv.dll.a"
 cp "$csv/csv.h" "$prefix/include/"
 mkdir -p "$prefix/share/cmake"
 # Copied, because a link would lead the compiler into the system's own headers.
