@@ -16,12 +16,17 @@ function(kestrel_place_program target folder)
   endif()
 endfunction()
 
-# kestrel_add_test(ROOM SOURCE... [LIBRARIES LIBRARY...]) builds one GoogleTest program for a room and registers it.
-# The programs find test data under KESTREL_SOURCE_DIR and built files under KESTREL_BINARY_DIR.
+# kestrel_add_test(ROOM [COUNTS_ALLOCATIONS] SOURCE... [LIBRARIES LIBRARY...]) builds one GoogleTest program for a room and
+# registers it. The programs find test data under KESTREL_SOURCE_DIR and built files under KESTREL_BINARY_DIR. One that
+# counts allocations can ask tests/support/AllocationCount.h and tests that it is told of them.
 function(kestrel_add_test room)
-  cmake_parse_arguments(PARSE_ARGV 1 TEST "" "" "LIBRARIES")
+  cmake_parse_arguments(PARSE_ARGV 1 TEST "COUNTS_ALLOCATIONS" "" "LIBRARIES")
   set(target test_${room})
   add_executable(${target} ${TEST_UNPARSED_ARGUMENTS} ${KESTREL_TEST_SETTINGS})
+  if(TEST_COUNTS_ALLOCATIONS)
+    set(count ${PROJECT_SOURCE_DIR}/tests/support/AllocationCount)
+    target_sources(${target} PRIVATE ${count}$<$<BOOL:${WIN32}>:_windows>.cpp ${count}Test.cpp)
+  endif()
   target_link_libraries(${target} PRIVATE kestrel::kestrel XercesC::XercesC GTest::gtest GTest::gtest_main Threads::Threads
     ${TEST_LIBRARIES})
   target_include_directories(${target} PRIVATE ${PROJECT_SOURCE_DIR})

@@ -1,4 +1,4 @@
-// What is done for each case must not touch the heap. AllocationCounter.cpp counts.
+// What is done for each case must not touch the heap.
 
 #include <gtest/gtest.h>
 
@@ -10,18 +10,18 @@
 #include "kestrel/dictionary/ScoreBinningEncoder.h"
 #include "kestrel/dictionary/ScoreCatNumericEncoder.h"
 #include "kestrel/dictionary/ScoreCatStringEncoder.h"
-#include "tests/dictionary/AllocationCounter.h"
 #include "tests/dictionary/TestValues.h"
+#include "tests/support/AllocationCount.h"
 
 namespace MCKestrel_800 {
 namespace {
 
 /// How often the heap was asked while the function ran.
 template <class Function>
-long AllocationsIn(const Function& function) {
-  const long before = AllocationsSoFar();
+size_t AllocationsIn(const Function& function) {
+  const size_t before = kestrel_tests::CountAllocations();
   function();
-  return AllocationsSoFar() - before;
+  return kestrel_tests::CountAllocations() - before;
 }
 
 // Longer than what a string keeps without the heap.
@@ -29,7 +29,7 @@ const std::string kLong(100, 'x');
 const std::string kShorter(80, 'y');
 
 TEST(Allocations, TheCounterCounts) {
-  EXPECT_EQ(AllocationsIn([] { delete NewNumber(1); }), 1);
+  EXPECT_EQ(AllocationsIn([] { delete NewNumber(1); }), 1u);
 }
 
 TEST(Allocations, FillingAndReadingOccupiedSlotsMakesNone) {
@@ -49,7 +49,7 @@ TEST(Allocations, FillingAndReadingOccupiedSlotsMakesNone) {
                 record.SetMissingValue(2);
               }
             }),
-            0);
+            0u);
 }
 
 TEST(Allocations, EncodingKnownAndUnknownValuesMakesNone) {
@@ -65,7 +65,7 @@ TEST(Allocations, EncodingKnownAndUnknownValuesMakesNone) {
               numbers.EncodeConst(&number);
               bins.EncodeConst(&number);
             }),
-            0);
+            0u);
   EXPECT_EQ(texts.EncodeConst(&known), 0);
   EXPECT_EQ(texts.EncodeConst(&unknown), -1);
 }
@@ -99,7 +99,7 @@ TEST(Allocations, AskingForMissingAndValidValuesMakesNone) {
                   texts.IsValidValue(value);
                 }
               }),
-              0);
+              0u);
     EXPECT_TRUE(numbers.IsValidValue(&number));
     EXPECT_TRUE(numbers.IsMissingValue(&absent));
     EXPECT_TRUE(texts.IsValidValue(&text));

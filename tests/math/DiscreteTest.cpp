@@ -9,8 +9,8 @@
 
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/math/MCDistFun.h"
-#include "tests/dictionary/AllocationCounter.h"
 #include "tests/math/BitPatterns.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 
@@ -217,7 +217,7 @@ TEST(Hypergeometric, IsSymmetric) {
 TEST(Discrete, NoBitPatternGivesInfinityOrNaNAndNothingAllocates) {
   kestrel_tests::BitPatterns patterns(20);
   long err = 0;
-  const long before = MCKestrel_800::AllocationsSoFar();
+  const size_t before = kestrel_tests::CountAllocations();
   for (int i = 0; i < 200000; ++i) {
     const double a = patterns.Next(), b = patterns.Next(), c = patterns.Next(), d = patterns.Next();
     ASSERT_TRUE(std::isfinite(MCDistFun::PdfBin(a, b, c, err))) << a << " " << b << " " << c;
@@ -225,7 +225,7 @@ TEST(Discrete, NoBitPatternGivesInfinityOrNaNAndNothingAllocates) {
     ASSERT_TRUE(std::isfinite(MCDistFun::IdfBin(a, b, c, err))) << a << " " << b << " " << c;
     ASSERT_TRUE(std::isfinite(MCDistFun::CDFHyper(a, b, c, d, err))) << a << " " << b << " " << c << " " << d;
   }
-  EXPECT_EQ(MCKestrel_800::AllocationsSoFar(), before);
+  EXPECT_EQ(kestrel_tests::CountAllocations(), before);
 }
 
 }  // namespace

@@ -10,8 +10,8 @@
 
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/math/MCDistFun.h"
-#include "tests/dictionary/AllocationCounter.h"
 #include "tests/math/BitPatterns.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 
@@ -211,11 +211,11 @@ TEST(MCDistFun, ProbabilitiesAreNeverOutsideOfZeroToOne) {
 }
 
 TEST(MCDistFun, AllocatesNothing) {
-  const long before = MCKestrel_800::AllocationsSoFar();
+  const size_t before = kestrel_tests::CountAllocations();
   double sum = 0.0;
   for (const Function function : kAll)
     sum += function(0.3, 150.5, 230.25) + function(0.3, 0.4, 3.0);
-  EXPECT_EQ(MCKestrel_800::AllocationsSoFar(), before);
+  EXPECT_EQ(kestrel_tests::CountAllocations(), before);
   EXPECT_TRUE(std::isfinite(sum));
 }
 

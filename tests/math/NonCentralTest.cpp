@@ -10,8 +10,8 @@
 
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/math/MCDistFun.h"
-#include "tests/dictionary/AllocationCounter.h"
 #include "tests/math/BitPatterns.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 
@@ -290,7 +290,7 @@ TEST(NonCentral, SearchTurnsTheProbabilityBack) {
 
 TEST(NonCentral, NoBitPatternGivesInfinityOrNaNAndNothingAllocates) {
   kestrel_tests::BitPatterns patterns(21);
-  const long before = MCKestrel_800::AllocationsSoFar();
+  const size_t before = kestrel_tests::CountAllocations();
   for (int i = 0; i < 100000; ++i) {
     const double a = patterns.Next(), b = patterns.Next(), c = patterns.Next(), d = patterns.Next();
     ASSERT_TRUE(std::isfinite(MCDistFun::NonCentralCdfT(a, b, c))) << a << " " << b << " " << c;
@@ -301,7 +301,7 @@ TEST(NonCentral, NoBitPatternGivesInfinityOrNaNAndNothingAllocates) {
     ASSERT_TRUE(std::isfinite(MCDistFun::FindNCParamChi(a, b, c))) << a << " " << b << " " << c;
     ASSERT_TRUE(std::isfinite(MCDistFun::FindNCParamF(a, b, c, d))) << a << " " << b << " " << c << " " << d;
   }
-  EXPECT_EQ(MCKestrel_800::AllocationsSoFar(), before);
+  EXPECT_EQ(kestrel_tests::CountAllocations(), before);
 }
 
 }  // namespace

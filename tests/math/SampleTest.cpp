@@ -10,8 +10,8 @@
 
 #include "kestrel/foundation/MCMV.h"
 #include "kestrel/math/MCDistFun.h"
-#include "tests/dictionary/AllocationCounter.h"
 #include "tests/math/BitPatterns.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 
@@ -217,7 +217,7 @@ TEST(MedianInterval, RefusesWhatGivesNone) {
 TEST(Sample, NoBitPatternGivesInfinityOrNaNAndNothingAllocates) {
   kestrel_tests::BitPatterns patterns(22);
   double values[9], weights[9];
-  const long before = MCKestrel_800::AllocationsSoFar();
+  const size_t before = kestrel_tests::CountAllocations();
   for (int i = 0; i < 100000; ++i) {
     for (int j = 0; j < 9; ++j) {
       do {
@@ -234,7 +234,7 @@ TEST(Sample, NoBitPatternGivesInfinityOrNaNAndNothingAllocates) {
     ASSERT_TRUE(std::isfinite(MCDistFun::Mednci(9, values, p, lower, upper))) << i;
     ASSERT_TRUE(std::isfinite(lower) && std::isfinite(upper)) << i;
   }
-  EXPECT_EQ(MCKestrel_800::AllocationsSoFar(), before);
+  EXPECT_EQ(kestrel_tests::CountAllocations(), before);
 }
 
 TEST(Percentile, SortsLargeSamplesWithWeights) {

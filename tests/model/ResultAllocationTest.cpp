@@ -7,18 +7,12 @@
 #include <vector>
 
 #include "kestrel/model/Results.h"
-#include "tests/model/AllocationCount.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 
 using namespace MCKestrel_800;
 using kestrel_tests::CountAllocations;
-
-TEST(ResultAllocation, IsCountedHere) {
-  const size_t before = CountAllocations();
-  const std::vector<int> some(100);
-  EXPECT_GT(CountAllocations(), before) << some.size();
-}
 
 TEST(ResultAllocation, RegressionCasesNeedNone) {
   RegResult result;

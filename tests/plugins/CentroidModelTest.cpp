@@ -12,8 +12,8 @@
 #include "kestrel/dictionary/ScoreDictionary.h"
 #include "kestrel/model/ModelFactory.h"
 #include "kestrel/model/Results.h"
-#include "tests/model/AllocationCount.h"
 #include "tests/plugins/ModelText.h"
+#include "tests/support/AllocationCount.h"
 #include "tests/support/ExpectFault.h"
 #include "tests/support/PlainTable.h"
 
@@ -214,6 +214,13 @@ TEST(CentroidModel, TellsWhatItIs) {
   std::ostringstream out;
   model->Display(out);
   EXPECT_EQ(out.str(), "Centroid red\n\tx = 0\n\tz = 0\nCentroid green\n\tx = 2\n\tz = 0\n");
+}
+
+TEST(CentroidModel, AllocationsOfThePlugInAreCounted) {
+  const std::unique_ptr<ScoreModel> model = Load(ColourDocument(RedAndGreen()));
+  const size_t before = CountAllocations();
+  const std::unique_ptr<ScoreResult> result(model->MakeResult());
+  EXPECT_GT(CountAllocations(), before) << result.get();
 }
 
 TEST(CentroidModel, AllocatesNothingAfterTheFirstCase) {

@@ -5,8 +5,8 @@
 #include <memory>
 #include <string>
 
-#include "tests/model/AllocationCount.h"
 #include "tests/plugins/RuleSetText.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 

@@ -8,20 +8,14 @@
 #include <vector>
 
 #include "kestrel/model/Results.h"
-#include "tests/model/AllocationCount.h"
 #include "tests/plugins/DerivedModelText.h"
 #include "tests/plugins/OutputText.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 
 using namespace MCKestrel_800;
 using namespace kestrel_tests;
-
-TEST(ScoringAllocation, IsCountedHere) {
-  const size_t before = CountAllocations();
-  const std::vector<int> some(100);
-  EXPECT_GT(CountAllocations(), before) << some.size();
-}
 
 // Numbers and categories, present, missing, refused and in two layouts.
 TEST(ScoringAllocation, NoneAfterTheFirstCase) {

@@ -7,8 +7,8 @@
 #include <string>
 #include <vector>
 
-#include "tests/model/AllocationCount.h"
 #include "tests/plugins/TreeText.h"
+#include "tests/support/AllocationCount.h"
 
 namespace kestrel_tests {
 namespace {
@@ -64,12 +64,6 @@ std::vector<CaseRecord> Records() {
 
 constexpr const char* kStrategies[] = {"none",         "lastPrediction",     "nullPrediction",
                                        "defaultChild", "weightedConfidence", "aggregateNodes"};
-
-TEST(TreeAllocation, IsCountedHere) {
-  const size_t before = CountAllocations();
-  const std::vector<int> some(100);
-  EXPECT_GT(CountAllocations(), before) << some.size();
-}
 
 TEST(TreeAllocation, NoneAfterTheFirstCases) {
   const std::vector<CaseRecord> records = Records();

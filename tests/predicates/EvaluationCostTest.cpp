@@ -11,8 +11,8 @@
 #include "kestrel/predicates/ConstantPredicates.h"
 #include "kestrel/predicates/SetPredicate.h"
 #include "kestrel/predicates/SimplePredicate.h"
-#include "tests/dictionary/AllocationCounter.h"
 #include "tests/predicates/TestPredicates.h"
+#include "tests/support/AllocationCount.h"
 #include "tests/support/SmallStack.h"
 
 namespace MCKestrel_800 {
@@ -92,14 +92,15 @@ TEST(Evaluation, AllocatesNothing) {
   for (const int children : {1, 64, 1000}) {
     for (const auto boolOperator : kOperators) {
       const auto compound = NewCompound(fields, boolOperator, children);
-      const long before = AllocationsSoFar();
+      const size_t before = kestrel_tests::CountAllocations();
       int different = 0;
       for (const auto& one : cases) {
         const Result byRecord = compound->Evaluate(&one->record, nullptr);
         different += byRecord != compound->Evaluate(one->values);
         static_cast<void>(compound->EvaluateSurrogate(one->values, children / 2));
       }
-      EXPECT_EQ(AllocationsSoFar() - before, 0) << children << " children, operator " << boolOperator;
+      EXPECT_EQ(kestrel_tests::CountAllocations(), before)
+          << children << " children, operator " << boolOperator;
       EXPECT_EQ(different, 0);
     }
   }

@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "kestrel/dictionary/ScoreDictVar.h"
-#include "tests/dictionary/AllocationCounter.h"
+#include "tests/support/AllocationCount.h"
 #include "tests/transform/FunctionRows.h"
 
 namespace MCKestrel_800 {
@@ -280,9 +280,9 @@ TEST(FunctionEvaluation, NumbersAndShortTextsNeedNoMemory) {
     return sum;
   };
   const double first = run();
-  const long before = AllocationsSoFar();
+  const size_t before = kestrel_tests::CountAllocations();
   EXPECT_EQ(run(), first);
-  EXPECT_EQ(AllocationsSoFar(), before);
+  EXPECT_EQ(kestrel_tests::CountAllocations(), before);
 }
 
 TEST(FunctionEvaluation, NearestMeanTakesDistancesThatAreNumbers) {

@@ -11,7 +11,7 @@
 
 #include "kestrel/dictionary/MissingValueSet.h"
 #include "kestrel/predicates/Range.h"
-#include "tests/dictionary/AllocationCounter.h"
+#include "tests/support/AllocationCount.h"
 #include "tests/transform/DerivedFields.h"
 
 namespace {
@@ -385,9 +385,9 @@ TEST(DerivedValues, AllocateNothingAfterTheFirstCases) {
     }
   };
   compute();
-  const long before = AllocationsSoFar();
+  const size_t before = kestrel_tests::CountAllocations();
   compute();
-  EXPECT_EQ(AllocationsSoFar() - before, 0);
+  EXPECT_EQ(kestrel_tests::CountAllocations(), before);
 }
 
 }  // namespace

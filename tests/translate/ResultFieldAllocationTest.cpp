@@ -10,19 +10,12 @@
 #include "kestrel/foundation/NumericValue.h"
 #include "kestrel/foundation/StringValue.h"
 #include "kestrel/translate/ResultField.h"
-#include "tests/model/AllocationCount.h"
+#include "tests/support/AllocationCount.h"
 
 namespace {
 
 using namespace MCKestrel_800;
 using kestrel_tests::CountAllocations;
-
-TEST(ResultFieldAllocation, IsCountedHere) {
-  const size_t before = CountAllocations();
-  ResultField fields;
-  fields.SetResultValue("risk", 1.0);
-  EXPECT_GT(CountAllocations(), before);
-}
 
 TEST(ResultFieldAllocation, CasesNeedNoneAfterTheFirst) {
   const std::vector<StringValue> texts = {StringValue(std::string(100, 'a')),

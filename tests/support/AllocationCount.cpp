@@ -1,7 +1,8 @@
-// The counting operators stand in a source of their own: inlined, they look to the compiler like a mix of two
-// ways to allocate.
+// Counts by operators that replace those of the whole process; AllocationCount_windows.cpp is for where they
+// cannot. They stand in a source of their own: inlined, they look to the compiler like a mix of two ways to
+// allocate.
 
-#include "tests/model/AllocationCount.h"
+#include "tests/support/AllocationCount.h"
 
 #include <atomic>
 #include <cstdlib>
