@@ -5,6 +5,7 @@
 
 #include "kestrel/dictionary/ScoreDictVar.h"
 #include "kestrel/foundation/DateTimeValue.h"
+#include "kestrel/math/Logarithm.h"
 #include "kestrel/math/MCDistFun.h"
 
 namespace MCKestrel_800 {
@@ -229,7 +230,7 @@ double ApplyTransFunction(double x, double y, TransformFunction function) {
     case kExpFunction:
       return Exponential(x);
     case kLog10Function:
-      return x > 0.0 ? NumberOrMissing(std::log10(x)) : kMissing;
+      return x > 0.0 ? NumberOrMissing(MCMath_800::DecimalLogarithm(x)) : kMissing;
     case kLnFunction:
       return x > 0.0 ? NumberOrMissing(std::log(x)) : kMissing;
     case kModFunction:
