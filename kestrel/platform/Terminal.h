@@ -1,4 +1,5 @@
-// The edges of a command line program: its arguments, its standard streams and the user's wish to stop.
+// The edges of a command line program: its arguments, its standard streams, the files that it writes and the
+// user's wish to stop.
 
 #ifndef KESTREL_PLATFORM_TERMINAL_H
 #define KESTREL_PLATFORM_TERMINAL_H
