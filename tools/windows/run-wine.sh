@@ -9,4 +9,9 @@ set -eu
 : "${LC_ALL:=C.UTF-8}"
 export WINEPREFIX WINEDEBUG WINEDLLOVERRIDES LC_ALL
 unset DISPLAY || true
-exec /usr/lib/wine/wine64 "$@"
+# Once in about a thousand starts the system's loader gives Wine up, with 127, before the program begins; that start is
+# made again.
+status=0
+/usr/lib/wine/wine64 "$@" || status=$?
+[ "$status" -ne 127 ] || exec /usr/lib/wine/wine64 "$@"
+exit "$status"
